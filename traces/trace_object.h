@@ -1,5 +1,5 @@
-// The trace-object contract: the members that the trace manager calls on whatever holds and draws the data of one
-// result type. Rectangles are in pixels of the off-screen surface, single precision.
+// The trace-object contract: the members that the trace manager calls on whatever holds and draws the data of
+// one result type. Rectangles are in pixels of the off-screen surface, single precision.
 #pragma once
 
 #include <cstdint>
@@ -51,14 +51,23 @@ class TraceObject {
                                     DcHandle dc) = 0;
   virtual void Paint(DcHandle dc) = 0;
   virtual void drawMarkers(DcHandle dc) = 0;
-  virtual void destroyClippingRegion(DcHandle dc) = 0;
+  virtual void destroyClippingRegion(DcHandle dc) = 0;  // raises nothing
   virtual void Label(DcHandle dc, const LabelFonts& fonts) = 0;
   virtual void updateMarkerDisplay(DcHandle dc, const LabelFonts& fonts) = 0;
   [[nodiscard]] virtual Color activeTraceColor() const = 0;
 
+  // Axis settings that a host sends by code; both kinds of painter have them.
+  virtual void xAxisStyle(std::int16_t style) = 0;
+  virtual void yAxisStyle(std::int16_t style) = 0;
+  // dB (or units of the value axis) per division, and the level at the top of the axis.
+  virtual void verticalResolution(double perDivision) = 0;
+  virtual void gridScaleTop(double level) = 0;
+  virtual void setAutoScale(bool on) = 0;
+
   // Sub-traces. The selected one receives marker and key operations.
   [[nodiscard]] virtual std::int16_t numberOfTraces() const = 0;
   [[nodiscard]] virtual std::int16_t selectedTraceIndex() const = 0;
+  virtual void selectedTraceIndex(std::int16_t index) = 0;
   // Highest point index of the selected sub-trace.
   [[nodiscard]] virtual std::int32_t traceSize() const = 0;
   // Whether one marker spans all sub-traces.
