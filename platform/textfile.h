@@ -12,6 +12,7 @@ struct TextLine {
   std::string text;         // without its line end (LF or CRLF), cut to the reader's bound
   std::uint64_t number = 0; // counted from 1
   bool cut = false;         // the line was longer than the bound; the rest of it was passed over
+  bool ended = false;       // by LF or CRLF; only the last line of a file may lack its end
 };
 
 class TextReader {
