@@ -61,6 +61,7 @@ std::unique_ptr<SweepRecording> SweepRecording::open(TextFiles& files, const std
 
 void SweepRecording::rewind() {
   reader_ = openNamed(files_, path_);
+  readFailed_ = false;
   rowPending_ = false;
   startSweep();
   sweepNumber_ = 0;
@@ -112,9 +113,11 @@ bool SweepRecording::next(Sweep& sweep) {
 
 // A file that cannot be read further ends here; what came before is kept.
 bool SweepRecording::readLine() {
+  if (readFailed_) return false;
   try {
     if (!reader_->readLine(line_)) return false;
   } catch (const RuntimeError& error) {
+    readFailed_ = true;
     keepProblem(line_.number + 1, "the file cannot be read further: " + error.description());
     return false;
   }

@@ -84,6 +84,7 @@ class SweepRecording {
   TextFiles& files_;
   std::string path_;
   std::unique_ptr<TextReader> reader_;
+  bool readFailed_ = false;
   SweepFormat format_ = SweepFormat::RtlPower;
   bool lastBinTwice_ = false;
 
