@@ -1,4 +1,5 @@
-// Recordings of real receivers, where they are at hand. The numbers were taken from the files by other means.
+// Whole recordings: of real receivers, where they are at hand, and the project's own. The numbers were taken
+// from the files by other means.
 #include <gtest/gtest.h>
 
 #include <algorithm>
@@ -14,22 +15,29 @@
 namespace frontpanels {
 namespace {
 
-class RealRecording : public ::testing::Test {
+class WholeRecording : public ::testing::Test {
  protected:
-  std::vector<Sweep> read(const std::string& name) {
-    std::ifstream file(std::filesystem::path(FRONTPANELS_TEST_DATA) / name, std::ios::binary);
+  std::vector<Sweep> read(const std::string& name, const char* folder) {
+    std::ifstream file(std::filesystem::path(folder) / name, std::ios::binary);
     files.contents[name] = {std::istreambuf_iterator<char>(file), {}};
     recording = SweepRecording::open(files, name);
     std::vector<Sweep> sweeps;
     for (Sweep sweep; recording->next(sweep);) sweeps.push_back(sweep);
     return sweeps;
   }
-  void SetUp() override {
-    if (!std::filesystem::exists(FRONTPANELS_TEST_DATA)) GTEST_SKIP() << "no " << FRONTPANELS_TEST_DATA;
-  }
 
   testing::MemoryTextFiles files;
   std::unique_ptr<SweepRecording> recording;
+};
+
+class RealRecording : public WholeRecording {
+ protected:
+  void SetUp() override {
+    if (!std::filesystem::exists(FRONTPANELS_TEST_DATA)) GTEST_SKIP() << "no " << FRONTPANELS_TEST_DATA;
+  }
+  std::vector<Sweep> read(const std::string& name) {
+    return WholeRecording::read(name, FRONTPANELS_TEST_DATA);
+  }
 };
 
 std::ptrdiff_t peakBin(const Sweep& sweep) {
@@ -96,6 +104,20 @@ TEST_F(RealRecording, OfHackrfSweepIsOneSweepInOrderOfFrequency) {
 
 TEST_F(RealRecording, OfAnotherKindIsRefused) {
   EXPECT_THROW(read("14_umts_drive_psc_ecno.txt"), RuntimeError);
+}
+
+TEST_F(WholeRecording, ThatTheProjectCarriesShowsTheFmBandTwelveTimes) {
+  const std::vector<Sweep> sweeps = read("fm_band.csv", FRONTPANELS_SOURCE_DIR "/recordings");
+  ASSERT_EQ(sweeps.size(), 12U);
+  for (const Sweep& sweep : sweeps) {
+    EXPECT_EQ(sweep.startHz, 88e6);
+    EXPECT_EQ(sweep.stepHz, 19531.25);
+    EXPECT_EQ(sweep.levelsDb.size(), 1024U);
+    // The strongest station is at 94.7 MHz: (94.7 - 88) MHz / 19531.25 Hz = bin 343, give or take the
+    // programme.
+    EXPECT_NEAR(static_cast<double>(peakBin(sweep)), 343, 5);
+  }
+  EXPECT_EQ(recording->problemReport(), "");
 }
 
 }  // namespace
