@@ -1,0 +1,96 @@
+#include "traces/marker.h"
+
+#include <gtest/gtest.h>
+
+#include "platform/runtime_error.h"
+#include "tests/support/recording_gdi.h"
+
+namespace frontpanels::testing {
+namespace {
+
+using Path = std::vector<Point>;
+
+class MarkerTest : public ::testing::Test {
+ protected:
+  MarkerTest() {
+    marker.positionX = 100;
+    marker.positionY = 50;
+    marker.positionY2 = 20;
+    marker.id = "12";
+  }
+
+  // The corners of what was drawn; a line that starts elsewhere than the one before ended is set off by its
+  // start.
+  [[nodiscard]] Path drawn() {
+    gdi.clear();
+    marker.draw(gdi, gdi.viewDc());
+    Path path;
+    for (const LineValue& line : gdi.lines()) {
+      if (path.empty() || path.back() != line.from) path.push_back(line.from);
+      path.push_back(line.to);
+    }
+    return path;
+  }
+
+  RecordingGdi gdi;
+  clsMarker marker;
+};
+
+TEST_F(MarkerTest, NormalMarkerStandsOnItsPointAndDeltaMarkerUpsideDown) {
+  EXPECT_EQ(drawn(), (Path{{100, 50}, {96, 38}, {104, 38}, {100, 50}}));
+  marker.DELTA = true;
+  EXPECT_EQ(drawn(), (Path{{100, 38}, {96, 50}, {104, 50}, {100, 38}}));
+}
+
+TEST_F(MarkerTest, HalfPixelsOfAnOddWidthGoToTheEvenNeighbour) {
+  marker.width = 9;  // 95.5 and 104.5
+  EXPECT_EQ(drawn(), (Path{{100, 50}, {96, 38}, {104, 38}, {100, 50}}));
+  marker.positionX = 101;  // 96.5 and 105.5
+  EXPECT_EQ(drawn(), (Path{{101, 50}, {96, 38}, {106, 38}, {101, 50}}));
+}
+
+TEST_F(MarkerTest, TwoEndedMarkersJoinTheirTrianglesByAStem) {
+  const Path twoEnded = {{100, 20}, {96, 32},  {104, 32}, {100, 20}, {100, 32},
+                         {100, 38}, {100, 50}, {96, 38},  {104, 38}, {100, 50}};
+  marker.multiMarker = true;
+  EXPECT_EQ(drawn(), twoEnded);
+  marker.multiMarker = false;
+  marker.stripChartMarker = true;
+  marker.DELTA = true;
+  EXPECT_EQ(drawn(), twoEnded);
+}
+
+TEST_F(MarkerTest, ActiveMarkerHasAPenOfItsOwnTwoPixelsWide) {
+  marker.active = true;
+  drawn();
+  EXPECT_EQ(gdi.lines()[0].pen, (PenValue{PenStyle::Solid, 2, rgb(50, 50, 50)}));
+  EXPECT_EQ(gdi.liveObjects(), 0);
+  EXPECT_TRUE(gdi.violations().empty());
+  marker.active = false;
+  drawn();
+  EXPECT_TRUE(gdi.callsOf("createPen").empty());
+}
+
+TEST_F(MarkerTest, ActiveMarkerIsStillDrawnWhenItsPenCannotBeMade) {
+  marker.active = true;
+  gdi.failAlways("createPen");
+  EXPECT_EQ(drawn().size(), 4U);
+  EXPECT_TRUE(gdi.violations().empty());
+}
+
+TEST_F(MarkerTest, CornerOutside32BitsOverflows) {
+  marker.positionX = 2147483647;
+  EXPECT_THROW(marker.draw(gdi, gdi.viewDc()), RuntimeError);
+}
+
+TEST_F(MarkerTest, IdIsCentredTwoPixelsAboveTheGlyph) {
+  marker.drawId(gdi, gdi.viewDc());
+  // Two letters of 8 x 12: 16 wide; the glyph begins at 38.
+  ASSERT_EQ(gdi.texts().size(), 1U);
+  EXPECT_EQ(gdi.texts()[0].text, "12");
+  EXPECT_EQ(gdi.texts()[0].topLeft, (Point{92, 24}));
+  EXPECT_EQ(deltaMarkerId("12"), "12d");
+}
+
+}  // namespace
+}  // namespace frontpanels::testing
