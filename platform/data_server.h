@@ -57,15 +57,16 @@ class DataServer {
   DataServer& operator=(const DataServer&) = delete;
 
   static constexpr char kPathSeparator = '\x1b';
-  // The paths, separated by the escape character; their order gives the indices of DataChanged, from 0. Replaces
-  // what was subscribed before.
+  // The paths, separated by the escape character; their order gives the indices of DataChanged, from 0.
+  // Replaces what was subscribed before.
   void subscribe(std::string_view paths);
 
   [[nodiscard]] std::int32_t itemCount(std::int32_t index) const;
   // Raises "Subscript out of range" for an unknown path index or item.
   [[nodiscard]] Variant value(std::int32_t index, std::int32_t item) const;
   [[nodiscard]] float singleValue(std::int32_t index, std::int32_t item) const;
-  // All values of a path in one call when they are singles; empty otherwise. Valid until the path is published again.
+  // All values of a path in one call when they are singles; empty otherwise. Valid until the path is
+  // published again.
   [[nodiscard]] std::span<const float> singles(std::int32_t index) const;
 
  private:

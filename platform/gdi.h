@@ -39,7 +39,14 @@ enum class HatchStyle : std::int32_t {
   DiagonalCross = 5
 };
 enum class StockPen : std::int32_t { White = 6, Black = 7, Null = 8 };
-enum class StockBrush : std::int32_t { White = 0, LightGray = 1, Gray = 2, DarkGray = 3, Black = 4, Null = 5 };
+enum class StockBrush : std::int32_t {
+  White = 0,
+  LightGray = 1,
+  Gray = 2,
+  DarkGray = 3,
+  Black = 4,
+  Null = 5
+};
 enum class BackgroundMode : std::int32_t { Transparent = 1, Opaque = 2 };
 enum class DrawMode : std::int32_t { NotXorPen = 10, CopyPen = 13 };
 enum class RasterOp : std::uint32_t { SourceCopy = 0x00CC0020 };
@@ -79,7 +86,8 @@ class Gdi {
   virtual bool deleteDC(DcHandle dc) = 0;
   [[nodiscard]] virtual BitmapHandle createCompatibleBitmap(DcHandle dc, Size sizePx) = 0;
 
-  // Objects. Whoever creates one deletes it, after selecting it out; stock and system objects are never deleted.
+  // Objects. Whoever creates one deletes it, after selecting it out; stock and system objects are never
+  // deleted.
   [[nodiscard]] virtual PenHandle createPen(PenStyle style, std::int32_t widthPx, Color color) = 0;
   [[nodiscard]] virtual BrushHandle createSolidBrush(Color color) = 0;
   [[nodiscard]] virtual BrushHandle createHatchBrush(HatchStyle style, Color color) = 0;

@@ -12,9 +12,7 @@ void raiseFileNotFound() { throw RuntimeError(53, "File not found"); }
 void raiseDeviceIoError() { throw RuntimeError(57, "Device I/O error"); }
 void raisePermissionDenied() { throw RuntimeError(70, "Permission denied"); }
 void raisePathFileAccessError() { throw RuntimeError(75, "Path/File access error"); }
-void raiseObjectVariableNotSet() {
-  throw RuntimeError(91, "Object variable or With block variable not set");
-}
+void raiseObjectVariableNotSet() { throw RuntimeError(91, "Object variable or With block variable not set"); }
 void raiseInvalidUseOfNull() { throw RuntimeError(94, "Invalid use of Null"); }
 void raiseMemberNotSupported() { throw RuntimeError(438, "Object doesn't support this property or method"); }
 void raiseDuplicateKey() {

@@ -1,5 +1,5 @@
-// What anything outside raises when it fails, and what the defined arithmetic raises when it overflows: a number
-// and a description, as the run-time words them.
+// What anything outside raises when it fails, and what the defined arithmetic raises when it overflows: a
+// number and a description, as the run-time words them.
 #pragma once
 
 #include <string>
@@ -20,19 +20,19 @@ class RuntimeError {
   std::string description_;
 };
 
-[[noreturn]] void raiseInvalidProcedureCall();     // 5
-[[noreturn]] void raiseOverflow();                 // 6
-[[noreturn]] void raiseOutOfMemory();              // 7
-[[noreturn]] void raiseSubscriptOutOfRange();      // 9
-[[noreturn]] void raiseDivisionByZero();           // 11
-[[noreturn]] void raiseTypeMismatch();             // 13
-[[noreturn]] void raiseFileNotFound();             // 53
-[[noreturn]] void raiseDeviceIoError();            // 57
-[[noreturn]] void raisePermissionDenied();         // 70
-[[noreturn]] void raisePathFileAccessError();      // 75
-[[noreturn]] void raiseObjectVariableNotSet();     // 91
-[[noreturn]] void raiseInvalidUseOfNull();         // 94
-[[noreturn]] void raiseMemberNotSupported();       // 438
-[[noreturn]] void raiseDuplicateKey();             // 457
+[[noreturn]] void raiseInvalidProcedureCall();  // 5
+[[noreturn]] void raiseOverflow();              // 6
+[[noreturn]] void raiseOutOfMemory();           // 7
+[[noreturn]] void raiseSubscriptOutOfRange();   // 9
+[[noreturn]] void raiseDivisionByZero();        // 11
+[[noreturn]] void raiseTypeMismatch();          // 13
+[[noreturn]] void raiseFileNotFound();          // 53
+[[noreturn]] void raiseDeviceIoError();         // 57
+[[noreturn]] void raisePermissionDenied();      // 70
+[[noreturn]] void raisePathFileAccessError();   // 75
+[[noreturn]] void raiseObjectVariableNotSet();  // 91
+[[noreturn]] void raiseInvalidUseOfNull();      // 94
+[[noreturn]] void raiseMemberNotSupported();    // 438
+[[noreturn]] void raiseDuplicateKey();          // 457
 
 }  // namespace frontpanels

@@ -9,10 +9,10 @@
 namespace frontpanels {
 
 struct TextLine {
-  std::string text;         // without its line end (LF or CRLF), cut to the reader's bound
-  std::uint64_t number = 0; // counted from 1
-  bool cut = false;         // the line was longer than the bound; the rest of it was passed over
-  bool ended = false;       // by LF or CRLF; only the last line of a file may lack its end
+  std::string text;          // without its line end (LF or CRLF), cut to the reader's bound
+  std::uint64_t number = 0;  // counted from 1
+  bool cut = false;          // the line was longer than the bound; the rest of it was passed over
+  bool ended = false;        // by LF or CRLF; only the last line of a file may lack its end
 };
 
 class TextReader {
@@ -32,7 +32,8 @@ class TextFiles {
   virtual ~TextFiles() = default;
 
   // `path` is UTF-8. Raises "File not found", "Permission denied" or "Path/File access error".
-  [[nodiscard]] virtual std::unique_ptr<TextReader> open(const std::string& path, std::size_t maxLineBytes) = 0;
+  [[nodiscard]] virtual std::unique_ptr<TextReader> open(const std::string& path,
+                                                         std::size_t maxLineBytes) = 0;
 };
 
 // The files of the operating system.

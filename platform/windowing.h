@@ -1,5 +1,5 @@
-// Window services behind a panel: mouse capture, topmost state, the screen's scale, and the picture box that a
-// panel's graph is drawn on.
+// Window services behind a panel: mouse capture, topmost state, the screen's scale, and the picture box that
+// a panel's graph is drawn on.
 #pragma once
 
 #include <cstdint>

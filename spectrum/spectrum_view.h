@@ -1,6 +1,6 @@
-// SpectrumView: the panel that shows power against frequency. This is the whole control except its window: the
-// window side (a registered control, a headless renderer, a test) hands over an environment, forwards events and
-// calls the host's entry points. Positions of mouse events are twips of the view.
+// SpectrumView: the panel that shows power against frequency. This is the whole control except its window:
+// the window side (a registered control, a headless renderer, a test) hands over an environment, forwards
+// events and calls the host's entry points. Positions of mouse events are twips of the view.
 #pragma once
 
 #include <cstdint>
@@ -20,7 +20,8 @@ class SpectrumView {
 
   // Entry points of the host. Each answers a status: 0 done, -1 unknown operation, -8 unusable parameter.
   std::int32_t vfpOp(std::int32_t hardwareId, std::int16_t operation, const Variant& parameter);
-  std::int32_t vfpSet(std::int32_t hardwareId, std::int16_t parameterType, std::int16_t index, const Variant& value);
+  std::int32_t vfpSet(std::int32_t hardwareId, std::int16_t parameterType, std::int16_t index,
+                      const Variant& value);
 
   [[nodiscard]] std::string Caption();
 

@@ -1,4 +1,5 @@
-// One marker on a trace point: a plain record with its drawing. Positions are pixels of the off-screen surface.
+// One marker on a trace point: a plain record with its drawing. Positions are pixels of the off-screen
+// surface.
 #pragma once
 
 #include <cstdint>

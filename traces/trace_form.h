@@ -19,7 +19,8 @@ class TraceForm : public DrawingSurface {
   [[nodiscard]] virtual std::string typeName() = 0;
   [[nodiscard]] virtual std::int16_t winState() = 0;
   // `activeTrace` is null when no trace is left, or when a listed result type cleared it.
-  virtual void changedTraceConfiguration(TraceState state, TraceObject* activeTrace, std::int16_t resultType) = 0;
+  virtual void changedTraceConfiguration(TraceState state, TraceObject* activeTrace,
+                                         std::int16_t resultType) = 0;
   virtual void setMarkerFrameColor(Color color) = 0;
   virtual void deltaMarkerButtonEnabled(bool enable) = 0;
 };

@@ -1,5 +1,5 @@
-// The two sides of a panel's owner: the host program, which answers requests, and the container, which holds the
-// panel's place on its form.
+// The two sides of a panel's owner: the host program, which answers requests, and the container, which holds
+// the panel's place on its form.
 #pragma once
 
 #include <cstdint>
@@ -9,8 +9,8 @@
 
 namespace frontpanels {
 
-// Requests that a panel raises to the host. The answer is a status: 0 done, anything else failure. A host that
-// nobody has connected answers 0.
+// Requests that a panel raises to the host. The answer is a status: 0 done, anything else failure. A host
+// that nobody has connected answers 0.
 class PanelHost {
  public:
   virtual ~PanelHost() = default;

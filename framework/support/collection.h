@@ -1,5 +1,5 @@
-// An ordered collection, counted from 1, whose items may carry a text key. Item 1 is the oldest unless an item was
-// added before it.
+// An ordered collection, counted from 1, whose items may carry a text key. Item 1 is the oldest unless an
+// item was added before it.
 #pragma once
 
 #include <algorithm>
@@ -17,7 +17,9 @@ class Collection {
  public:
   [[nodiscard]] std::size_t count() const noexcept { return entries_.size(); }
   [[nodiscard]] bool empty() const noexcept { return entries_.empty(); }
-  [[nodiscard]] bool contains(std::string_view key) const noexcept { return position(key) != entries_.size(); }
+  [[nodiscard]] bool contains(std::string_view key) const noexcept {
+    return position(key) != entries_.size();
+  }
 
   // An empty key means none. Raises error 457 when the key is taken.
   void add(T item, std::string key = {}) { insert(entries_.size(), std::move(item), std::move(key)); }
@@ -60,9 +62,9 @@ class Collection {
   };
 
   [[nodiscard]] std::size_t position(std::string_view key) const noexcept {
-    const auto found =
-        std::find_if(entries_.begin(), entries_.end(),
-                     [key](const Entry& entry) { return !entry.key.empty() && entry.key == key; });
+    const auto found = std::find_if(entries_.begin(), entries_.end(), [key](const Entry& entry) {
+      return !entry.key.empty() && entry.key == key;
+    });
     return static_cast<std::size_t>(found - entries_.begin());
   }
   [[nodiscard]] std::size_t checked(std::size_t index) const {
@@ -76,7 +78,8 @@ class Collection {
   }
   void insert(std::size_t at, T item, std::string key) {
     if (!key.empty() && contains(key)) raiseDuplicateKey();
-    entries_.insert(entries_.begin() + static_cast<std::ptrdiff_t>(at), Entry{std::move(item), std::move(key)});
+    entries_.insert(entries_.begin() + static_cast<std::ptrdiff_t>(at),
+                    Entry{std::move(item), std::move(key)});
   }
   void erase(std::size_t at) { entries_.erase(entries_.begin() + static_cast<std::ptrdiff_t>(at)); }
 

@@ -27,8 +27,8 @@ class clsErrorHandler {
 // The instance that every class reports through.
 [[nodiscard]] clsErrorHandler& errorHandler() noexcept;
 
-// What reporting depends on, set at the edge (the control's module, a test's fixture). Without dialogs a message
-// reaches the log alone.
+// What reporting depends on, set at the edge (the control's module, a test's fixture). Without dialogs a
+// message reaches the log alone.
 struct Reporting {
   bool silenceAssert = false;
   bool showMessages = true;

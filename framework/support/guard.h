@@ -11,10 +11,12 @@ namespace frontpanels {
 
 // Reports the exception that is being handled. Call from a catch block only.
 void reportCurrentException(std::string_view message) noexcept;
-// The description by which that exception is reported: the run-time error's own, "Out of memory", or "Internal error".
+// The description by which that exception is reported: the run-time error's own, "Out of memory", or
+// "Internal error".
 [[nodiscard]] std::string describeCurrentException();
 
-// True when the body ran to its end. `message` is a text or, where it carries a value, a callable that makes one.
+// True when the body ran to its end. `message` is a text or, where it carries a value, a callable that makes
+// one.
 template <class Message, class Body>
 bool guard(const Message& message, Body&& body) noexcept {
   try {
