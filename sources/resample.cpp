@@ -16,11 +16,15 @@ float largest(std::span<const float> levels) noexcept {
 
 void resample(const Sweep& sweep, DisplaySweep& display) noexcept {
   const std::span<const float> levels(sweep.levelsDb);
-  const std::uint64_t bins = levels.size();
-  const std::uint64_t cells = std::min<std::uint64_t>(bins, kDisplayCells);
-  for (std::uint64_t cell = 0; cell < cells; ++cell) {
-    const std::uint64_t first = cell * bins / cells;
-    const std::uint64_t end = (cell + 1) * bins / cells;
+  const std::size_t bins = levels.size();
+  const std::size_t cells = std::min(bins, kDisplayCells);
+  // In 64 bits: cell times bins outgrows a 32-bit std::size_t.
+  const auto firstBin = [bins, cells](std::size_t cell) {
+    return static_cast<std::size_t>(std::uint64_t{cell} * bins / cells);
+  };
+  for (std::size_t cell = 0; cell < cells; ++cell) {
+    const std::size_t first = firstBin(cell);
+    const std::size_t end = firstBin(cell + 1);
     display.values[cell] = largest(levels.subspan(first, end - first));
   }
   display.count = cells;
@@ -28,7 +32,7 @@ void resample(const Sweep& sweep, DisplaySweep& display) noexcept {
   // One bin alone is drawn as a level line one bin wide.
   if (bins == 1) display.values[display.count++] = display.values[0];
   display.values[display.count++] = kGap;
-  display.spanHz = sweep.stepHz * static_cast<double>(std::max<std::uint64_t>(bins - 1, 1));
+  display.spanHz = sweep.stepHz * static_cast<double>(std::max<std::size_t>(bins - 1, 1));
   display.centerHz = sweep.startHz + display.spanHz / 2;
 }
 
