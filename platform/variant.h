@@ -56,7 +56,8 @@ class Variant {
   Variant(const char* text)
       : value_(std::string(text)) {}  // NOLINT: without it a literal would become a bool
   template <class T>
-  requires std::constructible_from<Value, std::in_place_type_t<std::remove_cvref_t<T>>, T> Variant(T&& value)
+  requires(!std::same_as<std::remove_cvref_t<T>, Variant>) &&
+      std::constructible_from<Value, std::in_place_type_t<std::remove_cvref_t<T>>, T> Variant(T&& value)
       : value_(std::in_place_type<std::remove_cvref_t<T>>, std::forward<T>(value)) {}  // NOLINT
 
   [[nodiscard]] static Variant null() { return Variant(Value(Null{})); }
