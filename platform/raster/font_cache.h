@@ -1,4 +1,4 @@
-// Fonts by their specification, with the glyphs that were used. A face that is not installed is replaced by
+// Fonts by their description, with the glyphs that were used. A face that is not installed is replaced by
 // the one that fontconfig thinks nearest. Text is set as classic Windows text is: every letter hinted to
 // whole pixels, smoothed only where the font asks for it at that size.
 #pragma once
