@@ -21,7 +21,7 @@ class MarkerTest : public ::testing::Test {
 
   // The corners of what was drawn; a line that starts elsewhere than the one before ended is set off by its
   // start.
-  [[nodiscard]] Path drawn() {
+  Path drawn() {
     gdi.clear();
     marker.draw(gdi, gdi.viewDc());
     Path path;
