@@ -1,0 +1,168 @@
+// Painting of the multi-trace painter.
+#include <array>
+#include <cmath>
+
+#include "framework/support/guard.h"
+#include "framework/support/numeric.h"
+#include "painters/multi_trace_painter.h"
+#include "painters/trace_values.h"
+#include "platform/gdi_scope.h"
+#include "platform/runtime_error.h"
+
+namespace frontpanels {
+namespace {
+
+constexpr std::array kTraceColors{rgb(50, 156, 50),   rgb(255, 0, 0),   rgb(0, 0, 255),   rgb(255, 255, 0),
+                                  rgb(255, 255, 255), rgb(0, 255, 255), rgb(255, 0, 255), rgb(0, 0, 0)};
+
+// Narrows the clip to the plot for a block and puts the panel's back at its end. The bottom edge, where the
+// smallest value lies, belongs to what is drawn; the right edge does not.
+class PlotClip {
+ public:
+  PlotClip(Gdi& gdi, DcHandle dc, const PlotRect& plot, RegionHandle panelClip)
+      : gdi_(gdi), dc_(dc), panelClip_(panelClip) {
+    Rect area = plot.toPixels();
+    area.bottom = toInt32(area.bottom + 1.0);
+    region_ = gdi_.createRectRgn(area);
+    if (region_) gdi_.selectClipRgn(dc_, region_);
+  }
+  ~PlotClip() {
+    if (!region_) return;
+    gdi_.selectClipRgn(dc_, panelClip_);
+    gdi_.deleteObject(region_);
+  }
+  PlotClip(const PlotClip&) = delete;
+  PlotClip& operator=(const PlotClip&) = delete;
+
+ private:
+  Gdi& gdi_;
+  DcHandle dc_;
+  RegionHandle panelClip_;
+  RegionHandle region_{};
+};
+
+}  // namespace
+
+Color clsMultiTracePainter::traceColor(std::size_t index) {
+  return kTraceColors[index < kTraceColors.size() ? index : 0];
+}
+
+void clsMultiTracePainter::createClippingRegion(float areaLeft, float areaTop, float areaRight,
+                                                float areaBottom, DcHandle dc) {
+  guard("createClippingRegion() ...", [&] {
+    destroyClippingRegion(dc);
+    clip_ =
+        gdi_.createRectRgn({toInt32(areaLeft), toInt32(areaTop), toInt32(areaRight), toInt32(areaBottom)});
+    if (clip_) gdi_.selectClipRgn(dc, clip_);
+  });
+}
+
+void clsMultiTracePainter::destroyClippingRegion(DcHandle dc) {
+  guard("destroyClippingRegion() ...", [&] {
+    if (!clip_) return;
+    gdi_.selectClipRgn(dc, {});
+    gdi_.deleteObject(std::exchange(clip_, {}));
+  });
+}
+
+void clsMultiTracePainter::Paint(DcHandle dc) {
+  guard("clsMultiTracePainter::Paint() ...", [&] { paintPanel(dc, panel_); });
+}
+
+void clsMultiTracePainter::Paint() {
+  guard("clsMultiTracePainter::Paint() ...", [this] {
+    const PlotRect area = surfaceRect();
+    paintPanel(surface_->ViewHDC(), area);
+  });
+}
+
+PlotRect clsMultiTracePainter::surfaceRect() const {
+  if (surface_ == nullptr) raiseObjectVariableNotSet();
+  return {surface_->ViewScaleLeft(), surface_->ViewScaleTop(), surface_->ViewScaleWidth(),
+          surface_->ViewScaleHeight()};
+}
+
+void clsMultiTracePainter::paintPanel(DcHandle dc, const PlotRect& panel) {
+  const PlotRect plot = panel.shrunk(insets_);
+  forgetPoints();
+  if (!plot.drawable()) return;
+  chooseRange();
+  DrawGrid(dc, plot);
+  if (range_.extent() > 0) drawTraces(dc, plot);
+}
+
+void clsMultiTracePainter::forgetPoints() noexcept {
+  for (TraceSlot& slot : traces_.traces()) slot.points.clear();
+}
+
+void clsMultiTracePainter::chooseRange() {
+  if (autoScale_) DoAutoScale();
+  range_ = calcMinMax() ? dataRange().value_or(axis()) : axis();
+}
+
+void clsMultiTracePainter::DrawGrid(DcHandle dc, const std::optional<PlotRect>& area) {
+  guard("clsMultiTracePainter::DrawGrid()...", [&] {
+    if (gridDrawStyle_) {
+      if (surface_ == nullptr) raiseObjectVariableNotSet();
+      surface_->ViewDrawStyle(*gridDrawStyle_);
+    }
+    const GridDivisions divisions{numberOfVerticalDivisions_, numberOfHorizontalDivisions_,
+                                  multiBand() ? numberOfBands() : std::int16_t{0}};
+    layOutGrid(area ? *area : surfaceRect(), divisions, gridLines_);
+    drawGrid(gdi_, dc, gridLines_, gridPen_);
+  });
+}
+
+void clsMultiTracePainter::drawTraces(DcHandle dc, const PlotRect& plot) {
+  // The divisor N - 2 is wanted: the last two positions fall outside the plot on the right. With N = 2 the
+  // step of the paint before stays.
+  if (numberOfMeasurements() != 2) xStepPx_ = plot.width / (numberOfMeasurements() - 2.0);
+  const ValueAxis y(plot, range_);
+  const PlotClip clip(gdi_, dc, plot, clip_);
+  const auto traces = traces_.traces();
+  for (std::size_t t = 0; t < traces.size(); ++t) {
+    if (!traces[t].data.isArray()) continue;
+    placePoints(traces[t], plot, y);
+    const Color color = traceColor(t);
+    drawTrace(dc, traces[t].points, color);
+    dataChanged_ = false;
+    if (t == static_cast<std::size_t>(selectedTraceIndex_)) activeTraceColor_ = color;
+  }
+}
+
+void clsMultiTracePainter::placePoints(TraceSlot& slot, const PlotRect& plot, const ValueAxis& y) {
+  const double left = plot.left;
+  const double origin =
+      slot.orientation == TraceOrientation::FromRight ? left + plot.width - slot.size * xStepPx_ : left;
+  const PointAxis x(origin, xStepPx_);
+  withValues(slot, converted_,
+             "clsMultiTracePainter::Paint() ... unrecognized array type.  Will be handled as Variant (SLOW!)",
+             [&](auto values) { slot.points.place(values, x, y); });
+}
+
+void clsMultiTracePainter::drawTrace(DcHandle dc, const TracePoints& points, Color color) {
+  const SelectedPen pen(gdi_, dc, PenStyle::Solid, 1, color);
+  for (const TracePoints::Stretch& stretch : points.stretches()) {
+    const auto line = points.points(stretch);
+    if (line.size() > 1) {
+      gdi_.polyline(dc, line);
+    } else {  // a line of one point draws nothing: a lone value between two gaps is a mark one pixel wide
+      gdi_.polyline(dc, std::array{line[0], Point{toInt32(line[0].x + 1.0), line[0].y}});
+    }
+  }
+}
+
+void clsMultiTracePainter::Label(DcHandle dc, const LabelFonts& fonts) {
+  guard("clsMultiTracePainter::Label() ...", [&] {
+    if (xLabelsStale_) updateXAxisLabels();
+    if (labelledRange_ != range_) updateYAxisLabels();
+    labels_.draw(gdi_, dc, fonts, panel_.toPixels(), panel_.shrunk(insets_).toPixels());
+  });
+}
+
+void clsMultiTracePainter::clearArea(DcHandle dc) {
+  guard("clearArea() ...",
+        [&] { gdi_.fillRect(dc, panel_.toPixels(), gdi_.sysColorBrush(SystemColor::ButtonFace)); });
+}
+
+}  // namespace frontpanels
