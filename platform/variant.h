@@ -51,14 +51,14 @@ class Variant {
                              Int32s, Singles, Doubles, Variants>;
 
   Variant() = default;
-  Variant(Value value)
-      : value_(std::move(value)) {}  // NOLINT(google-explicit-constructor): a value is a variant
-  Variant(const char* text)
-      : value_(std::string(text)) {}  // NOLINT: without it a literal would become a bool
+  // NOLINTBEGIN(google-explicit-constructor): a value is a variant, and every call with one says so
+  Variant(Value value) : value_(std::move(value)) {}
+  Variant(const char* text) : value_(std::string(text)) {}  // without it a literal would become a bool
   template <class T>
   requires(!std::same_as<std::remove_cvref_t<T>, Variant>) &&
       std::constructible_from<Value, std::in_place_type_t<std::remove_cvref_t<T>>, T> Variant(T&& value)
-      : value_(std::in_place_type<std::remove_cvref_t<T>>, std::forward<T>(value)) {}  // NOLINT
+      : value_(std::in_place_type<std::remove_cvref_t<T>>, std::forward<T>(value)) {}
+  // NOLINTEND(google-explicit-constructor)
 
   [[nodiscard]] static Variant null() { return Variant(Value(Null{})); }
 

@@ -34,6 +34,7 @@ std::span<const std::int32_t> dashes(PenStyle style) {
 bool inGap(std::span<const std::int32_t> pattern, std::int64_t position) {
   std::int64_t length = 0;
   for (const std::int32_t part : pattern) length += part;
+  if (length == 0) return false;
   position %= length;
   bool gap = false;
   for (const std::int32_t part : pattern) {
