@@ -1,5 +1,7 @@
 #include "traces/marker.h"
 
+#include <algorithm>
+
 #include "framework/support/numeric.h"
 #include "platform/gdi_scope.h"
 
@@ -53,13 +55,12 @@ void clsMarker::draw(Gdi& gdi, DcHandle dc) const {
   drawShape();
 }
 
-// Centred above the glyph, where no trace point lies under a marker's own; a multi marker's id stands above
-// the upper of its ends.
+// Centred above all that draw() has drawn, so that it never lies on its own glyph: either end of a two-ended
+// marker may be the higher one.
 void clsMarker::drawId(Gdi& gdi, DcHandle dc) const {
   const Size text = gdi.textExtent(dc, id);
-  const bool twoEnded = multiMarker || stripChartMarker;
-  const double glyphTop = (twoEnded && positionY2 < positionY ? static_cast<double>(positionY2)
-                                                              : static_cast<double>(positionY) - height);
+  double glyphTop = static_cast<double>(positionY) - height;
+  if (multiMarker || stripChartMarker) glyphTop = std::min<double>(glyphTop, positionY2);
   gdi.textOut(dc, {toInt32(positionX - text.width / 2.0), toInt32(glyphTop - kIdGapPx - text.height)}, id);
 }
 

@@ -3,26 +3,6 @@
 #include <algorithm>
 
 namespace frontpanels {
-namespace {
-
-// Sets the surface's draw mode for a block.
-class DrawModeScope {
- public:
-  DrawModeScope(frontpanels::DrawingSurface& surface, DrawMode mode)
-      : surface_(surface), previous_(surface.ViewDrawMode()) {
-    surface_.ViewDrawMode(mode);
-  }
-  ~DrawModeScope() { surface_.ViewDrawMode(previous_); }
-  DrawModeScope(const DrawModeScope&) = delete;
-  DrawModeScope& operator=(const DrawModeScope&) = delete;
-
- private:
-  frontpanels::DrawingSurface& surface_;
-  DrawMode previous_;
-};
-
-}  // namespace
-
 clsHorzSplitterBar::clsHorzSplitterBar(Gdi& gdi, Windowing& windowing)
     : gdi_(gdi), drag_(windowing, MousePointer::SizeNorthSouth) {}
 
@@ -71,10 +51,10 @@ void clsHorzSplitterBar::MouseUp(std::int16_t /*button*/, std::int16_t /*shift*/
 }
 
 void clsHorzSplitterBar::moveTo(float top) {
+  if (top < highest()) top = highest();
+  if (top > lowest()) top = lowest();
+  relative_ = fractionOf(top - highest(), drag_.surface().ViewUseableScaleHeight() - highest());
   top_ = top;
-  if (top_ < highest()) top_ = highest();
-  if (top_ > lowest()) top_ = lowest();
-  relative_ = (top_ - highest()) / (drag_.surface().ViewUseableScaleHeight() - highest());
 }
 
 void clsHorzSplitterBar::Resize() {
@@ -90,8 +70,12 @@ void clsHorzSplitterBar::Refresh() {
 }
 
 void clsHorzSplitterBar::Paint(DcHandle dc, float left, float top, float width, float height) {
-  const DrawModeScope notXor(drag_.surface(), DrawMode::NotXorPen);
-  gdi_.drawEdge(dc, roundedRect(left, top, left + width, top + height), kEdgeBump, kAllSides);
+  const Rect rect = roundedRect(left, top, left + width, top + height);
+  frontpanels::DrawingSurface& surface = drag_.surface();
+  const DrawMode previous = surface.ViewDrawMode();
+  surface.ViewDrawMode(DrawMode::NotXorPen);
+  gdi_.drawEdge(dc, rect, kEdgeBump, kAllSides);
+  surface.ViewDrawMode(previous);
 }
 
 }  // namespace frontpanels

@@ -36,6 +36,11 @@ Rect roundedRect(float left, float top, float right, float bottom) {
   return {toInt32(left), toInt32(top), toInt32(right), toInt32(bottom)};
 }
 
+float fractionOf(float distance, float way) {
+  if (way == 0) raiseDivisionByZero();
+  return distance / way;
+}
+
 bool containsRounded(const Rect& rect, float x, float y) { return rect.contains({toInt32(x), toInt32(y)}); }
 
 }  // namespace frontpanels

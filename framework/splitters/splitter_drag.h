@@ -42,6 +42,9 @@ class SplitterDrag {
 
 // A rectangle of surface units with every edge rounded half to even. Raises "Overflow".
 [[nodiscard]] Rect roundedRect(float left, float top, float right, float bottom);
+// A bar's place as a fraction of the way it can go. Raises "Division by zero" where there is no way at all,
+// so that a bar on a collapsed surface keeps its last good place.
+[[nodiscard]] float fractionOf(float distance, float way);
 // Whether a point, rounded the same way, lies in it.
 [[nodiscard]] bool containsRounded(const Rect& rect, float x, float y);
 

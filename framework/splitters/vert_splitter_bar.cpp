@@ -50,11 +50,15 @@ void clsVertSplitterBar::MouseMove(std::int16_t /*button*/, std::int16_t /*shift
 void clsVertSplitterBar::MouseUp(std::int16_t /*button*/, std::int16_t /*shift*/, float x, float /*y*/) {
   if (!drag_.pointerIsSizing()) return drag_.cancel();
   drag_.finish();
-  left_ = x;
-  if (left_ < leftmost()) left_ = leftmost();
-  if (left_ > rightmost()) left_ = rightmost();
-  relative_ = (left_ - leftmost()) / drag_.surface().ViewScaleWidth();
+  moveTo(x);
   drag_.surface().Refresh();
+}
+
+void clsVertSplitterBar::moveTo(float left) {
+  if (left < leftmost()) left = leftmost();
+  if (left > rightmost()) left = rightmost();
+  relative_ = fractionOf(left - leftmost(), drag_.surface().ViewScaleWidth());
+  left_ = left;
 }
 
 void clsVertSplitterBar::Resize() {

@@ -51,6 +51,7 @@ class clsVertSplitterBar {
  private:
   [[nodiscard]] float leftmost() const;
   [[nodiscard]] float rightmost() const;
+  void moveTo(float left);
 
   Gdi& gdi_;
   ScreenMetrics metrics_;

@@ -83,14 +83,30 @@ TEST_F(MarkerTest, CornerOutside32BitsOverflows) {
   EXPECT_THROW(marker.draw(gdi, gdi.viewDc()), RuntimeError);
 }
 
-TEST_F(MarkerTest, IdIsCentredTwoPixelsAboveTheGlyph) {
-  marker.drawId(gdi, gdi.viewDc());
-  // Two letters of 8 x 12: 16 wide; the glyph begins at 38.
-  ASSERT_EQ(gdi.texts().size(), 1U);
-  EXPECT_EQ(gdi.texts()[0].text, "12");
-  EXPECT_EQ(gdi.texts()[0].topLeft, (Point{92, 24}));
-  EXPECT_EQ(deltaMarkerId("12"), "12d");
+TEST_F(MarkerTest, IdIsCentredTwoPixelsAboveTheHighestPointOfTheGlyph) {
+  const struct {
+    bool twoEnded;
+    bool delta;
+    std::int32_t y2;
+    Point topLeft;
+  } rows[] = {{false, false, 20, {92, 24}},  // two letters of 8 x 12: 16 wide; the glyph begins at 38
+              {false, true, 20, {92, 24}},   // a delta marker covers the same height
+              {true, false, 20, {92, 6}},    // the second end is the higher one
+              {true, true, 45, {92, 24}},    // the second end lies within the first triangle
+              {true, false, 80, {92, 24}}};
+  for (const auto& row : rows) {
+    gdi.clear();
+    marker.multiMarker = row.twoEnded;
+    marker.DELTA = row.delta;
+    marker.positionY2 = row.y2;
+    marker.drawId(gdi, gdi.viewDc());
+    ASSERT_EQ(gdi.texts().size(), 1U);
+    EXPECT_EQ(gdi.texts()[0].text, "12");
+    EXPECT_EQ(gdi.texts()[0].topLeft, row.topLeft) << row.y2;
+  }
 }
+
+TEST_F(MarkerTest, ADeltaMarkersIdIsItsPartnersWithADBehindIt) { EXPECT_EQ(deltaMarkerId("12"), "12d"); }
 
 }  // namespace
 }  // namespace frontpanels::testing
