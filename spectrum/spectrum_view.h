@@ -13,6 +13,9 @@
 
 namespace frontpanels {
 
+class clsBaseVFP;
+class FrequencyPlan;
+
 class SpectrumView {
  public:
   SpectrumView(const PanelEnvironment& environment, PanelHost& host, PanelContainer& container);
@@ -36,7 +39,13 @@ class SpectrumView {
   // Marker commands.
   void addMarker();
   void markerToMax();
+  void markerToMin();
 
+  // The parts behind the panel. They live as long as it does.
+  [[nodiscard]] clsBaseVFP& base();
+  [[nodiscard]] const FrequencyPlan& frequencyPlan() const;
+
+  static constexpr const char* kTypeName = "SpectrumView";
   static constexpr const char* kSpectrumPath = "Brantor Scanner/Spectrum/Spectrum Trace";
   static constexpr std::int16_t kSpectrumResultType = 25;
   static constexpr std::int32_t kMaxPoints = 513;
