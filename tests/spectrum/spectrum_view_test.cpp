@@ -1,0 +1,228 @@
+#include "spectrum/spectrum_view.h"
+
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <limits>
+#include <numeric>
+
+#include "framework/panel/base_vfp.h"
+#include "painters/multi_trace_painter.h"
+#include "spectrum/frequency_plan.h"
+#include "tests/support/fake_surface.h"
+#include "tests/support/recording_gdi.h"
+#include "tests/support/reporting_fixture.h"
+
+namespace frontpanels::testing {
+namespace {
+
+using Messages = std::vector<std::string>;
+
+class RecordingOwner : public PanelHost, public PanelContainer {
+ public:
+  std::vector<std::string> captions;
+  std::int32_t frontPanelOp(std::int32_t, std::int32_t, std::int16_t, const Variant&) override { return 0; }
+  void caption(std::string_view text) override { captions.emplace_back(text); }
+  void visible(bool) override {}
+  void viewState(std::int16_t) override {}
+};
+
+// A view of 800 x 600 pixels: the graph is 760 x 570 at (20, 15).
+class SpectrumViewTest : public ReportingTest {
+ protected:
+  SpectrumViewTest() {
+    view.dc = gdi.viewDc();
+    panel = std::make_unique<SpectrumView>(PanelEnvironment{gdi, windowing, view, hub, {15, 15}, ""}, owner,
+                                           owner);
+    panel->Form_Resize();
+    gdi.clear();
+  }
+  ~SpectrumViewTest() override {
+    panel.reset();
+    EXPECT_EQ(gdi.liveObjects(), 0);
+    EXPECT_EQ(gdi.liveDcs(), 0);
+    EXPECT_EQ(gdi.violations(), std::vector<std::string>{});
+  }
+
+  void publish(const std::vector<float>& levels) {
+    hub.publish(SpectrumView::kSpectrumPath, std::span(levels));
+  }
+  [[nodiscard]] std::vector<std::string> texts() const {
+    std::vector<std::string> result;
+    for (const TextValue& text : gdi.texts()) result.push_back(text.text);
+    return result;
+  }
+  [[nodiscard]] bool shows(const std::string& text) const {
+    const std::vector<std::string> all = texts();
+    return std::find(all.begin(), all.end(), text) != all.end();
+  }
+  // The trace's poly-lines: in the colour of trace 0.
+  [[nodiscard]] std::vector<PolylineValue> traceLines() const {
+    std::vector<PolylineValue> lines = gdi.polylines();
+    std::erase_if(lines, [](const PolylineValue& line) { return line.pen.color != rgb(50, 156, 50); });
+    return lines;
+  }
+
+  RecordingGdi gdi;
+  FakeWindowing windowing;
+  FakeGraphView view;
+  DataHub hub;
+  RecordingOwner owner;
+  std::unique_ptr<SpectrumView> panel;
+};
+
+TEST_F(SpectrumViewTest, PublishedSweepIsDrawnAndCopiedInOneTransfer) {
+  publish({-30, -50, -40});
+  ASSERT_EQ(traceLines().size(), 1U);
+  EXPECT_EQ(traceLines()[0].points.size(), 3U);
+  ASSERT_EQ(gdi.blits().size(), 1U);
+  EXPECT_EQ(gdi.blits()[0].destination, (Rect{20, 15, 780, 585}));
+  EXPECT_EQ(panel->base().traceManager().find(25), panel->base().traceManager().activeTrace());
+  EXPECT_TRUE(messages().empty());
+}
+
+TEST_F(SpectrumViewTest, SweepShorterThanTheOneBeforeShowsItsOwnPointsOnly) {
+  publish(std::vector<float>(513, -50.0F));
+  gdi.clear();
+  publish({-30, -50, -40});
+  EXPECT_EQ(traceLines()[0].points.size(), 3U);
+}
+
+TEST_F(SpectrumViewTest, MissingValuesBreakTheLine) {
+  publish({-30, -35, std::numeric_limits<float>::quiet_NaN(), -40, -45, -50});
+  ASSERT_EQ(traceLines().size(), 2U);
+  EXPECT_EQ(traceLines()[0].points.size(), 2U);
+  EXPECT_EQ(traceLines()[1].points.size(), 3U);
+}
+
+TEST_F(SpectrumViewTest, MoreThan513PointsAreAnArrayBoundsErrorAndThePictureStays) {
+  publish({-30, -50, -40});
+  gdi.clear();
+  publish(std::vector<float>(514, -50.0F));
+  EXPECT_EQ(messages(), Messages{"SpectrumView::DfiSpectrum_DataChanged()\rSubscript out of range"});
+  panel->Paint();
+  EXPECT_EQ(traceLines()[0].points.size(), 3U);
+}
+
+TEST_F(SpectrumViewTest, OperationTenTakesOnlyTheNumberTen) {
+  EXPECT_EQ(panel->vfpOp(0, 10, 9), -8);
+  EXPECT_EQ(panel->vfpOp(0, 10, "ten"), -8);
+  EXPECT_EQ(panel->vfpOp(0, 10, {}), -8);
+  EXPECT_EQ(panel->base().traceManager().activeTrace(), nullptr);
+  EXPECT_EQ(panel->vfpOp(0, 10, "10"), 0);
+  EXPECT_NE(panel->base().traceManager().find(25), nullptr);
+  EXPECT_EQ(panel->vfpOp(0, 10, 10), 0);
+  EXPECT_EQ(messages(), Messages{"addTraceObject() failed ...\r"
+                                 "This key is already associated with an element of this collection"});
+}
+
+TEST_F(SpectrumViewTest, FrequencyAxisShowsStartStopAndWidthOfADivision) {
+  EXPECT_EQ(panel->vfpSet(0, 13, 0, 98e6), 0);
+  EXPECT_EQ(panel->vfpSet(0, 14, 0, 20e6), 0);
+  publish({-30, -50, -40});
+  EXPECT_TRUE(shows("88 MHz"));
+  EXPECT_TRUE(shows("108 MHz"));
+  EXPECT_TRUE(shows("2 MHz/div"));
+  gdi.clear();
+  EXPECT_EQ(panel->vfpSet(0, 13, 0, 100e6), 0);
+  panel->Paint();
+  EXPECT_TRUE(shows("90 MHz"));
+  EXPECT_FALSE(shows("88 MHz"));
+}
+
+TEST_F(SpectrumViewTest, LevelAxisRunsDownFromTheReference) {
+  publish({-30, -50, -40});
+  EXPECT_TRUE(shows("-20"));
+  EXPECT_TRUE(shows("-120"));
+  gdi.clear();
+  EXPECT_EQ(panel->vfpSet(0, 717, 0, 0), 0);
+  EXPECT_EQ(panel->vfpSet(0, 716, 0, 5), 0);
+  panel->Paint();
+  EXPECT_TRUE(shows("0"));
+  EXPECT_TRUE(shows("-50"));
+  EXPECT_FALSE(shows("-120"));
+}
+
+TEST_F(SpectrumViewTest, CodesOfOthersAreAcceptedAndValuesThatAreNoNumberPassedOver) {
+  const FrequencyPlan before = panel->frequencyPlan();
+  EXPECT_EQ(panel->vfpSet(0, 11, 0, 5), 0);
+  EXPECT_EQ(panel->vfpSet(0, 15, 0, 5), 0);
+  EXPECT_EQ(panel->vfpSet(0, 18, 0, 5), 0);
+  EXPECT_EQ(panel->vfpSet(0, 13, 0, "abc"), 0);
+  EXPECT_EQ(panel->vfpSet(0, 14, 0, Variant::null()), 0);
+  EXPECT_EQ(panel->vfpSet(0, 13, 0, std::nan("")), 0);
+  EXPECT_EQ(panel->frequencyPlan(), before);
+  EXPECT_TRUE(messages().empty());
+  EXPECT_EQ(panel->vfpSet(0, 312, 0, "abc"), -8);  // the base's own
+}
+
+TEST_F(SpectrumViewTest, ClosedPanelIgnoresSweepsAndTheHost) {
+  EXPECT_EQ(panel->vfpOp(0, 1, {}), 0);
+  publish({-30, -50, -40});
+  EXPECT_EQ(panel->vfpOp(0, 10, 9), 0);
+  EXPECT_EQ(panel->vfpSet(0, 312, 0, "abc"), 0);
+  EXPECT_EQ(panel->base().traceManager().activeTrace(), nullptr);
+  EXPECT_TRUE(messages().empty());
+}
+
+TEST_F(SpectrumViewTest, HiddenViewTakesTheSweepWithoutDrawing) {
+  view.shown = false;
+  publish({-30, -50, -40});
+  EXPECT_TRUE(gdi.blits().empty());
+  view.shown = true;
+  panel->Paint();
+  EXPECT_EQ(traceLines().size(), 1U);
+}
+
+TEST_F(SpectrumViewTest, MarkerGoesToTheLargestValueAndArrowsWalkIt) {
+  publish({-30, -50, -20, -40});
+  panel->addMarker();
+  panel->markerToMax();
+  const auto marker = [this] { return panel->base().traceManager().activeTrace()->activeMarker(); };
+  EXPECT_EQ(marker()->point, 2);
+  panel->KeyDown(39, 0);
+  EXPECT_EQ(marker()->point, 3);
+  panel->KeyDown(37, 0);
+  panel->KeyDown(37, 0);
+  EXPECT_EQ(marker()->point, 1);
+  panel->KeyDown(65, 0);
+  EXPECT_EQ(marker()->point, 1);
+}
+
+TEST_F(SpectrumViewTest, ChangedConfigurationNamesWhatItCannotSetUp) {
+  class Other : public clsMultiTracePainter {
+   public:
+    using clsMultiTracePainter::clsMultiTracePainter;
+  };
+  const std::string failed = "SpectrumView::changedTraceConfiguration() failed ... ";
+  clsTraceManager& traces = panel->base().traceManager();
+  float count = 0;
+  traces.ListTraceTypes(ResultTypeRecord(28), count);
+  traces.addTraceObject(std::make_shared<Other>(gdi), 0);
+  traces.addTraceObject(std::make_shared<Other>(gdi), 106);
+  traces.addTraceObject(std::make_shared<Other>(gdi), 9999);
+  EXPECT_EQ(messages(),
+            (Messages{failed + "null trace\r", failed + "missing result type\r",
+                      failed + "unhandled result type\r", failed + "unrecognized result type\r"}));
+}
+
+TEST_F(SpectrumViewTest, EveryGraphicsCallMayFailAndTheNextSweepIsWhole) {
+  publish({-30, -50, -40});
+  panel->addMarker();
+  gdi.clear();
+  panel->Form_Resize();
+  const auto calls = static_cast<int>(gdi.calls().size());
+  for (int n = 1; n <= calls; ++n) {
+    gdi.failNthCall(n);
+    panel->Form_Resize();
+    gdi.failNothing();
+    panel->Form_Resize();
+    gdi.clear();
+    publish({-30, -50, -40});
+    ASSERT_EQ(traceLines().size(), 1U) << "after failing call " << n;
+    ASSERT_EQ(gdi.blits().size(), 1U) << "after failing call " << n;
+  }
+}
+
+}  // namespace
+}  // namespace frontpanels::testing
