@@ -22,6 +22,13 @@ constexpr std::int16_t kRightArrow = 39;
 constexpr double kDefaultReferenceDbm = -20.0;
 constexpr double kDefaultDbPerDivision = 10.0;
 
+// Room round the plot for its labels, in twips: a level of six characters at the left, a row of text above
+// and below.
+constexpr float kInsetLeftTwips = 720;
+constexpr float kInsetTopTwips = 360;
+constexpr float kInsetRightTwips = 180;
+constexpr float kInsetBottomTwips = 315;
+
 }  // namespace
 
 class SpectrumView::Implementation : public PanelControl {
@@ -265,6 +272,11 @@ void SpectrumView::Implementation::setUpTrace(clsMultiTracePainter& painter) {
   painter.gridScaleTop(kDefaultReferenceDbm);
   painter.setAutoScale(false);
   painter.xAxisStyle(1);
+  painter.yAxisLabel("dBm");
+  painter.gridScaleLeft(kInsetLeftTwips / metrics_.twipsPerPixelX);
+  painter.gridInsetTop(kInsetTopTwips / metrics_.twipsPerPixelY);
+  painter.gridScaleRight(kInsetRightTwips / metrics_.twipsPerPixelX);
+  painter.gridScaleBottom(kInsetBottomTwips / metrics_.twipsPerPixelY);
   adjustResolution();
   updateXAxisLabels();
 }

@@ -6,6 +6,7 @@
 #include "framework/support/error_handler.h"
 #include "framework/support/guard.h"
 #include "framework/support/numeric.h"
+#include "platform/gdi_scope.h"
 #include "traces/result_types.h"
 
 namespace frontpanels {
@@ -18,6 +19,7 @@ constexpr std::string_view kPhonePanel = "frmPhoneVfp";
 
 // A point this far away, in pixels of summed distance, is never chosen.
 constexpr std::int16_t kOutOfReachPx = 10000;
+constexpr std::int32_t kMarkerMoved = 0;
 // Pixels round a marker's glyph that still count as the marker: fingers and pens are not exact.
 constexpr double kHitMarginPx = 2.0;
 
@@ -47,12 +49,10 @@ std::size_t positionOf(const MarkerCollection& markers, const std::string& id) {
   return position;
 }
 
-// Drawn markers show which of them is the active one; exactly one may.
-void showAsActive(TraceObject& traceObject, const MarkerPointer& chosen) {
-  for (std::int16_t index = 0; index < traceObject.numberOfTraces(); ++index)
-    for (const MarkerPointer& marker : traceObject.traceMarkerCollections(index))
-      marker->active = marker == chosen;
-  chosen->active = true;
+// Drawn markers show which of them is the active one; the one before stops being it.
+void activate(TraceObject& traceObject, const MarkerPointer& marker) {
+  marker->active = true;
+  traceObject.activeMarker(marker);
 }
 
 bool hits(const clsMarker& marker, float x, float y) {
@@ -406,8 +406,8 @@ void clsTraceManager::MouseDown(std::int16_t button, std::int16_t shift, float x
 
 void clsTraceManager::MouseMove(std::int16_t button, std::int16_t shift, float xTwips, float yTwips) {
   guard("MouseMove() failed ...", [&] {
-    const bool drags = trackMarkers_ && activeTrace_ && !activeTrace_->markerCollection().empty() &&
-                       activeTrace_->mouseActiveMarker();
+    const bool drags = trackMarkers_ && activeTrace_ && activeTrace_->mouseActiveMarker() &&
+                       !activeTrace_->markerCollection().empty();
     if (!drags) {
       if (horizontalBar_)
         horizontalBar_->MouseMove(button, shift, xTwips / metrics_.twipsPerPixelX,
@@ -449,14 +449,14 @@ std::int32_t clsTraceManager::moveMarkerLeft() { return moveMarker(-1); }
 std::int32_t clsTraceManager::moveMarkerRight() { return moveMarker(+1); }
 
 std::int32_t clsTraceManager::moveMarker(std::int32_t step) {
-  if (!activeTrace_ || activeTrace_->markerCollection().empty()) return kNoMarkerToMove;
   return guarded("moveMarker() failed ...", kNoMarkerToMove, [&] {
+    if (!activeTrace_ || activeTrace_->markerCollection().empty()) return kNoMarkerToMove;
     const MarkerPointer marker = activeTrace_->activeMarker();
     if (!marker) raiseObjectVariableNotSet();
     const std::int32_t point = marker->point + step;
     if (step < 0 ? point >= 0 : point <= activeTrace_->traceSize()) marker->point = point;
     paintTraces(true);
-    return std::int32_t{0};
+    return kMarkerMoved;
   });
 }
 
@@ -488,8 +488,7 @@ void clsTraceManager::addMarker(std::int16_t traceId) {
     const SurfacePoint at = centre();
     traceObject.findNearestPoint(at.x, at.y, *marker);
     numberMarker(*marker);
-    showAsActive(traceObject, marker);
-    traceObject.activeMarker(marker);
+    activate(traceObject, marker);
     traceObject.addMarkerToTrace(marker, traceId);
     makeFirstMarker(marker);
     traceObject.mouseActiveMarker(marker);
@@ -508,8 +507,7 @@ void clsTraceManager::newMarkerAt(SurfacePoint at) {
   numberMarker(*marker);
   traceObject.markerCollection().add(marker, marker->id);
   makeFirstMarker(marker);
-  showAsActive(traceObject, marker);
-  traceObject.activeMarker(marker);
+  activate(traceObject, marker);
   traceObject.mouseActiveMarker(marker);
   paintTraces(true);
 }
@@ -551,8 +549,7 @@ void clsTraceManager::selectAMarker(SurfacePoint at) {
     const MarkerPointer marker = findNearestMarker(at.x, at.y, index);
     if (!marker) return;
     activeTrace_->selectedTraceIndex(index);
-    showAsActive(*activeTrace_, marker);
-    activeTrace_->activeMarker(marker);
+    activate(*activeTrace_, marker);
     activeTrace_->mouseActiveMarker(marker);
     makeFirstMarker(marker);
     paintTraces(true);

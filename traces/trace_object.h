@@ -73,12 +73,13 @@ class TraceObject {
   // Whether one marker spans all sub-traces.
   [[nodiscard]] virtual bool multiMarker() const = 0;
 
-  // Markers. The first item of a collection is the most recently chosen marker.
+  // Markers. The first item of a collection is the most recently chosen marker. A trace object without
+  // sub-traces answers an empty collection.
   [[nodiscard]] virtual MarkerCollection& markerCollection() = 0;
   // Raises "Subscript out of range" for a sub-trace that does not exist.
   [[nodiscard]] virtual MarkerCollection& traceMarkerCollections(std::int16_t traceIndex) = 0;
   [[nodiscard]] virtual MarkerPointer activeMarker() const = 0;
-  virtual void activeMarker(MarkerPointer marker) = 0;
+  virtual void activeMarker(MarkerPointer marker) = 0;  // the one before stops being `active`
   [[nodiscard]] virtual MarkerPointer mouseActiveMarker() const = 0;
   virtual void mouseActiveMarker(MarkerPointer marker) = 0;
   [[nodiscard]] virtual std::int16_t markerCount() const = 0;

@@ -80,7 +80,10 @@ class FakeTraceObject : public TraceObject {
     return collections_.at(static_cast<std::size_t>(index));
   }
   MarkerPointer activeMarker() const override { return active_; }
-  void activeMarker(MarkerPointer marker) override { active_ = std::move(marker); }
+  void activeMarker(MarkerPointer marker) override {
+    if (active_ && active_ != marker) active_->active = false;
+    active_ = std::move(marker);
+  }
   MarkerPointer mouseActiveMarker() const override { return mouseActive_; }
   void mouseActiveMarker(MarkerPointer marker) override { mouseActive_ = std::move(marker); }
   std::int16_t markerCount() const override { return count; }
@@ -92,7 +95,8 @@ class FakeTraceObject : public TraceObject {
     double best = 10000;
     const std::vector<Point>& points = subTraces[static_cast<std::size_t>(traceIndex.value_or(selected))];
     for (std::size_t i = 0; i < points.size(); ++i) {
-      const double distance = std::abs(points[i].x - x) + std::abs(points[i].y - y);
+      const double distance =
+          std::abs(points[i].x - static_cast<double>(x)) + std::abs(points[i].y - static_cast<double>(y));
       if (distance >= best) continue;
       best = distance;
       marker.positionX = points[i].x;
