@@ -24,8 +24,10 @@ class OffScreenSurface {
       if (previousFont_) gdi_.selectObject(dc_, previousFont_);
       if (previousBitmap_) gdi_.selectObject(dc_, previousBitmap_);
     }
-    if (bitmap_) gdi_.deleteObject(bitmap_);
+    if (bitmap_ && gdi_.deleteObject(bitmap_)) bitmap_ = {};
     if (dc_) gdi_.deleteDC(dc_);
+    // A bitmap that could not be selected out is free now that its context is gone.
+    if (bitmap_) gdi_.deleteObject(bitmap_);
     dc_ = {};
     bitmap_ = {};
     previousPen_ = {};

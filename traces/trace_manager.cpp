@@ -528,7 +528,8 @@ void clsTraceManager::newDeltaMarkerAt(SurfacePoint at) {
   paintTraces(true);
 }
 
-void clsTraceManager::makeFirstMarker(const MarkerPointer& marker, TraceObject* trace) {
+// By value: the marker may be named by its place in the very collection that is reordered.
+void clsTraceManager::makeFirstMarker(MarkerPointer marker, TraceObject* trace) {
   guard("makeFirstMarker() failed ...", [&] {
     if (!marker) raiseObjectVariableNotSet();
     MarkerCollection& markers = (trace != nullptr ? *trace : requireActive()).markerCollection();

@@ -101,7 +101,7 @@ class clsTraceManager {
   void addMarker(std::int16_t traceId);
   void addDeltaMarker();
   // Makes the marker item 1 of the trace's collection, of the active trace without one.
-  void makeFirstMarker(const MarkerPointer& marker, TraceObject* trace = nullptr);
+  void makeFirstMarker(MarkerPointer marker, TraceObject* trace = nullptr);
   [[nodiscard]] std::int16_t findHighestId();
   void addMarkerToMainCollection(const MarkerPointer& marker);  // reserved: does nothing
 

@@ -221,6 +221,13 @@ Size RecordingGdi::bitmapSize(DcHandle dc) const {
 void RecordingGdi::failNth(std::string_view name, int n) { failAt_[std::string(name)] = n; }
 void RecordingGdi::failAlways(std::string_view name) { failAlways_.emplace(name); }
 void RecordingGdi::failNthCall(int n) { failAnyAt_ = n; }
+std::vector<int> RecordingGdi::callsThatMayFail() const {
+  std::vector<int> places;
+  for (std::size_t i = 0; i < calls_.size(); ++i)
+    if (!calls_[i].name.starts_with("delete")) places.push_back(static_cast<int>(i) + 1);
+  return places;
+}
+
 void RecordingGdi::failNothing() {
   failAt_.clear();
   failAlways_.clear();

@@ -163,6 +163,9 @@ class RecordingGdi final : public Gdi {
   void failAlways(std::string_view name);
   void failNthCall(int n);
   void failNothing();
+  // The recorded calls by their place, from 1, that failNthCall can make fail without losing an object: all
+  // but the deletions, whose failure is a leak whatever the caller does.
+  [[nodiscard]] std::vector<int> callsThatMayFail() const;
 
   [[nodiscard]] DcHandle createCompatibleDC(DcHandle dc) override;
   bool deleteDC(DcHandle dc) override;
