@@ -123,8 +123,11 @@ TEST_F(RegionalSeparatorsTest, RegionalValueRewritesNumbersAndLeavesOtherTextAlo
 }
 
 TEST_F(RegionalSeparatorsTest, RegionalValueLeavesThePointWhereItIsTheUsersOwn) {
-  locale.values = {{LocaleItem::DecimalSeparator, "."}};
-  EXPECT_EQ(separators.RegionalValue(Variant("1.5")), "1.5");
+  const FixedLocale unchanging;
+  RegionalSeparators usual(unchanging);
+  EXPECT_EQ(usual.RegionalValue(Variant("1.5")), "1.5");
+  EXPECT_EQ(usual.listSeparator(), ",");
+  EXPECT_EQ(FixedLocale("12345").info(LocaleItem::DecimalSeparator, 4), "123");
 }
 
 struct FakeItemDataList : ItemDataList {

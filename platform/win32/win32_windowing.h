@@ -1,0 +1,19 @@
+// Window services of the real window system.
+#pragma once
+
+#include "platform/windowing.h"
+
+namespace frontpanels {
+
+class Win32Windowing final : public Windowing {
+ public:
+  WindowHandle setCapture(WindowHandle window) override;
+  [[nodiscard]] WindowHandle getCapture() override;
+  void releaseCapture() override;
+  bool setTopmost(WindowHandle window, bool topmost) override;
+};
+
+// Asks the screen for its scale; the usual one where it does not answer.
+[[nodiscard]] ScreenMetrics readScreenMetrics();
+
+}  // namespace frontpanels
