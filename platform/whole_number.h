@@ -1,5 +1,5 @@
-// Whole-number conversions of the defined arithmetic: halves go to the even neighbour, a value outside the target
-// width (a not-a-number included) raises "Overflow".
+// Whole-number conversions of the defined arithmetic: halves go to the even neighbour, a value outside the
+// target width (a not-a-number included) raises "Overflow".
 #pragma once
 
 #include <cmath>
@@ -9,11 +9,12 @@
 
 namespace frontpanels {
 
-// Relies on the default floating-point environment (round to nearest, ties to even), which nothing here changes.
+// Relies on the default floating-point environment (round to nearest, ties to even), which nothing here
+// changes.
 [[nodiscard]] inline double roundHalfEven(double value) noexcept { return std::nearbyint(value); }
 
-// Whether the rounded value has a 32-bit representation: -2147483648.5 rounds to the even -2147483648 and fits,
-// 2147483647.5 rounds up and does not.
+// Whether the rounded value has a 32-bit representation: -2147483648.5 rounds to the even -2147483648 and
+// fits, 2147483647.5 rounds up and does not.
 [[nodiscard]] inline bool fitsInt32(double value) noexcept {
   return value >= -2147483648.5 && value < 2147483647.5;
 }

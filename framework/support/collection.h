@@ -60,6 +60,8 @@ class Collection {
     }
     bool operator==(const ItemIterator&) const = default;
   };
+  template <class Base>
+  ItemIterator(Base) -> ItemIterator<Base>;
 
   [[nodiscard]] std::size_t position(std::string_view key) const noexcept {
     const auto found = std::find_if(entries_.begin(), entries_.end(), [key](const Entry& entry) {
