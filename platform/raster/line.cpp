@@ -73,74 +73,40 @@ LineWalk clippedWalk(PixelRows rows, const Rect& clip, Point from, Point to) noe
       .errorWrap = static_cast<std::int64_t>(2 * slope.n)};
 }
 
-namespace {
-
-inline std::uint32_t* drawRun(std::uint32_t* pixel, std::ptrdiff_t step, std::int32_t count,
-                              std::uint32_t color) noexcept {
-  for (; count > 0; --count, pixel += step) *pixel = color;
-  return pixel;
-}
-
 // A line of m steps across is m + 1 runs along its longer axis; only their lengths need arithmetic, not each
 // pixel.
-void drawRuns(std::uint32_t* pixel, std::ptrdiff_t major, std::ptrdiff_t minor, std::int32_t n,
-              std::int32_t m, std::int32_t bias, std::uint32_t color) noexcept {
-  if (m == 1) {  // most segments of a dense trace
-    const std::int32_t firstRun = (n + bias + 1) / 2;
-    pixel = drawRun(pixel, major, firstRun, color) + minor;
-    drawRun(pixel, major, n - firstRun, color);
-    return;
-  }
+void drawRuns(const SolidLine& line, std::uint32_t color) noexcept {
+  const std::int32_t n = line.n;
+  const std::int32_t m = line.m;
   const std::int32_t quotient = n / m;
   const std::int32_t remainder = n % m;
   // The first run ends at step ceil((n + bias) / 2 m); `slack` is by how much that was rounded up, times 2 m.
-  std::int32_t run = (quotient + 1) / 2 + (quotient % 2 == 0 && remainder + bias > 0 ? 1 : 0);
-  std::int32_t slack = run * 2 * m - (n + bias);
+  std::int32_t run = (quotient + 1) / 2 + (quotient % 2 == 0 && remainder + line.bias > 0 ? 1 : 0);
+  std::int32_t slack = run * 2 * m - (n + line.bias);
   std::int32_t left = n;
+  std::uint32_t* pixel = line.pixel;
   for (std::int32_t k = 0; k < m; ++k) {
-    pixel = drawRun(pixel, major, run, color) + minor;
+    pixel = drawRun(pixel, line.major, run, color) + line.minor;
     left -= run;
     const bool longer = 2 * remainder > slack;
     run = quotient + (longer ? 1 : 0);
     slack += (longer ? 2 * m : 0) - 2 * remainder;
   }
-  drawRun(pixel, major, left, color);
+  drawRun(pixel, line.major, left, color);
 }
 
 // Near a diagonal the runs are so short that stepping is quicker.
-void drawSteps(std::uint32_t* pixel, std::ptrdiff_t major, std::ptrdiff_t minor, std::int32_t n,
-               std::int32_t m, std::int32_t bias, std::uint32_t color) noexcept {
-  std::int32_t error = n - bias;
-  for (std::int32_t i = 0; i < n; ++i) {
+void drawSteps(const SolidLine& line, std::uint32_t color) noexcept {
+  std::uint32_t* pixel = line.pixel;
+  std::int32_t error = line.n - line.bias;
+  for (std::int32_t i = 0; i < line.n; ++i) {
     *pixel = color;
-    pixel += major;
-    error += 2 * m;
-    const bool wrap = error >= 2 * n;
-    error -= wrap ? 2 * n : 0;
-    pixel += wrap ? minor : 0;
-  }
-}
-
-}  // namespace
-
-void drawSolidInside(PixelRows rows, Point from, Point to, std::uint32_t color) noexcept {
-  const std::int32_t dx = to.x - from.x;
-  const std::int32_t dy = to.y - from.y;
-  const std::int32_t width = std::abs(dx);
-  const std::int32_t height = std::abs(dy);
-  std::uint32_t* const pixel = rows.at(from.x, from.y);
-  const std::ptrdiff_t stepX = dx < 0 ? -1 : 1;
-  const std::ptrdiff_t stepY = dy < 0 ? -rows.stride : rows.stride;
-  if (dx == 0) {
-    drawRun(pixel, stepY, height, color);
-  } else if (dy == 0) {
-    std::fill_n(dx > 0 ? pixel : pixel + dx + 1, width, color);
-  } else if (width >= height) {
-    const auto draw = width >= 4 * height ? drawRuns : drawSteps;
-    draw(pixel, stepX, stepY, width, height, dy > 0 ? 1 : 0, color);
-  } else {
-    const auto draw = height >= 4 * width ? drawRuns : drawSteps;
-    draw(pixel, stepY, stepX, height, width, dx > 0 ? 1 : 0, color);
+    pixel += line.major;
+    error += 2 * line.m;
+    if (error >= 2 * line.n) {
+      error -= 2 * line.n;
+      pixel += line.minor;
+    }
   }
 }
 

@@ -354,6 +354,13 @@ bool RasterGdi::bitBlt(DcHandle to, Rect destination, DcHandle from, Point sourc
         origin->rows.at(static_cast<std::int32_t>(left + shiftX), static_cast<std::int32_t>(y + shiftY)),
         static_cast<std::size_t>(right - left) * sizeof(std::uint32_t));
   };
+  const bool wholeRows = right - left == target->rows.stride && target->rows.stride == origin->rows.stride;
+  if (wholeRows) {  // then they lie one behind the other
+    std::memmove(target->rows.at(0, static_cast<std::int32_t>(top)),
+                 origin->rows.at(0, static_cast<std::int32_t>(top + shiftY)),
+                 static_cast<std::size_t>((bottom - top) * target->rows.stride) * sizeof(std::uint32_t));
+    return true;
+  }
   // Within one bitmap, rows are copied in the order that reads each before it is overwritten.
   if (shiftY >= 0) {
     for (std::int64_t y = top; y < bottom; ++y) copyRow(y);
