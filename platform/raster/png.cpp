@@ -58,7 +58,7 @@ bool writePng(const std::filesystem::path& path, const PixelView& pixels, std::s
   file.close();
   if (file) return true;
   std::error_code ignored;
-  std::filesystem::remove(path, ignored);
+  if (std::filesystem::is_regular_file(path, ignored)) std::filesystem::remove(path, ignored);  // never a device
   return fail(error, "The file \"" + path.string() + "\" could not be written wholly.");
 }
 
