@@ -58,7 +58,8 @@ bool writePng(const std::filesystem::path& path, const PixelView& pixels, std::s
   file.close();
   if (file) return true;
   std::error_code ignored;
-  if (std::filesystem::is_regular_file(path, ignored)) std::filesystem::remove(path, ignored);  // never a device
+  if (std::filesystem::is_regular_file(path, ignored))
+    std::filesystem::remove(path, ignored);  // never a device
   return fail(error, "The file \"" + path.string() + "\" could not be written wholly.");
 }
 
