@@ -35,7 +35,10 @@ class SelectedPen {
     if (pen_) previous_ = gdi_.selectObject(dc_, pen_);
   }
   ~SelectedPen() {
-    if (previous_) gdi_.selectObject(dc_, previous_);
+    // A pen that stayed selected could not be deleted: where the previous one is refused, a stock pen takes
+    // its place.
+    if (previous_ && !gdi_.selectObject(dc_, previous_))
+      gdi_.selectObject(dc_, gdi_.stockPen(StockPen::Black));
     if (pen_) gdi_.deleteObject(pen_);
   }
   SelectedPen(const SelectedPen&) = delete;
