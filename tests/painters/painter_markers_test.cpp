@@ -1,0 +1,239 @@
+// Markers on the traces of a painter.
+#include "tests/painters/painter_fixture.h"
+
+namespace frontpanels {
+namespace {
+
+using testing::kGap;
+using testing::kGreen;
+using testing::TextValue;
+using Messages = std::vector<std::string>;
+
+class PainterMarkersTest : public testing::PainterTest {
+ protected:
+  [[nodiscard]] std::string readout() {
+    gdi.clear();
+    painter.updateMarkerDisplay(dc, {});
+    return gdi.texts().empty() ? "" : gdi.texts().back().text;
+  }
+  // A panel with room for a read-out: plot (15, 44) of 580 x 40, frequencies 100 to 109 MHz.
+  void widen() {
+    painter.scaleWidth(600);
+    painter.scaleHeight(70);
+    painter.gridInsetTop(24);
+    painter.xAxisStyle(0);
+    painter.xAxisFormatter().frequencySuffix();
+    painter.yAxisFormatter().dBmSuffix();
+    painter.xStart(100e6);
+    painter.xStop(109e6);
+  }
+  void show() {
+    paint();
+    painter.Label(dc, {});
+  }
+};
+
+TEST_F(PainterMarkersTest, TheNearestPointIsTheOneWithTheSmallestSumOfDifferences) {
+  give({0, -50, -100, -50});  // (15, 24) (25, 44) (35, 64) (45, 44)
+  paint();
+  struct NearCase {
+    float x;
+    float y;
+    std::int32_t point;
+  };
+  const std::vector<NearCase> cases = {
+      {15, 24, 0},       {35, 44, 1},  // 10 from points 1 and 3: the lower index
+      {36, 44, 3},       {25, 54, 1},  // 10 against 20
+      {14.4F, 10000, 2},               // over 9936 away, still below 10000
+  };
+  clsMarker marker;
+  for (const NearCase& c : cases) {
+    painter.findNearestPoint(c.x, c.y, marker);
+    EXPECT_EQ(marker.point, c.point) << c.x;
+  }
+  painter.findNearestPoint(15, 10100, marker);  // nothing within 10000
+  EXPECT_EQ(marker.point, 2);
+  painter.findNearestPoint(15, 40000, marker);
+  EXPECT_EQ(messages(), Messages{"findNearestPoint() ...\rOverflow"});
+}
+
+TEST_F(PainterMarkersTest, ExtremesAreFoundInTheDataGapsAside) {
+  const float infinite = std::numeric_limits<float>::infinity();
+  give({infinite, -20, -5, -5, -90, -90, kGap, -infinite});
+  const MarkerPointer marker = addMarker("1", 0);
+  painter.activeMarker(marker);
+
+  painter.markerToMax();
+  EXPECT_EQ(marker->point, 2);  // the first of two
+  painter.markerToMin();
+  EXPECT_EQ(marker->point, 4);
+
+  give({-1, -2});  // new values are searched anew
+  painter.markerToMin();
+  EXPECT_EQ(marker->point, 1);
+  give({kGap, kGap});
+  painter.markerToMax();
+  EXPECT_EQ(marker->point, 1);
+  EXPECT_EQ(messages(), Messages{});
+
+  painter.trace(Variant(Variant::Int16s{-9, -3}));
+  painter.markerToMin();
+  EXPECT_EQ(marker->point, 0);
+  EXPECT_EQ(messages(),
+            Messages{"clsMultiTracePainter::computeMinMax() ... unhandled array type.  Using Variant "
+                     "(SLOW!)\r"});
+}
+
+TEST_F(PainterMarkersTest, EveryKeyButTheRightArrowMovesLeftEvenBelowZero) {
+  give({0, 0});
+  painter.KeyPress(39);  // no active marker: nothing
+  const MarkerPointer marker = addMarker("1", 0);
+  painter.activeMarker(marker);
+  EXPECT_TRUE(marker->active);
+
+  painter.KeyPress(39);
+  EXPECT_EQ(marker->point, 1);
+  painter.KeyPress(37);
+  painter.KeyPress(65);
+  EXPECT_EQ(marker->point, -1);
+  marker->point = std::numeric_limits<std::int32_t>::max();
+  painter.KeyPress(39);
+  EXPECT_EQ(messages(), Messages{"clsMultiTracePainter::KeyPress()\rOverflow"});
+}
+
+TEST_F(PainterMarkersTest, MarkersAreDrawnOnTheirPointsInTheTraceColour) {
+  give({0, -50, kGap, -50});
+  addMarker("1", 1);
+  addMarker("2", 2);  // a gap
+  addMarker("3", 9);  // no such point
+  paint();
+  gdi.clear();
+
+  painter.drawMarkers(dc);
+
+  std::vector<std::string> ids;
+  for (const TextValue& text : gdi.texts()) ids.push_back(text.text);
+  EXPECT_EQ(ids, std::vector<std::string>{"1"});
+  EXPECT_EQ(painter.findMarker("1")->positionX, 25);
+  EXPECT_EQ(painter.findMarker("1")->positionY, 44);
+  const auto created = gdi.callsOf("createPen");
+  ASSERT_EQ(created.size(), 1U);
+  EXPECT_EQ(created[0].pen, (testing::PenValue{PenStyle::Solid, 1, kGreen}));
+}
+
+TEST_F(PainterMarkersTest, TheActiveMarkerReadsItsFrequencyAndLevel) {
+  widen();
+  give({-10, -20.25F, -30, -40, -50, -60, -70, -80, -90, -100});
+  painter.activeMarker(addMarker("1", 1));
+  show();
+
+  EXPECT_EQ(readout(), "1  101 MHz  -20.25 dBm");
+  // 22 letters of 8 up to the plot's right edge at 595, 2 below the panel's top.
+  EXPECT_EQ(gdi.texts().back().topLeft, (Point{419, 22}));
+  painter.activeMarker()->point = 9;
+  EXPECT_EQ(readout(), "1  109 MHz  -100 dBm");  // the last point is the stop
+
+  painter.xStop(100.09e6);  // points 10 kHz apart
+  painter.activeMarker()->point = 3;
+  painter.xMarkerFormatString("0.000000");
+  EXPECT_EQ(readout(), "1  100.030000 MHz  -40 dBm");
+  painter.autoFormatX(true);
+  EXPECT_EQ(readout(), "1  100.03 MHz  -40 dBm");
+}
+
+TEST_F(PainterMarkersTest, ADeltaMarkerReadsDifferencesOfStoredValues) {
+  widen();
+  give({-10, -20.1F, -20.5F, -40, -50});
+  const MarkerPointer marker = addMarker("1", 2);
+  const MarkerPointer delta = addMarker("1d", 1);
+  delta->DELTA = true;
+  delta->deltaPartner = "1";
+  marker->deltaPartner = "1d";
+  painter.activeMarker(marker);
+  show();
+
+  // 0.4 dB is less than a pixel.
+  EXPECT_EQ(readout(), "1  102 MHz  -20.5 dBm   1d  -1 MHz  +0.4 dB");
+  painter.activeMarker(delta);
+  EXPECT_EQ(readout(), "1d  -1 MHz  +0.4 dB");
+}
+
+TEST_F(PainterMarkersTest, AReadoutThatFindsNoRoomIsShortened) {
+  widen();
+  give({-10, -20, -30});
+  painter.activeMarker(addMarker("1", 1));
+  show();
+  EXPECT_EQ(readout(), "1  101 MHz  -20 dBm");  // 19 letters: from 443
+
+  painter.topLabel(std::string(54, 't'));  // 15 + 432 = 447
+  painter.Label(dc, {});
+  EXPECT_EQ(readout(), "1  -20 dBm");
+  painter.topLabel(std::string(63, 't'));  // 15 + 504 = 519, and 595 - 80 = 515
+  painter.Label(dc, {});
+  EXPECT_EQ(readout(), "");
+}
+
+TEST_F(PainterMarkersTest, MarkersReturnToTheirFrequencyAfterTheAxisMoved) {
+  widen();
+  give({0, 0, 0, 0, 0, 0, 0, 0, 0, 0});
+  const MarkerPointer inside = addMarker("1", 4);  // 104 MHz
+  const MarkerPointer outside = addMarker("2", 9);
+  paint();
+  painter.updateMarkerDisplay(dc, {});
+
+  painter.xStart(102e6);
+  painter.xStop(106.5e6);  // 0.5 MHz a point
+  painter.ResetMarkers();
+  EXPECT_EQ(inside->point, 4);
+  EXPECT_EQ(outside->point, 9);
+  painter.xStart(103e6);
+  painter.xStop(112e6);
+  painter.ResetMarkers();
+  EXPECT_EQ(inside->point, 1);
+
+  painter.span(0);
+  painter.ResetMarkers();
+  EXPECT_EQ(messages(), Messages{"ResetMarkers() failed...divide-by-zero error\rDivision by zero"});
+}
+
+TEST_F(PainterMarkersTest, DeletingAMarkerTakesItsDeltaMarkerAndActivatesTheFirstLeft) {
+  give({0, 0});
+  const MarkerPointer other = addMarker("2", 0);
+  const MarkerPointer marker = addMarker("1", 0);
+  const MarkerPointer delta = addMarker("1d", 1);
+  delta->DELTA = true;
+  delta->deltaPartner = "1";
+  marker->deltaPartner = "1d";
+  painter.activeMarker(marker);
+
+  painter.deleteActiveMarker();
+
+  EXPECT_EQ(painter.markerCollection().count(), 1U);
+  EXPECT_EQ(painter.activeMarker(), other);
+  EXPECT_FALSE(marker->active);
+  EXPECT_TRUE(other->active);
+  painter.deleteActiveMarker();
+  painter.deleteActiveMarker();
+  EXPECT_EQ(painter.activeMarker(), nullptr);
+  EXPECT_EQ(messages(), Messages{});
+}
+
+TEST_F(PainterMarkersTest, AMarkerForNoTraceIsReported) {
+  give({0, 0});
+  addMarker("1", 0, 5);
+  addMarker("2", 0);
+  addMarker("2", 0);
+  EXPECT_EQ(painter.markerCollection().count(), 1U);
+  EXPECT_THROW((void)painter.traceMarkerCollections(1), RuntimeError);
+  painter.findNearestPoint(0, 0, *painter.findMarker("2"), std::int16_t{3});
+  EXPECT_EQ(
+      messages(),
+      (Messages{
+          "addMarkerToTrace() failed\rSubscript out of range",
+          "addMarkerToTrace() failed\rThis key is already associated with an element of this collection",
+          "traceMarkerCollections[Property Get]() ...\rSubscript out of range",
+          "findNearestPoint() ...\rSubscript out of range"}));
+}
+
+}  // namespace
+}  // namespace frontpanels

@@ -1,0 +1,140 @@
+#include "painters/plot_labels.h"
+
+#include <string>
+#include <vector>
+
+#include "tests/support/recording_gdi.h"
+#include "tests/support/reporting_fixture.h"
+
+namespace frontpanels {
+namespace {
+
+using testing::RecordingGdi;
+using testing::TextValue;
+
+// Panel (0, 0) to (300, 140), plot (50, 20) to (250, 100). A letter is 8 x 12 pixels.
+class PlotLabelsTest : public testing::ReportingTest {
+ protected:
+  void SetUp() override { fonts = {gdi.createFont({"axis"}), gdi.createFont({"corner"})}; }
+  void draw() { labels.draw(gdi, gdi.viewDc(), fonts, panel, plot); }
+  [[nodiscard]] std::vector<std::string> drawn() const {
+    std::vector<std::string> lines;
+    for (const TextValue& text : gdi.texts()) {
+      lines.push_back(text.font.face + " " + text.text + " " + std::to_string(text.topLeft.x) + "," +
+                      std::to_string(text.topLeft.y));
+    }
+    return lines;
+  }
+
+  RecordingGdi gdi;
+  LabelFonts fonts;
+  Rect panel{0, 0, 300, 140};
+  Rect plot{50, 20, 250, 100};
+  PlotLabels labels;
+};
+
+TEST_F(PlotLabelsTest, EveryLabelHasItsPlace) {
+  labels.yAxisTexts() = {"0", "-50", "-100"};
+  labels.text(LabelPlace::Left, "l");
+  labels.text(LabelPlace::Right, "rr");
+  labels.text(LabelPlace::XAxis, "xxx");
+  labels.text(LabelPlace::YUnit, "dBm");
+  labels.text(LabelPlace::Top, "t");
+  labels.text(LabelPlace::TopCenter, "tc");
+  labels.text(LabelPlace::Bottom, "b");
+  labels.text(LabelPlace::BottomCenter, "bcd");
+
+  draw();
+
+  EXPECT_EQ(drawn(), (std::vector<std::string>{"axis 0 38,14",      // 50 - 4 - 8; centred on line 20
+                                               "axis -50 22,54",    // line 60
+                                               "axis -100 14,94",   // line 100
+                                               "axis l 50,103",     // 3 under the plot
+                                               "axis rr 234,103",   // 250 - 16
+                                               "axis xxx 138,103",  // 50 + (200 - 24) / 2
+                                               "axis dBm 22,2",     // 50 - 4 - 24; 2 below the panel's top
+                                               "corner t 50,2", "corner tc 142,2",
+                                               "corner b 50,116",  // below the axis row: 103 + 12 + 1
+                                               "corner bcd 138,116"}));
+  EXPECT_EQ(gdi.texts().front().mode, BackgroundMode::Transparent);
+  EXPECT_EQ(gdi.texts().front().color, gdi.sysColor(SystemColor::ButtonText));
+}
+
+TEST_F(PlotLabelsTest, LeavesOutWhatWouldOverlapAnEarlierLabelOrLeaveThePanel) {
+  labels.yAxisTexts() = {"123456", "-50"};              // 48 wide: 50 - 4 - 48 is left of the panel
+  labels.text(LabelPlace::Left, "0123456789");          // 50..130
+  labels.text(LabelPlace::Right, "0123456789");         // 170..250
+  labels.text(LabelPlace::XAxis, "012345");             // 126..174 overlaps both
+  labels.text(LabelPlace::Top, "0123456789012");        // 50..154
+  labels.text(LabelPlace::TopCenter, "01");             // 142..158 overlaps by 12
+  labels.text(LabelPlace::BottomCenter, "second row");  // 116 + 12 is within 140
+  panel.bottom = 127;                                   // and one pixel too low now
+
+  draw();
+
+  EXPECT_EQ(drawn(), (std::vector<std::string>{"axis -50 22,94", "axis 0123456789 50,103",
+                                               "axis 0123456789 170,103", "corner 0123456789012 50,2"}));
+}
+
+TEST_F(PlotLabelsTest, TouchingLabelsBothStand) {
+  labels.text(LabelPlace::Left, "0123456789012");  // 50..154
+  labels.text(LabelPlace::Right, "012345678901");  // 154..250
+
+  draw();
+
+  EXPECT_EQ(drawn().size(), 2U);
+}
+
+TEST_F(PlotLabelsTest, ValueLabelsAreThinnedWhereLinesAreCloserThanText) {
+  // 80 pixels of plot, labels 12 high.
+  EXPECT_EQ(linesPerLabel(80, 6, 12), 1);   // 13.3 apart
+  EXPECT_EQ(linesPerLabel(72, 6, 12), 1);   // 12 apart: they touch
+  EXPECT_EQ(linesPerLabel(71, 6, 12), 2);   // 11.8
+  EXPECT_EQ(linesPerLabel(80, 20, 12), 3);  // 4 apart
+  EXPECT_EQ(linesPerLabel(0, 10, 12), 1);
+
+  labels.yAxisTexts() = {"0", "1", "2", "3", "4", "5", "6", "7", "8"};  // lines 10 apart
+  draw();
+  EXPECT_EQ(drawn(), (std::vector<std::string>{"axis 0 38,14", "axis 2 38,34", "axis 4 38,54", "axis 6 38,74",
+                                               "axis 8 38,94"}));
+}
+
+TEST_F(PlotLabelsTest, TextsAreMeasuredAgainOnlyAfterAChange) {
+  labels.text(LabelPlace::Left, "98 MHz");
+  draw();
+  gdi.clear();
+
+  labels.text(LabelPlace::Left, "98 MHz");
+  draw();
+  EXPECT_EQ(gdi.callsOf("textExtent").size(), 0U);
+  EXPECT_EQ(drawn(), std::vector<std::string>{"axis 98 MHz 50,103"});
+
+  plot.left = 60;
+  draw();
+  EXPECT_EQ(drawn().back(), "axis 98 MHz 60,103");
+  labels.text(LabelPlace::Left, "99 MHz");
+  draw();
+  EXPECT_EQ(drawn().back(), "axis 99 MHz 60,103");
+}
+
+TEST_F(PlotLabelsTest, ATextThatCouldNotBeMeasuredIsTriedAgain) {
+  labels.text(LabelPlace::Left, "98 MHz");
+  gdi.failAlways("textExtent");
+  draw();
+  EXPECT_EQ(drawn().size(), 0U);
+
+  gdi.failNothing();
+  draw();
+  EXPECT_EQ(drawn(), std::vector<std::string>{"axis 98 MHz 50,103"});
+}
+
+TEST_F(PlotLabelsTest, AReadoutFindsRoomBesideTheTopLabels) {
+  labels.text(LabelPlace::Top, "0123456789");  // 50..130
+  draw();
+
+  EXPECT_EQ(labels.roomFor(LabelPlace::Readout, {120, 12}), (Rect{130, 2, 250, 14}));
+  EXPECT_EQ(labels.roomFor(LabelPlace::Readout, {121, 12}), std::nullopt);
+}
+
+}  // namespace
+}  // namespace frontpanels
