@@ -27,9 +27,11 @@ std::string_view trimmed(std::string_view text) {
   return text.substr(first, text.find_last_not_of(' ') - first + 1);
 }
 
-// A negative power as a quotient: the same double on every platform, which pow of a negative exponent is not.
+// Read from its text: the nearest double on every platform, which pow is not for large exponents.
 double powerOfTen(int exponent) {
-  return exponent < 0 ? 1.0 / std::pow(10.0, -exponent) : std::pow(10.0, exponent);
+  double power = HUGE_VAL;
+  static_cast<void>(textToNumber("1e" + std::to_string(exponent), power));
+  return power;
 }
 
 int stepOf(double mantissa) {

@@ -2,7 +2,6 @@
 
 #include <gtest/gtest.h>
 
-#include <clocale>
 #include <cmath>
 #include <limits>
 #include <optional>
@@ -87,17 +86,6 @@ TEST(TextToNumber, RefusesEverythingElse) {
                            "1e99999999999999999999",
                            "١"})
     EXPECT_EQ(numberOf(text), std::nullopt) << text;
-}
-
-TEST(TextToNumber, IgnoresTheLocaleOfTheCLibrary) {
-  // Where the machine has none of them the locale stays "C" and the test still holds.
-  const std::string before = std::setlocale(LC_ALL, nullptr);
-  std::setlocale(LC_ALL, "de_DE.UTF-8");
-  const std::optional<double> number = numberOf("1.5");
-  const std::string text = numberToText(1.5);
-  std::setlocale(LC_ALL, before.c_str());
-  EXPECT_EQ(number, 1.5);
-  EXPECT_EQ(text, "1.5");
 }
 
 TEST(NumberToText, WritesDoublesInTheGeneralFormOfFifteenDigits) {

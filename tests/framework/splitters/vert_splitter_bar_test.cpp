@@ -103,18 +103,6 @@ TEST_F(VertSplitterBarTest, AReleaseOutsideLandsInsideTheSurface) {
   EXPECT_EQ(bar.SplitterBarLeft(), 408);  // 10 + 400 less its own 2
 }
 
-TEST_F(VertSplitterBarTest, AReleaseUnderAnotherPointerOnlyLetsGo) {
-  press(100);
-  surface.pointer = MousePointer::Default;
-  release(200);
-  EXPECT_EQ(windowing.releases, 1);
-  windowing.captured = WindowHandle{5};
-  release(200);
-  EXPECT_EQ(windowing.releases, 1);
-  EXPECT_EQ(bar.SplitterBarLeft(), 100);
-  EXPECT_EQ(surface.refreshes, 0);
-}
-
 TEST_F(VertSplitterBarTest, HoveringShowsTheSizingPointerOverTheDrawnWidth) {
   const struct {
     float left;
