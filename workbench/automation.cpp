@@ -1,0 +1,181 @@
+#include "workbench/automation.h"
+
+#include <windows.h>
+
+#include <algorithm>
+#include <cstring>
+#include <vector>
+
+#include "workbench/failure.h"
+#include "workbench/text.h"
+
+namespace frontpanels::workbench {
+namespace {
+
+// The texts of an exception belong to the caller.
+class ExceptionInfo {
+ public:
+  ExceptionInfo() = default;
+  ExceptionInfo(const ExceptionInfo&) = delete;
+  ExceptionInfo& operator=(const ExceptionInfo&) = delete;
+  ~ExceptionInfo() {
+    SysFreeString(info_.bstrSource);
+    SysFreeString(info_.bstrDescription);
+    SysFreeString(info_.bstrHelpFile);
+  }
+
+  [[nodiscard]] EXCEPINFO* receive() noexcept { return &info_; }
+  [[nodiscard]] std::string description() {
+    if (info_.pfnDeferredFillIn != nullptr) info_.pfnDeferredFillIn(&info_);
+    if (info_.bstrDescription != nullptr) return narrow(info_.bstrDescription);
+    return describe(info_.scode != 0 ? info_.scode : E_FAIL);
+  }
+
+ private:
+  EXCEPINFO info_{};
+};
+
+// Functions that only read a variant are declared without saying so.
+VARIANT* withoutConst(const VARIANT& variant) noexcept { return const_cast<VARIANT*>(&variant); }
+
+BSTR makeBstr(std::wstring_view text) {
+  const BSTR copy = SysAllocStringLen(text.data(), static_cast<UINT>(text.size()));
+  if (copy == nullptr) throw std::bad_alloc();
+  return copy;
+}
+
+}  // namespace
+
+Value::Value(bool value) noexcept : Value() {
+  variant_.vt = VT_BOOL;
+  variant_.boolVal = value ? VARIANT_TRUE : VARIANT_FALSE;
+}
+
+Value::Value(std::int16_t value) noexcept : Value() {
+  variant_.vt = VT_I2;
+  variant_.iVal = value;
+}
+
+Value::Value(std::int32_t value) noexcept : Value() {
+  variant_.vt = VT_I4;
+  variant_.lVal = value;
+}
+
+Value::Value(double value) noexcept : Value() {
+  variant_.vt = VT_R8;
+  variant_.dblVal = value;
+}
+
+Value::Value(std::string_view utf8) : Value() {
+  variant_.bstrVal = makeBstr(wide(utf8));
+  variant_.vt = VT_BSTR;
+}
+
+Value::Value(std::span<const float> singles) : Value() {
+  SAFEARRAY* const array = SafeArrayCreateVector(VT_R4, 0, static_cast<ULONG>(singles.size()));
+  if (array == nullptr) throw std::bad_alloc();
+  variant_.vt = VT_ARRAY | VT_R4;
+  variant_.parray = array;
+  void* data = nullptr;
+  check(SafeArrayAccessData(array, &data), "Filling an array");
+  if (!singles.empty()) std::memcpy(data, singles.data(), singles.size_bytes());
+  SafeArrayUnaccessData(array);
+}
+
+Value::Value(const Value& other) : Value() {
+  check(VariantCopy(&variant_, withoutConst(other.variant_)), "Copying a value");
+}
+
+VARIANT* Value::receive() noexcept {
+  VariantClear(&variant_);
+  return &variant_;
+}
+
+std::int32_t Value::toInt32() const {
+  Value converted;
+  check(VariantChangeType(&converted.variant_, withoutConst(variant_), 0, VT_I4), "Reading a whole number");
+  return converted.variant_.lVal;
+}
+
+std::string Value::toText() const {
+  Value converted;
+  check(VariantChangeType(&converted.variant_, withoutConst(variant_), 0, VT_BSTR), "Reading a text");
+  return narrow({converted.variant_.bstrVal, SysStringLen(converted.variant_.bstrVal)});
+}
+
+CLSID registeredClass(const std::string& progId) {
+  CLSID id{};
+  if (FAILED(CLSIDFromProgID(wide(progId).c_str(), &id))) throw NotRegistered(progId);
+  return id;
+}
+
+ComPointer<IUnknown> createObject(const std::string& progId) {
+  ComPointer<IUnknown> object;
+  const HRESULT result = CoCreateInstance(registeredClass(progId), nullptr, CLSCTX_INPROC_SERVER,
+                                          __uuidof(IUnknown), reinterpret_cast<void**>(object.receive()));
+  // The entry is left behind when the library's file was moved or registered for the other width only.
+  if (result == REGDB_E_CLASSNOTREG || result == HRESULT_FROM_WIN32(ERROR_MOD_NOT_FOUND))
+    throw NotRegistered(progId);
+  check(result, "Creating " + progId);
+  return object;
+}
+
+Automation Automation::create(const std::string& progId) {
+  ComPointer<IDispatch> object = createObject(progId).query<IDispatch>();
+  if (!object) throw HostFailure(progId + " cannot be called by name");
+  return Automation(std::move(object));
+}
+
+void Automation::call(const std::string& member, Arguments arguments) {
+  Value result;
+  invoke(DISPATCH_METHOD, member, arguments, result);
+}
+
+std::int32_t Automation::number(const std::string& member, Arguments arguments) {
+  Value result;
+  invoke(DISPATCH_METHOD | DISPATCH_PROPERTYGET, member, arguments, result);
+  return result.toInt32();
+}
+
+std::string Automation::text(const std::string& member, Arguments arguments) {
+  Value result;
+  invoke(DISPATCH_METHOD | DISPATCH_PROPERTYGET, member, arguments, result);
+  return result.toText();
+}
+
+void Automation::put(const std::string& property, const Value& value) {
+  VARIANT argument = value.variant();
+  DISPID named = DISPID_PROPERTYPUT;
+  DISPPARAMS parameters{&argument, &named, 1, 1};
+  ExceptionInfo exception;
+  const HRESULT result =
+      object_->Invoke(member(property), IID_NULL, LOCALE_USER_DEFAULT, DISPATCH_PROPERTYPUT, &parameters,
+                      nullptr, exception.receive(), nullptr);
+  if (result == DISP_E_EXCEPTION) throw HostFailure(property + ": " + exception.description());
+  check(result, "Setting " + property);
+}
+
+void Automation::invoke(WORD flags, const std::string& name, Arguments arguments, Value& result) {
+  const DISPID id = member(name);
+  // The last argument comes first. The copies borrow what the arguments own.
+  std::vector<VARIANT> reversed;
+  for (const Value& argument : arguments) reversed.push_back(argument.variant());
+  std::reverse(reversed.begin(), reversed.end());
+  DISPPARAMS parameters{reversed.data(), nullptr, static_cast<UINT>(reversed.size()), 0};
+  ExceptionInfo exception;
+  const HRESULT outcome = object_->Invoke(id, IID_NULL, LOCALE_USER_DEFAULT, flags, &parameters,
+                                          result.receive(), exception.receive(), nullptr);
+  if (outcome == DISP_E_EXCEPTION) throw HostFailure(name + ": " + exception.description());
+  check(outcome, "Calling " + name);
+}
+
+DISPID Automation::member(const std::string& name) {
+  if (const auto known = members_.find(name); known != members_.end()) return known->second;
+  std::wstring wideName = wide(name);
+  LPOLESTR pointer = wideName.data();
+  DISPID id = DISPID_UNKNOWN;
+  check(object_->GetIDsOfNames(IID_NULL, &pointer, 1, LOCALE_USER_DEFAULT, &id), "Looking up " + name);
+  return members_.emplace(name, id).first->second;
+}
+
+}  // namespace frontpanels::workbench

@@ -1,0 +1,121 @@
+#include "workbench/event_sink.h"
+
+#include <windows.h>
+
+#include <olectl.h>
+
+#include "workbench/automation.h"
+#include "workbench/failure.h"
+
+namespace frontpanels::workbench {
+namespace {
+
+DISPID memberOf(ITypeInfo& events, const wchar_t* name) {
+  std::wstring copy = name;
+  LPOLESTR pointer = copy.data();
+  MEMBERID id = DISPID_UNKNOWN;
+  check(events.GetIDsOfNames(&pointer, 1, &id), "Looking up an event of the panel");
+  return id;
+}
+
+std::int32_t numberOf(VARIANT& argument) {
+  VARIANT number;
+  VariantInit(&number);
+  check(VariantChangeType(&number, &argument, 0, VT_I4), "Reading an argument of an event");
+  return number.lVal;
+}
+
+// Writes in the type that the panel handed over.
+HRESULT writeStatus(VARIANT& place, std::int32_t status) {
+  switch (place.vt) {
+    case VT_BYREF | VT_I4:
+      *place.plVal = status;
+      return S_OK;
+    case VT_BYREF | VT_I2:
+      *place.piVal = static_cast<SHORT>(status);
+      return S_OK;
+    case VT_BYREF | VT_VARIANT:
+      VariantClear(place.pvarVal);
+      place.pvarVal->vt = VT_I4;
+      place.pvarVal->lVal = status;
+      return S_OK;
+    default:
+      return DISP_E_TYPEMISMATCH;
+  }
+}
+
+// The implemented interface that a class marks as its default source.
+ComPointer<ITypeInfo> defaultSource(ITypeInfo& classInfo) {
+  TYPEATTR* attributes = nullptr;
+  check(classInfo.GetTypeAttr(&attributes), "Reading the panel's class");
+  const UINT count = attributes->cImplTypes;
+  classInfo.ReleaseTypeAttr(attributes);
+  for (UINT i = 0; i < count; ++i) {
+    constexpr int kWanted = IMPLTYPEFLAG_FDEFAULT | IMPLTYPEFLAG_FSOURCE;
+    int flags = 0;
+    HREFTYPE reference = 0;
+    ComPointer<ITypeInfo> source;
+    if (SUCCEEDED(classInfo.GetImplTypeFlags(i, &flags)) && (flags & kWanted) == kWanted &&
+        SUCCEEDED(classInfo.GetRefTypeOfImplType(i, &reference)) &&
+        SUCCEEDED(classInfo.GetRefTypeInfo(reference, source.receive())))
+      return source;
+  }
+  throw HostFailure("The panel has no default source of events");
+}
+
+}  // namespace
+
+EventSink::EventSink(PanelRequests& requests, const IID& id, ITypeInfo& events)
+    : requests_(&requests), id_(id), frontPanelOp_(memberOf(events, L"frontPanelOp")) {}
+
+void* EventSink::findInterface(REFIID id) noexcept {
+  return id == IID_IUnknown || id == IID_IDispatch || id == id_ ? static_cast<IDispatch*>(this) : nullptr;
+}
+
+HRESULT EventSink::GetTypeInfoCount(UINT* count) {
+  if (count == nullptr) return E_POINTER;
+  *count = 0;
+  return S_OK;
+}
+
+HRESULT EventSink::GetTypeInfo(UINT, LCID, ITypeInfo** info) {
+  if (info != nullptr) *info = nullptr;
+  return E_NOTIMPL;
+}
+
+HRESULT EventSink::Invoke(DISPID member, REFIID, LCID, WORD, DISPPARAMS* parameters, VARIANT*, EXCEPINFO*,
+                          UINT*) {
+  return comBarrier([&]() -> HRESULT {
+    // frontPanelOp(hwId, vfpId, OP, argument, status), the last argument first.
+    enum { kStatus, kArgument, kOperation, kPanelId, kHardwareId, kCount };
+    const ComPointer<EventSink> alive(this);
+    if (requests_ == nullptr || member != frontPanelOp_) return DISP_E_MEMBERNOTFOUND;
+    if (parameters == nullptr || parameters->cArgs != kCount) return DISP_E_BADPARAMCOUNT;
+    VARIANT* const arguments = parameters->rgvarg;
+    return writeStatus(
+        arguments[kStatus],
+        requests_->frontPanelOp(numberOf(arguments[kHardwareId]), numberOf(arguments[kPanelId]),
+                                static_cast<std::int16_t>(numberOf(arguments[kOperation]))));
+  });
+}
+
+EventConnection::EventConnection(IUnknown& control, PanelRequests& requests) {
+  const ComPointer<IUnknown> object(&control);
+  const auto provider = object.query<IProvideClassInfo2>();
+  const auto container = object.query<IConnectionPointContainer>();
+  if (!provider || !container) throw HostFailure("The panel raises no events");
+  IID id{};
+  check(provider->GetGUID(GUIDKIND_DEFAULT_SOURCE_DISP_IID, &id), "Asking for the panel's events");
+  ComPointer<ITypeInfo> classInfo;
+  check(provider->GetClassInfo(classInfo.receive()), "Asking for the panel's class");
+  check(container->FindConnectionPoint(id, point_.receive()), "Finding the panel's events");
+  sink_ = makeComObject<EventSink>(requests, id, *defaultSource(*classInfo.get()).get());
+  check(point_->Advise(static_cast<IDispatch*>(sink_.get()), &cookie_), "Joining the panel's events");
+}
+
+EventConnection::~EventConnection() {
+  sink_->detach();
+  point_->Unadvise(cookie_);
+}
+
+}  // namespace frontpanels::workbench

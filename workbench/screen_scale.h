@@ -1,0 +1,25 @@
+// Pixels of the screen in the units of the container's interfaces.
+#pragma once
+
+#include <windows.h>
+
+namespace frontpanels::workbench {
+
+// Dots an inch; 96 where no screen tells.
+[[nodiscard]] int screenDpi() noexcept;
+
+[[nodiscard]] inline LONG twipsFromPixels(LONG pixels) noexcept {
+  constexpr int kTwipsAnInch = 1440;
+  return MulDiv(pixels, kTwipsAnInch, screenDpi());
+}
+
+// Hundredths of a millimetre.
+[[nodiscard]] inline LONG himetricFromPixels(LONG pixels) noexcept {
+  constexpr int kHimetricAnInch = 2540;
+  return MulDiv(pixels, kHimetricAnInch, screenDpi());
+}
+
+// A length drawn for 96 dots an inch.
+[[nodiscard]] inline int scaled(int pixels) noexcept { return MulDiv(pixels, screenDpi(), 96); }
+
+}  // namespace frontpanels::workbench
