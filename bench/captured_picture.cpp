@@ -15,7 +15,7 @@ PenHandle CapturingGdi::createPen(PenStyle style, std::int32_t widthPx, Color co
 
 RegionHandle CapturingGdi::createRectRgn(Rect rect) {
   const RegionHandle region = gdi_.createRectRgn(rect);
-  regions_[region.value] = rect;
+  if (capturing_) regions_[region.value] = rect;
   return region;
 }
 
@@ -46,6 +46,7 @@ FontHandle CapturingGdi::selectObject(DcHandle dc, FontHandle font) {
 }
 
 bool CapturingGdi::selectClipRgn(DcHandle dc, RegionHandle region) {
+  if (!capturing_) return gdi_.selectClipRgn(dc, region);
   if (region)
     keep(Clip{dc, regions_[region.value]});
   else
@@ -79,6 +80,7 @@ bool CapturingGdi::lineTo(DcHandle dc, Point to) {
 }
 
 bool CapturingGdi::polyline(DcHandle dc, std::span<const Point> points) {
+  if (!capturing_) return gdi_.polyline(dc, points);
   if (points.size() > 2)
     keep(Trace{dc, traces_++});
   else
@@ -87,7 +89,7 @@ bool CapturingGdi::polyline(DcHandle dc, std::span<const Point> points) {
 }
 
 bool CapturingGdi::textOut(DcHandle dc, Point topLeft, std::string_view text) {
-  keep(Text{dc, topLeft, std::string(text)});
+  if (capturing_) keep(Text{dc, topLeft, std::string(text)});
   return gdi_.textOut(dc, topLeft, text);
 }
 

@@ -22,7 +22,8 @@ struct PlotMapping {
 };
 
 // Forwards every call and keeps those that a picture is made of; asking for a text's size is not one of them.
-// A polyline of more than two points counts as a trace.
+// A polyline of more than two points counts as a trace. Allocates only while it captures, so that what is
+// measured through it is the panel's own.
 class CapturingGdi : public Gdi {
  public:
   explicit CapturingGdi(Gdi& gdi) : gdi_(gdi) {}
