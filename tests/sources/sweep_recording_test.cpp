@@ -78,6 +78,10 @@ TEST_F(SweepRecordingTest, PutsTheRowsOfASweepTogether) {
       {"another step", row(0, 100, "1") + "2020-01-01,00:00:10,110,130,20.00,1,2\n", "100: 1 | 110: 2"},
       {"overlapping rows", row(0, 100, "1,9,nan") + row(0, 110, "3,4"), "100: 1 9 4"},
       {"a row off the grid by less than half a bin", row(0, 100, "1") + row(0, 114, "2"), "100: 1 2"},
+      {"a row off the grid by more", row(0, 100, "1") + row(0, 116, "2"), "100: 1 gap 2"},
+      {"a sweep broken off, continued by one with other hops",
+       row(0, 100, "1") + row(0, 120, "2") + row(1, 110, "3") + row(1, 130, "4"),
+       "100: 1 gap 2 | 110: 3 gap 4"},
       {"a row twice", row(0, 100, "1") + row(0, 110, "2") + row(0, 110, "3") + row(0, 120, "4"),
        "100: 1 2 4"},
       {"CRLF and blank lines", row(0, 100, "1", "\r\n") + " \r\n\n" + row(0, 110, "2", "\r\n"), "100: 1 2"},
@@ -204,10 +208,19 @@ TEST_F(SweepRecordingTest, KeepsWhatItReadBeforeTheFileFailed) {
   EXPECT_EQ(sweeps(row(0, 100, "1") + row(0, 110, "2") + row(0, 120, "3")), "100: 1 2");
   EXPECT_EQ(recording->problems(),
             (std::vector<RowProblem>{{3, "the file cannot be read further: Device I/O error"}}));
+
+  files.failAtLine = 0;
+  recording->rewind();
+  Sweep sweep;
+  ASSERT_TRUE(recording->next(sweep));
+  EXPECT_EQ(text(sweep), "100: 1 2 3");
 }
 
 TEST_F(SweepRecordingTest, BoundsASweepWhateverItsRowsClaim) {
   // 4194304 bins of 10 Hz from 100 Hz on end at 41943140 Hz.
+  Sweep widest;
+  ASSERT_TRUE(open(row(0, 100, "1") + row(0, 41943130, "3"))->next(widest));
+  EXPECT_EQ(widest.levelsDb.size(), 4194304U);
   EXPECT_EQ(sweeps(row(0, 100, "1") + row(0, 110, "2") + row(0, 41943131, "3") + row(0, 120, "4")),
             "100: 1 2 4");
   EXPECT_EQ(recording->problems(),
