@@ -2,7 +2,6 @@
 
 #include "framework/panel/host_codes.h"
 #include "platform/gdi_scope.h"
-#include "platform/raster/png.h"
 #include "platform/runtime_error.h"
 
 namespace frontpanels {
@@ -28,6 +27,9 @@ HeadlessPanel::HeadlessPanel(const VerticalScale& scale)
       captionFont_(gdi_.createFont({"Arial", 13, 700})),
       panel_({gdi_, windowing_, view_, hub_, ScreenMetrics{}, ""}, host_, container_) {
   if (!view_.hdc() || !picture_) raiseOutOfMemory();
+  // The panel leaves margins round its graph, where a window has its background.
+  gdi_.fillRect(view_.hdc(), {0, 0, kGraph.width, kGraph.height},
+                gdi_.sysColorBrush(SystemColor::ButtonFace));
   panel_.Form_Resize();
   require(panel_.vfpOp(kHardwareId, kAddTraceOperation, kAddTraceOperation));
   set(kAutoScaleParameter, false);
@@ -62,14 +64,12 @@ void HeadlessPanel::drawCaption() {
   gdi_.textOut(picture_, {kCaptionIndentPx, (kCaptionHeightPx - textPx.height) / 2}, caption);
 }
 
-const std::vector<std::uint8_t>& HeadlessPanel::takePicture() {
+PixelView HeadlessPanel::picture() {
   panel_.Paint();
   drawCaption();
   const Rect graph = {0, kCaptionHeightPx, kPicture.width, kPicture.height};
   gdi_.bitBlt(picture_, graph, view_.hdc(), {0, 0}, RasterOp::SourceCopy);
-  std::string error;
-  if (!encodePng(gdi_.pixels(picture_), png_, error)) throw RuntimeError(5, error);
-  return png_;
+  return gdi_.pixels(picture_);
 }
 
 }  // namespace frontpanels

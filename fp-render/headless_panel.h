@@ -2,9 +2,7 @@
 #pragma once
 
 #include <cstdint>
-#include <span>
 #include <string>
-#include <vector>
 
 #include "framework/panel/panel_host.h"
 #include "platform/data_server.h"
@@ -74,8 +72,8 @@ class HeadlessPanel {
   HeadlessPanel& operator=(const HeadlessPanel&) = delete;
 
   void show(const DisplaySweep& sweep, const std::string& caption);
-  // What is shown, as the bytes of a PNG file. Raises a run-time error when it cannot be made.
-  [[nodiscard]] const std::vector<std::uint8_t>& takePicture();
+  // What is shown. Valid until the next call of anything here.
+  [[nodiscard]] PixelView picture();
 
  private:
   void set(std::int16_t parameterType, const Variant& value);
@@ -90,7 +88,6 @@ class HeadlessPanel {
   HeadlessHost host_;
   DataHub hub_;
   SpectrumView panel_;
-  std::vector<std::uint8_t> png_;
 };
 
 }  // namespace frontpanels

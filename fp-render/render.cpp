@@ -6,12 +6,14 @@
 #include <sstream>
 #include <string>
 #include <system_error>
+#include <vector>
 
 #include "fp-render/headless_panel.h"
 #include "fp-render/options.h"
 #include "fp-render/picture_file.h"
 #include "framework/support/error_handler.h"
 #include "framework/support/guard.h"
+#include "platform/raster/png.h"
 #include "platform/runtime_error.h"
 #include "sources/resample.h"
 #include "sources/sweep_recording.h"
@@ -136,7 +138,10 @@ class Renderer {
     }
     panel.show(display, captionOf(recording_.path(), sweep, survey_.sweeps));
     const fs::path path = fs::path(options_.directory) / pictureName(recording_.path(), sweep.number);
-    saveWhole(path, panel.takePicture());
+    std::string problem;
+    if (!encodePng(panel.picture(), png_, problem))
+      throw RuntimeError(kPathFileAccessError, path.string() + ": " + problem);
+    saveWhole(path, png_);
     ++drawn_;
     output_ << pictureLine(path, sweep) << '\n';
   }
@@ -146,6 +151,7 @@ class Renderer {
   std::ostream& output_;
   std::ostream& errors_;
   Survey survey_;
+  std::vector<std::uint8_t> png_;
   std::uint64_t drawn_ = 0;
 };
 

@@ -17,13 +17,13 @@ SECONDS_A_SWEEP = 5
 FIRST_HZ, HOPS, HOP_HZ, BINS = 88_000_000, 8, 2_500_000, 128
 STEP_HZ = HOP_HZ / BINS
 AVERAGES = 16  # transforms behind each value
-NOISE_FLOOR_DB = -61.0
+NOISE_FLOOR_DB = -51.5
 
 # Frequency, power (dB), loudness: how far the programme pushes the carrier on average (kHz).
 STATIONS = [
-    (88.4, -24, 34), (89.5, -36, 28), (90.9, -16, 40), (92.2, -30, 22), (93.1, -21, 36), (94.7, -8, 44),
-    (95.4, -40, 30), (96.8, -27, 26), (98.5, -18, 38), (100.2, -33, 30), (101.9, -14, 42), (103.6, -25, 18),
-    (104.4, -38, 34), (105.9, -20, 40), (107.3, -29, 24),
+    (88.4, -24, 34), (89.5, -31, 28), (90.9, -16, 40), (92.2, -30, 22), (93.1, -21, 36), (94.7, -8, 44),
+    (95.4, -34, 30), (96.8, -27, 26), (98.5, -18, 38), (100.2, -33, 30), (101.9, -14, 42), (103.6, -25, 18),
+    (104.4, -33, 34), (105.9, -20, 40), (107.3, -29, 24),
 ]
 OSCILLATOR_MHZ, OSCILLATOR_DB = 99.32, -22  # unmodulated, one bin wide
 FADING_MHZ = 100.2                          # a distant station that comes and goes

@@ -1,0 +1,79 @@
+#include "fp-render/headless_panel.h"
+
+#include <gtest/gtest.h>
+
+#include "framework/support/error_handler.h"
+
+namespace frontpanels {
+namespace {
+
+constexpr Color kTraceColor = rgb(50, 156, 50);
+
+// The highest pixel of the trace; (0, 0) when there is none.
+Point highestOfTrace(const PixelView& picture) {
+  for (std::int32_t y = 0; y < picture.sizePx.height; ++y) {
+    for (std::int32_t x = 0; x < picture.sizePx.width; ++x) {
+      if (picture.at(x, y) == kTraceColor) return {x, y};
+    }
+  }
+  return {};
+}
+
+// Where a peak of -10 dB in one of 1001 bins is drawn: from 100 MHz on, 100 kHz apart, the others at -90 dB.
+Point peakOfBin(std::size_t bin) {
+  Sweep sweep;
+  sweep.startHz = 100e6;
+  sweep.stepHz = 1e5;
+  sweep.levelsDb.assign(1001, -90.0F);
+  sweep.levelsDb[bin] = -10.0F;
+  DisplaySweep display;
+  resample(sweep, display);
+  HeadlessPanel panel({0, 10});
+  panel.show(display, "a caption");
+  return highestOfTrace(panel.picture());
+}
+
+TEST(HeadlessPanel, DrawsEveryBinAtItsFrequencyFromEdgeToEdge) {
+  messageLog().clear();
+  const Point first = peakOfBin(0);
+  const Point last = peakOfBin(1000);
+  const std::int32_t graphWidthPx = last.x - first.x;
+  EXPECT_GT(graphWidthPx, 600);
+  // A cell has two bins; the graph shows 511 steps of cells.
+  EXPECT_NEAR(peakOfBin(250).x, first.x + graphWidthPx / 4, 2);
+  EXPECT_NEAR(peakOfBin(500).x, first.x + graphWidthPx / 2, 2);
+  EXPECT_NEAR(peakOfBin(900).x, first.x + graphWidthPx * 9 / 10, 2);
+  EXPECT_EQ(messageLog().count(), 0U);
+}
+
+TEST(HeadlessPanel, ShowsTheLastSweepOnly) {
+  Sweep sweep;
+  sweep.startHz = 100e6;
+  sweep.stepHz = 1e6;
+  sweep.levelsDb.assign(100, -10.0F);
+  DisplaySweep display;
+  resample(sweep, display);
+  HeadlessPanel panel({0, 10});
+  panel.show(display, "high");
+  const Point high = highestOfTrace(panel.picture());
+  sweep.levelsDb.assign(100, -80.0F);
+  resample(sweep, display);
+  panel.show(display, "low");
+  // Seventy of the hundred decibels lower, in a graph some five hundred pixels high.
+  EXPECT_NEAR(highestOfTrace(panel.picture()).y - high.y, 350, 30);
+}
+
+TEST(HeadlessPanel, DrawsNothingInAGap) {
+  Sweep sweep;
+  sweep.startHz = 100e6;
+  sweep.stepHz = 1e6;
+  sweep.levelsDb.assign(100, kGap);
+  DisplaySweep display;
+  resample(sweep, display);
+  HeadlessPanel panel({0, 10});
+  panel.show(display, "");
+  EXPECT_EQ(highestOfTrace(panel.picture()), (Point{0, 0}));
+}
+
+}  // namespace
+}  // namespace frontpanels
