@@ -62,6 +62,7 @@ std::unique_ptr<SweepRecording> SweepRecording::open(TextFiles& files, const std
 void SweepRecording::rewind() {
   reader_ = openNamed(files_, path_);
   readFailed_ = false;
+  cutShort_ = false;
   rowPending_ = false;
   startSweep();
   sweepNumber_ = 0;
@@ -118,6 +119,7 @@ bool SweepRecording::readLine() {
     if (!reader_->readLine(line_)) return false;
   } catch (const RuntimeError& error) {
     readFailed_ = true;
+    cutShort_ = true;
     keepProblem(line_.number + 1, "the file cannot be read further: " + error.description());
     return false;
   }
@@ -208,6 +210,7 @@ void SweepRecording::distrustLastValue() {
   if (!rowIsLast || whole) return;
   const bool lastDropped = row_.writtenValues == row_.rangeBins + 1;
   if (!lastDropped) levels_.back() = kGap;
+  cutShort_ = true;
   keepProblem(rowLine_, "the file ends within this row; its last value is left out");
 }
 
@@ -245,8 +248,13 @@ void SweepRecording::keepProblem(std::uint64_t line, std::string text) {
 
 std::string SweepRecording::problemReport() const {
   if (problems_.empty()) return {};
-  std::string report = path_ + ": " + rowsText(unreadableRows_) + " could not be read, " +
-                       std::to_string(rowsOutOfOrder_) + " out of order";
+  std::string report = path_ + ":";
+  const auto add = [&report](const std::string& text) {
+    report += (report.ends_with(':') ? " " : ", ") + text;
+  };
+  if (unreadableRows_ != 0) add(rowsText(unreadableRows_) + " could not be read");
+  if (rowsOutOfOrder_ != 0) add(rowsText(rowsOutOfOrder_) + " out of order");
+  if (cutShort_) add("cut short");
   for (const RowProblem& problem : problems_) report += lineText(problem);
   if (unreadableRows_ + rowsOutOfOrder_ > problems_.size()) report += "\n  ...";
   return report;

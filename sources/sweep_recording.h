@@ -53,8 +53,7 @@ class SweepRecording {
   [[nodiscard]] std::uint64_t rowsOutOfOrder() const noexcept { return rowsOutOfOrder_; }
   // The first ones.
   [[nodiscard]] const std::vector<RowProblem>& problems() const noexcept { return problems_; }
-  // For the user: how many rows were not read or out of order, and the first of them, a line each; empty when
-  // there was none.
+  // For the user: what was wrong, and the first of it by line number, a line each; empty when nothing was.
   [[nodiscard]] std::string problemReport() const;
 
  private:
@@ -85,6 +84,7 @@ class SweepRecording {
   std::string path_;
   std::unique_ptr<TextReader> reader_;
   bool readFailed_ = false;
+  bool cutShort_ = false;
   SweepFormat format_ = SweepFormat::RtlPower;
   bool lastBinTwice_ = false;
 

@@ -85,7 +85,7 @@ TEST_F(RenderTest, KeepsTheGoodRowsAndNamesTheBadOnes) {
   EXPECT_EQ(draw(std::string(kTwoSweeps) + "what is this\n" + kTwoSweeps), 0);
   EXPECT_EQ(pictures().size(), 4U);
   EXPECT_EQ(errors.str(),
-            "van/a.csv: 1 row could not be read, 1 out of order\n"
+            "van/a.csv: 1 row could not be read, 1 row out of order\n"
             "  line 3: does not begin with a date and a time: \"what is this\"\n"
             "  line 4: its sweep is older than the one before\n");
 }

@@ -141,7 +141,7 @@ TEST_F(SweepRecordingTest, CountsWhatItCannotReadAndNamesTheFirstLines) {
   EXPECT_EQ(sweeps(content), "100: 1 gap 3");
   EXPECT_EQ(recording->unreadableRows(), 6U);
   EXPECT_EQ(recording->problemReport(),
-            "a.csv: 6 rows could not be read, 0 out of order\n"
+            "a.csv: 6 rows could not be read\n"
             "  line 2: does not begin with a date and a time: \"x\"\n"
             "  line 3: does not begin with a date and a time: \"x\"\n"
             "  line 4: does not begin with a date and a time: \"x\"\n"
@@ -154,7 +154,7 @@ TEST_F(SweepRecordingTest, NamesWhatIsOutOfOrder) {
   EXPECT_EQ(sweeps(row(5, 110, "2") + row(5, 100, "1") + row(3, 100, "3") + row(3, 110, "4")),
             "100: 1 2 | 100: 3 4");
   EXPECT_EQ(recording->problemReport(),
-            "a.csv: 0 rows could not be read, 2 out of order\n"
+            "a.csv: 2 rows out of order\n"
             "  line 2: out of order: its frequency is below that of the row before\n"
             "  line 3: its sweep is older than the one before");
 }
@@ -196,7 +196,7 @@ TEST_F(SweepRecordingTest, DoubtsTheLastValueOfACutRow) {
   const std::string head = "2020-01-01,00:00:10,100,120,10.00,1,";
   EXPECT_EQ(sweeps(head + "-65.79,-60.25\n" + head + "-65.79,-6"), "100: -66 -60 | 100: -66 gap");
   EXPECT_EQ(recording->problemReport(),
-            "a.csv: 0 rows could not be read, 0 out of order\n"
+            "a.csv: cut short\n"
             "  line 2: the file ends within this row; its last value is left out");
   EXPECT_EQ(sweeps(head + "-65.79,-60.25\n" + head + "-6"), "100: -66 -60 | 100: gap");
   EXPECT_EQ(sweeps(head + "-65.79,-60.25\n" + head + "-65.79,-6\n"), "100: -66 -60 | 100: -66 -6");
