@@ -46,23 +46,6 @@ TEST(HeadlessPanel, DrawsEveryBinAtItsFrequencyFromEdgeToEdge) {
   EXPECT_EQ(messageLog().count(), 0U);
 }
 
-TEST(HeadlessPanel, ShowsTheLastSweepOnly) {
-  Sweep sweep;
-  sweep.startHz = 100e6;
-  sweep.stepHz = 1e6;
-  sweep.levelsDb.assign(100, -10.0F);
-  DisplaySweep display;
-  resample(sweep, display);
-  HeadlessPanel panel({0, 10});
-  panel.show(display, "high");
-  const Point high = highestOfTrace(panel.picture());
-  sweep.levelsDb.assign(100, -80.0F);
-  resample(sweep, display);
-  panel.show(display, "low");
-  // Seventy of the hundred decibels lower, in a graph some five hundred pixels high.
-  EXPECT_NEAR(highestOfTrace(panel.picture()).y - high.y, 350, 30);
-}
-
 TEST(HeadlessPanel, DrawsNothingInAGap) {
   Sweep sweep;
   sweep.startHz = 100e6;

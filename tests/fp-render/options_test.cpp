@@ -21,15 +21,6 @@ TEST(RenderOptions, AreReadInAnyOrder) {
   }
 }
 
-TEST(RenderOptions, StandForAllSweepsInTheCurrentFolderUnlessGiven) {
-  RenderOptions options;
-  std::string problem;
-  EXPECT_TRUE(parseOptions(std::vector<const char*>{"--", "-o"}, options, problem));
-  EXPECT_EQ(options.recording, "-o");
-  EXPECT_EQ(options.directory, ".");
-  EXPECT_EQ(options.sweep, std::nullopt);
-}
-
 TEST(RenderOptions, ThatMakeNoSenseAreRefusedWithTheReason) {
   const struct {
     std::vector<const char*> arguments;

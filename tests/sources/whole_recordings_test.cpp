@@ -3,30 +3,24 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
-#include <cmath>
 #include <filesystem>
-#include <fstream>
-#include <iterator>
 #include <numeric>
 
+#include "platform/runtime_error.h"
 #include "sources/sweep_recording.h"
-#include "tests/support/memory_text_files.h"
 
 namespace frontpanels {
 namespace {
 
 class WholeRecording : public ::testing::Test {
  protected:
-  std::vector<Sweep> read(const std::string& name, const char* folder) {
-    std::ifstream file(std::filesystem::path(folder) / name, std::ios::binary);
-    files.contents[name] = {std::istreambuf_iterator<char>(file), {}};
-    recording = SweepRecording::open(files, name);
+  std::vector<Sweep> read(const std::string& name, const std::string& folder) {
+    recording = SweepRecording::open(systemTextFiles(), folder + "/" + name);
     std::vector<Sweep> sweeps;
     for (Sweep sweep; recording->next(sweep);) sweeps.push_back(sweep);
     return sweeps;
   }
 
-  testing::MemoryTextFiles files;
   std::unique_ptr<SweepRecording> recording;
 };
 
