@@ -2,7 +2,10 @@
 
 #include <gtest/gtest.h>
 
+#include <vector>
+
 #include "framework/support/error_handler.h"
+#include "platform/raster/png.h"
 
 namespace frontpanels {
 namespace {
@@ -44,6 +47,32 @@ TEST(HeadlessPanel, DrawsEveryBinAtItsFrequencyFromEdgeToEdge) {
   EXPECT_NEAR(peakOfBin(500).x, first.x + graphWidthPx / 2, 2);
   EXPECT_NEAR(peakOfBin(900).x, first.x + graphWidthPx * 9 / 10, 2);
   EXPECT_EQ(messageLog().count(), 0U);
+}
+
+std::vector<std::uint8_t> pictureOf(double startHz, double stepHz, const VerticalScale& scale) {
+  Sweep sweep;
+  sweep.startHz = startHz;
+  sweep.stepHz = stepHz;
+  sweep.levelsDb.assign(100, -50.0F);
+  DisplaySweep display;
+  resample(sweep, display);
+  HeadlessPanel panel(scale);
+  panel.show(display, "");
+  std::vector<std::uint8_t> png;
+  std::string error;
+  EXPECT_TRUE(encodePng(panel.picture(), png, error)) << error;
+  return png;
+}
+
+TEST(HeadlessPanel, LabelsTheFrequenciesAndTheScaleThatItIsGiven) {
+  const auto usual = pictureOf(100e6, 1e6, {0, 10});
+  EXPECT_EQ(pictureOf(100e6, 1e6, {0, 10}), usual);
+  EXPECT_NE(pictureOf(110e6, 1e6, {0, 10}), usual);
+  EXPECT_NE(pictureOf(100e6, 2e6, {0, 10}), usual);
+  // The same centre, 149.5 MHz: only the span differs.
+  EXPECT_NE(pictureOf(124.75e6, 0.5e6, {0, 10}), usual);
+  EXPECT_NE(pictureOf(100e6, 1e6, {-30, 10}), usual);
+  EXPECT_NE(pictureOf(100e6, 1e6, {0, 20}), usual);
 }
 
 TEST(HeadlessPanel, DrawsNothingInAGap) {
