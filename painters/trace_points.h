@@ -47,6 +47,8 @@ class TracePoints {
  private:
   void begin(std::size_t count);
 
+  static constexpr double kSurelyFitsPx = 2147483647;  // beyond it the careful pass decides
+
   // One pass without a branch a point: a value that is not finite has no position that fits, so whether all
   // of them do answers both questions at once.
   template <class T>
@@ -57,7 +59,7 @@ class TracePoints {
     Point* const points = points_.data();
     for (std::int32_t i = 0; i < count; ++i) {
       const double yPx = y.pixel(static_cast<double>(values[static_cast<std::size_t>(i)]));
-      fits &= fitsInt32(yPx);
+      fits &= std::fabs(yPx) < kSurelyFitsPx;
       points[i] = {static_cast<std::int32_t>(std::lrint(x.pixel(i))),
                    static_cast<std::int32_t>(std::lrint(yPx))};
     }

@@ -76,13 +76,14 @@ TEST_F(PlotLabelsTest, LeavesOutWhatWouldOverlapAnEarlierLabelOrLeaveThePanel) {
                                                "axis 0123456789 170,103", "corner 0123456789012 50,2"}));
 }
 
-TEST_F(PlotLabelsTest, TouchingLabelsBothStand) {
-  labels.text(LabelPlace::Left, "0123456789012");  // 50..154
-  labels.text(LabelPlace::Right, "012345678901");  // 154..250
+TEST_F(PlotLabelsTest, LabelsThatTouchAllStand) {
+  labels.text(LabelPlace::Left, "0123456789");   // 50..130
+  labels.text(LabelPlace::Right, "0123456789");  // 170..250
+  labels.text(LabelPlace::XAxis, "01234");       // 130..170
 
   draw();
 
-  EXPECT_EQ(drawn().size(), 2U);
+  EXPECT_EQ(drawn().size(), 3U);
 }
 
 TEST_F(PlotLabelsTest, ValueLabelsAreThinnedWhereLinesAreCloserThanText) {
