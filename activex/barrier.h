@@ -1,0 +1,48 @@
+// The last barrier before the host: no exception leaves a COM method or a window procedure. What is caught
+// becomes an error code with a text that the host can show.
+#pragma once
+
+#include <windows.h>
+
+#include <string>
+
+#include "platform/runtime_error.h"
+
+namespace frontpanels::activex {
+
+// A failure with a code of its own.
+class ComFailure {
+ public:
+  explicit ComFailure(HRESULT code) noexcept : code_(code) {}
+  [[nodiscard]] HRESULT code() const noexcept { return code_; }
+
+ private:
+  HRESULT code_;
+};
+inline void check(HRESULT result) {
+  if (FAILED(result)) throw ComFailure(result);
+}
+
+// For a catch block: the code of the exception that is being handled; its text becomes the thread's error
+// information.
+[[nodiscard]] HRESULT currentFailure(const IID& source) noexcept;
+
+template <class Body>
+HRESULT barrier(const IID& source, Body&& body) noexcept {
+  try {
+    if constexpr (std::is_void_v<decltype(body())>) {
+      body();
+      return S_OK;
+    } else {
+      return body();
+    }
+  } catch (...) {
+    return currentFailure(source);
+  }
+}
+template <class Body>
+HRESULT barrier(Body&& body) noexcept {
+  return barrier(IID{}, std::forward<Body>(body));
+}
+
+}  // namespace frontpanels::activex

@@ -1,0 +1,36 @@
+// IClassFactory for each row of the class table.
+#pragma once
+
+#include <unknwn.h>
+
+#include <atomic>
+
+#include "activex/classes.h"
+#include "activex/module.h"
+
+namespace frontpanels::activex {
+
+#pragma GCC diagnostic push
+#pragma GCC diagnostic ignored "-Wnon-virtual-dtor"
+
+class ClassFactory final : public IClassFactory {
+ public:
+  explicit ClassFactory(const ClassRow& row) noexcept : row_(row) {}
+  virtual ~ClassFactory() = default;
+
+  HRESULT STDMETHODCALLTYPE QueryInterface(REFIID id, void** object) override;
+  ULONG STDMETHODCALLTYPE AddRef() override { return ++references_; }
+  ULONG STDMETHODCALLTYPE Release() override;
+  // An outer object may only ask for IUnknown: it keeps the inner one.
+  HRESULT STDMETHODCALLTYPE CreateInstance(IUnknown* outer, REFIID id, void** object) override;
+  HRESULT STDMETHODCALLTYPE LockServer(WINBOOL lock) override;
+
+ private:
+  ModuleLock lock_;
+  const ClassRow& row_;
+  std::atomic<ULONG> references_ = 1;
+};
+
+#pragma GCC diagnostic pop
+
+}  // namespace frontpanels::activex

@@ -1,0 +1,26 @@
+#include "activex/classes.h"
+
+#include "activex/data_hub_object.h"
+#include "activex/diagnostics_object.h"
+#include "activex/spectrum_control.h"
+#include "frontpanels_h.h"
+
+namespace frontpanels::activex {
+namespace {
+
+template <class Object>
+Aggregable* create(IUnknown* outer) {
+  return new Object(outer);
+}
+
+const ClassRow kClasses[] = {
+    {&CLSID_SpectrumView, L"SpectrumView", L"Front Panels SpectrumView", true, create<SpectrumControl>},
+    {&CLSID_DataHub, L"DataHub", L"Front Panels DataHub", false, create<DataHubObject>},
+    {&CLSID_Diagnostics, L"Diagnostics", L"Front Panels Diagnostics", false, create<DiagnosticsObject>},
+};
+
+}  // namespace
+
+std::span<const ClassRow> classes() noexcept { return kClasses; }
+
+}  // namespace frontpanels::activex

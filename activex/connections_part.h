@@ -1,0 +1,64 @@
+// IConnectionPointContainer and the connection point of the control's events. Events are raised at once: a
+// host answers some of them through an argument.
+#pragma once
+
+#include <ocidl.h>
+
+#include <optional>
+#include <span>
+#include <vector>
+
+#include "activex/control_core.h"
+
+namespace frontpanels::activex {
+
+#pragma GCC diagnostic push
+#pragma GCC diagnostic ignored "-Wnon-virtual-dtor"
+
+// An object of its own, which shares the life of the control.
+class EventConnectionPoint final : public IConnectionPoint {
+ public:
+  explicit EventConnectionPoint(ControlCore& core) noexcept : core_(core) {}
+  virtual ~EventConnectionPoint() = default;
+
+  struct Connection {
+    DWORD cookie = 0;  // never used twice
+    ComPointer<IDispatch> sink;
+  };
+  [[nodiscard]] const std::vector<Connection>& connections() const noexcept { return connections_; }
+  [[nodiscard]] bool connected(DWORD cookie) const noexcept;
+
+  HRESULT STDMETHODCALLTYPE QueryInterface(REFIID id, void** object) override;
+  ULONG STDMETHODCALLTYPE AddRef() override { return core_.outer()->AddRef(); }
+  ULONG STDMETHODCALLTYPE Release() override { return core_.outer()->Release(); }
+  HRESULT STDMETHODCALLTYPE GetConnectionInterface(IID* id) override;
+  HRESULT STDMETHODCALLTYPE GetConnectionPointContainer(IConnectionPointContainer** container) override;
+  HRESULT STDMETHODCALLTYPE Advise(IUnknown* sink, DWORD* cookie) override;
+  HRESULT STDMETHODCALLTYPE Unadvise(DWORD cookie) override;
+  HRESULT STDMETHODCALLTYPE EnumConnections(IEnumConnections** connections) override;
+
+ private:
+  ControlCore& core_;
+  std::vector<Connection> connections_;
+  DWORD lastCookie_ = 0;
+};
+
+#pragma GCC diagnostic pop
+
+class ConnectionsPart final : public ControlPart<IConnectionPointContainer> {
+ public:
+  explicit ConnectionsPart(ControlCore& core) noexcept : ControlPart(core), events_(core) {}
+
+  // Raises an event whose last argument is a status that the host answers in. Each sink sees the answer so
+  // far, the last that handles the event decides; 0 when nobody does or while events are frozen. `arguments`
+  // are in the order of the declaration, without the status.
+  [[nodiscard]] LONG raiseForStatus(DISPID event, std::span<const VARIANT> arguments);
+
+  HRESULT STDMETHODCALLTYPE EnumConnectionPoints(IEnumConnectionPoints** points) override;
+  HRESULT STDMETHODCALLTYPE FindConnectionPoint(REFIID id, IConnectionPoint** point) override;
+
+ private:
+  EventConnectionPoint events_;
+};
+
+}  // namespace frontpanels::activex

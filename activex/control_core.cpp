@@ -1,0 +1,121 @@
+#include "activex/control_core.h"
+
+#include <olectl.h>
+
+#include "activex/class_info_part.h"
+#include "activex/connections_part.h"
+#include "activex/in_place_part.h"
+#include "activex/ole_object_part.h"
+#include "activex/persistence_part.h"
+#include "activex/view_part.h"
+#include "platform/win32/win32_windowing.h"
+
+namespace frontpanels::activex {
+namespace {
+
+constexpr Size kDefaultSizePx{640, 480};
+constexpr int kHimetricPerInch = 2540;
+constexpr int kUsualDpi = 96;
+
+// A screen without a driver answers 0, by which nothing can be divided.
+int screenDpi(int axis) noexcept {
+  const HDC screen = GetDC(nullptr);
+  const int dpi = GetDeviceCaps(screen, axis);
+  ReleaseDC(nullptr, screen);
+  return dpi > 0 ? dpi : kUsualDpi;
+}
+
+}  // namespace
+
+SIZEL himetricOf(Size sizePx) noexcept {
+  return {MulDiv(sizePx.width, kHimetricPerInch, screenDpi(LOGPIXELSX)),
+          MulDiv(sizePx.height, kHimetricPerInch, screenDpi(LOGPIXELSY))};
+}
+
+Size pixelsOf(SIZEL himetric) noexcept {
+  return {MulDiv(himetric.cx, screenDpi(LOGPIXELSX), kHimetricPerInch),
+          MulDiv(himetric.cy, screenDpi(LOGPIXELSY), kHimetricPerInch)};
+}
+
+ControlCore::ControlCore(IUnknown* outer, const ControlClass& controlClass)
+    : Aggregable(outer),
+      class_(controlClass),
+      extent_(himetricOf(kDefaultSizePx)),
+      window_(*this, readScreenMetrics(), kDefaultSizePx),
+      oleObject_(std::make_unique<OleObjectPart>(*this)),
+      inPlace_(std::make_unique<InPlacePart>(*this)),
+      view_(std::make_unique<ViewPart>(*this)),
+      persistence_(std::make_unique<PersistencePart>(*this)),
+      connections_(std::make_unique<ConnectionsPart>(*this)),
+      classInfo_(std::make_unique<ClassInfoPart>(*this)) {}
+
+ControlCore::~ControlCore() = default;
+
+void* ControlCore::findPart(REFIID id) noexcept {
+  struct Row {
+    const IID& id;
+    void* part;
+  };
+  const Row rows[] = {
+      {IID_IOleObject, static_cast<IOleObject*>(oleObject_.get())},
+      {IID_IOleControl, static_cast<IOleControl*>(oleObject_.get())},
+      {IID_IOleWindow, static_cast<IOleWindow*>(static_cast<IOleInPlaceObject*>(inPlace_.get()))},
+      {IID_IOleInPlaceObject, static_cast<IOleInPlaceObject*>(inPlace_.get())},
+      {IID_IOleInPlaceActiveObject, static_cast<IOleInPlaceActiveObject*>(inPlace_.get())},
+      {IID_IViewObject, static_cast<IViewObject*>(view_.get())},
+      {IID_IViewObject2, static_cast<IViewObject2*>(view_.get())},
+      {IID_IPersist, static_cast<IPersist*>(static_cast<IPersistStreamInit*>(persistence_.get()))},
+      {IID_IPersistStreamInit, static_cast<IPersistStreamInit*>(persistence_.get())},
+      {IID_IPersistPropertyBag, static_cast<IPersistPropertyBag*>(persistence_.get())},
+      {IID_IPersistStorage, static_cast<IPersistStorage*>(persistence_.get())},
+      {IID_IConnectionPointContainer, static_cast<IConnectionPointContainer*>(connections_.get())},
+      {IID_IProvideClassInfo, static_cast<IProvideClassInfo*>(classInfo_.get())},
+      {IID_IProvideClassInfo2, static_cast<IProvideClassInfo2*>(classInfo_.get())},
+      {IID_ISupportErrorInfo, static_cast<ISupportErrorInfo*>(classInfo_.get())},
+  };
+  for (const Row& row : rows)
+    if (row.id == id) return row.part;
+  return nullptr;
+}
+
+void ControlCore::site(IOleClientSite* site) {
+  if (site == nullptr) inPlace_->deactivate();
+  site_ = ComPointer<IOleClientSite>(site);
+  readAmbients();
+}
+
+void ControlCore::readAmbients() {
+  userMode_ = true;  // a container that does not say is running
+  const auto ambients = site_.query<IDispatch>();
+  if (!ambients) return;
+  VARIANT value;
+  VariantInit(&value);
+  DISPPARAMS none{};
+  const HRESULT read = ambients->Invoke(DISPID_AMBIENT_USERMODE, IID_NULL, LOCALE_USER_DEFAULT,
+                                        DISPATCH_PROPERTYGET, &none, &value, nullptr, nullptr);
+  if (SUCCEEDED(read) && SUCCEEDED(VariantChangeType(&value, &value, 0, VT_BOOL)))
+    userMode_ = V_BOOL(&value) != VARIANT_FALSE;
+  VariantClear(&value);
+}
+
+void ControlCore::extent(SIZEL himetric) {
+  extent_ = himetric;
+  dirty_ = true;
+  window_.resizeMemory(pixelsOf(himetric));
+  view_->changed();
+}
+
+void ControlCore::adoptSize(Size sizePx) {
+  if (sizePx.width <= 0 || sizePx.height <= 0 || pixelsOf(extent_) == sizePx) return;
+  extent_ = himetricOf(sizePx);
+}
+
+void ControlCore::pressed() { inPlace_->activateUi(); }
+
+void ControlCore::focusChanged(bool focused) {
+  if (const auto controlSite = site_.query<IOleControlSite>()) controlSite->OnFocus(focused);
+}
+
+void ControlCore::windowDestroyed() noexcept { inPlace_->windowLost(); }
+
+}  // namespace frontpanels::activex

@@ -1,0 +1,137 @@
+// What every control of the library is: an object that a container can site, activate in place, persist and
+// draw. The OLE interfaces are parts with a file each; they share the state that this class keeps.
+#pragma once
+
+#include <ocidl.h>
+#include <oleidl.h>
+
+#include <memory>
+#include <span>
+#include <string>
+
+#include "activex/aggregable.h"
+#include "activex/panel_window.h"
+#include "platform/win32/com_pointer.h"
+
+namespace frontpanels::activex {
+
+// The facts of a control's class.
+struct ControlClass {
+  const CLSID* id;
+  const IID* defaultInterface;
+  const IID* eventInterface;
+  const wchar_t* userTypeName;
+};
+
+// RECOMPOSEONRESIZE | CANTLINKINSIDE | INSIDEOUT | ACTIVATEWHENVISIBLE | SETCLIENTSITEFIRST, in the registry
+// and as answered.
+inline constexpr DWORD kMiscStatus = OLEMISC_RECOMPOSEONRESIZE | OLEMISC_CANTLINKINSIDE | OLEMISC_INSIDEOUT |
+                                     OLEMISC_ACTIVATEWHENVISIBLE | OLEMISC_SETCLIENTSITEFIRST;
+
+// A boolean property that the container stores with its form.
+struct StoredProperty {
+  const wchar_t* name;
+  bool defaultValue;
+};
+
+class OleObjectPart;
+class InPlacePart;
+class ViewPart;
+class PersistencePart;
+class ConnectionsPart;
+class ClassInfoPart;
+
+class ControlCore : public Aggregable, public WindowOwner {
+ public:
+  ControlCore(IUnknown* outer, const ControlClass& controlClass);
+  ~ControlCore() override;
+
+  [[nodiscard]] const ControlClass& controlClass() const noexcept { return class_; }
+  [[nodiscard]] PanelWindow& window() noexcept { return window_; }
+  [[nodiscard]] OleObjectPart& oleObject() noexcept { return *oleObject_; }
+  [[nodiscard]] InPlacePart& inPlace() noexcept { return *inPlace_; }
+  [[nodiscard]] ViewPart& view() noexcept { return *view_; }
+  [[nodiscard]] ConnectionsPart& connections() noexcept { return *connections_; }
+  [[nodiscard]] const ComPointer<IOleClientSite>& site() const noexcept { return site_; }
+  // Reads the ambient properties anew; a null site lets go of everything that was the container's.
+  void site(IOleClientSite* site);
+  void readAmbients();
+
+  // Himetric; what the container set is kept as it is.
+  [[nodiscard]] SIZEL extent() const noexcept { return extent_; }
+  void extent(SIZEL himetric);
+  // Takes over a size in pixels when the kept extent means another one.
+  void adoptSize(Size sizePx);
+
+  [[nodiscard]] bool dirty() const noexcept { return dirty_; }
+  void dirty(bool dirty) noexcept { dirty_ = dirty; }
+  // A count: containers nest their freezes.
+  void freezeEvents(bool freeze) noexcept { freezes_ += freeze ? 1 : freezes_ > 0 ? -1 : 0; }
+  [[nodiscard]] bool eventsFrozen() const noexcept { return freezes_ > 0; }
+
+  // What the control stores through the container.
+  [[nodiscard]] virtual std::span<const StoredProperty> storedProperties() const = 0;
+  [[nodiscard]] virtual bool storedValue(std::size_t property) const = 0;
+  virtual void storedValue(std::size_t property, bool value) = 0;
+
+  // WindowOwner
+  void holdControl() noexcept override { outer()->AddRef(); }
+  void releaseControl() noexcept override { outer()->Release(); }
+  void pressed() override;
+  void focusChanged(bool focused) override;
+  void windowDestroyed() noexcept override;
+  bool inUse() const override { return userMode_; }
+
+ protected:
+  // The interfaces that all controls have.
+  [[nodiscard]] void* findPart(REFIID id) noexcept;
+
+ private:
+  const ControlClass& class_;
+  SIZEL extent_{};
+  PanelWindow window_;
+  ComPointer<IOleClientSite> site_;
+  bool userMode_ = true;
+  bool dirty_ = false;
+  int freezes_ = 0;
+
+  std::unique_ptr<OleObjectPart> oleObject_;
+  std::unique_ptr<InPlacePart> inPlace_;
+  std::unique_ptr<ViewPart> view_;
+  std::unique_ptr<PersistencePart> persistence_;
+  std::unique_ptr<ConnectionsPart> connections_;
+  std::unique_ptr<ClassInfoPart> classInfo_;
+};
+
+#pragma GCC diagnostic push
+#pragma GCC diagnostic ignored "-Wnon-virtual-dtor"
+
+// An OLE duty of a control: interfaces whose identity and life are the control's.
+template <class... Interfaces>
+class ControlPart : public Interfaces... {
+ public:
+  explicit ControlPart(ControlCore& core) noexcept : core_(core) {}
+  virtual ~ControlPart() = default;
+  ControlPart(const ControlPart&) = delete;
+  ControlPart& operator=(const ControlPart&) = delete;
+
+  HRESULT STDMETHODCALLTYPE QueryInterface(REFIID id, void** object) override {
+    return core_.outer()->QueryInterface(id, object);
+  }
+  ULONG STDMETHODCALLTYPE AddRef() override { return core_.outer()->AddRef(); }
+  ULONG STDMETHODCALLTYPE Release() override { return core_.outer()->Release(); }
+
+ protected:
+  [[nodiscard]] ControlCore& core() const noexcept { return core_; }
+
+ private:
+  ControlCore& core_;
+};
+
+#pragma GCC diagnostic pop
+
+// Pixels and himetric of the screen; symmetric rounding.
+[[nodiscard]] SIZEL himetricOf(Size sizePx) noexcept;
+[[nodiscard]] Size pixelsOf(SIZEL himetric) noexcept;
+
+}  // namespace frontpanels::activex

@@ -1,0 +1,127 @@
+#include "activex/in_place_part.h"
+
+#include <algorithm>
+#include <iterator>
+#include <utility>
+
+#include "activex/barrier.h"
+
+namespace frontpanels::activex {
+namespace {
+
+constexpr wchar_t kObjectName[] = L"Front Panels";
+
+// Keys that move markers: the host is to hand them on to the window.
+constexpr WPARAM kOwnKeys[] = {VK_LEFT, VK_RIGHT, VK_UP, VK_DOWN, VK_HOME, VK_END};
+
+DWORD modifierState() {
+  const auto down = [](int key) { return GetKeyState(key) < 0; };
+  return (down(VK_SHIFT) ? 1U : 0U) | (down(VK_CONTROL) ? 2U : 0U) | (down(VK_MENU) ? 4U : 0U);
+}
+
+}  // namespace
+
+void InPlacePart::activate(HWND parent, const RECT* place) {
+  if (!active_) enterSite(parent, place);
+  core().window().visible(true);
+}
+
+void InPlacePart::enterSite(HWND parent, const RECT* place) {
+  const auto site = core().site().query<IOleInPlaceSite>();
+  if (!site || site->CanInPlaceActivate() != S_OK) throw ComFailure(E_FAIL);
+  check(site->OnInPlaceActivate());
+  inPlaceSite_ = site;
+  HWND container = parent;
+  if (FAILED(site->GetWindow(&container)) || container == nullptr) container = parent;
+  RECT area{};
+  RECT clip{};
+  OLEINPLACEFRAMEINFO info{};
+  info.cb = sizeof info;
+  if (FAILED(site->GetWindowContext(frame_.receive(), document_.receive(), &area, &clip, &info)) &&
+      place != nullptr)
+    area = *place;
+  try {
+    core().window().create(container, area);
+  } catch (...) {
+    inPlaceSite_.reset();
+    site->OnInPlaceDeactivate();
+    throw;
+  }
+  active_ = true;
+  core().adoptSize({area.right - area.left, area.bottom - area.top});
+  if (core().site()) core().site()->ShowObject();
+}
+
+void InPlacePart::activateUi() {
+  if (!active_ || uiActive_) return;
+  uiActive_ = true;
+  const ComPointer<IUnknown> alive(core().outer());
+  inPlaceSite_->OnUIActivate();
+  if (!active_) return;  // the container changed its mind on hearing it
+  SetFocus(core().window().window());
+  if (frame_) frame_->SetActiveObject(this, kObjectName);
+  if (document_) document_->SetActiveObject(this, kObjectName);
+  // The control brings no tool bars: whatever room the containers offer for them is theirs.
+  if (frame_) frame_->SetBorderSpace(nullptr);
+  if (document_) document_->SetBorderSpace(nullptr);
+}
+
+void InPlacePart::hide() {
+  deactivateUi();
+  core().window().visible(false);
+}
+
+// The state is cleared before the container hears of it: it may call back with anything.
+void InPlacePart::deactivateUi() {
+  if (!std::exchange(uiActive_, false)) return;
+  if (document_) document_->SetActiveObject(nullptr, nullptr);
+  if (frame_) frame_->SetActiveObject(nullptr, nullptr);
+  if (inPlaceSite_) inPlaceSite_->OnUIDeactivate(FALSE);
+}
+
+void InPlacePart::deactivate() {
+  if (!inPlaceSite_) return;
+  const ComPointer<IUnknown> alive(core().outer());
+  deactivateUi();
+  active_ = false;
+  core().window().destroy();
+  const ComPointer<IOleInPlaceSite> site = std::exchange(inPlaceSite_, {});
+  frame_.reset();
+  document_.reset();
+  if (site) site->OnInPlaceDeactivate();
+}
+
+HRESULT InPlacePart::GetWindow(HWND* window) {
+  if (window == nullptr) return E_POINTER;
+  *window = core().window().window();
+  return *window != nullptr ? S_OK : E_FAIL;
+}
+
+HRESULT InPlacePart::InPlaceDeactivate() {
+  return barrier([&] { deactivate(); });
+}
+
+HRESULT InPlacePart::UIDeactivate() {
+  return barrier([&] { deactivateUi(); });
+}
+
+HRESULT InPlacePart::SetObjectRects(LPCRECT place, LPCRECT clip) {
+  if (place == nullptr) return E_POINTER;
+  return barrier([&] {
+    core().window().place(*place, clip);
+    core().adoptSize({place->right - place->left, place->bottom - place->top});
+  });
+}
+
+HRESULT InPlacePart::TranslateAccelerator(LPMSG message) {
+  if (message == nullptr) return E_POINTER;
+  return barrier([&]() -> HRESULT {
+    const bool own = message->message == WM_KEYDOWN && std::find(std::begin(kOwnKeys), std::end(kOwnKeys),
+                                                                 message->wParam) != std::end(kOwnKeys);
+    if (own) return S_FALSE;
+    const auto site = core().site().query<IOleControlSite>();
+    return site && site->TranslateAccelerator(message, modifierState()) == S_OK ? S_OK : S_FALSE;
+  });
+}
+
+}  // namespace frontpanels::activex

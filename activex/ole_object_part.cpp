@@ -1,0 +1,153 @@
+#include "activex/ole_object_part.h"
+
+#include <olectl.h>
+
+#include <cwchar>
+
+#include "activex/barrier.h"
+#include "activex/in_place_part.h"
+
+namespace frontpanels::activex {
+
+HRESULT OleObjectPart::SetClientSite(IOleClientSite* site) {
+  return barrier([&] { core().site(site); });
+}
+
+HRESULT OleObjectPart::GetClientSite(IOleClientSite** site) {
+  if (site == nullptr) return E_POINTER;
+  *site = core().site().get();
+  if (*site != nullptr) (*site)->AddRef();
+  return S_OK;
+}
+
+HRESULT OleObjectPart::Close(DWORD saveOption) {
+  const ComPointer<IUnknown> alive(core().outer());
+  return barrier([&] {
+    if (saveOption != OLECLOSE_NOSAVE && core().dirty() && core().site()) core().site()->SaveObject();
+    core().inPlace().deactivate();
+    if (advises_) advises_->SendOnClose();
+  });
+}
+
+HRESULT OleObjectPart::GetMoniker(DWORD, DWORD, IMoniker** moniker) {
+  if (moniker == nullptr) return E_POINTER;
+  *moniker = nullptr;
+  return E_NOTIMPL;
+}
+
+HRESULT OleObjectPart::GetClipboardData(DWORD, IDataObject** data) {
+  if (data == nullptr) return E_POINTER;
+  *data = nullptr;
+  return E_NOTIMPL;
+}
+
+HRESULT OleObjectPart::DoVerb(LONG verb, LPMSG, IOleClientSite*, LONG, HWND parent, LPCRECT place) {
+  const ComPointer<IUnknown> alive(core().outer());
+  return barrier([&]() -> HRESULT {
+    // Some hosts hand a verb over as a 16-bit number.
+    switch (static_cast<std::int16_t>(verb & 0xFFFF)) {
+      case OLEIVERB_PRIMARY:
+      case OLEIVERB_UIACTIVATE:
+        core().inPlace().activate(parent, place);
+        core().inPlace().activateUi();
+        return S_OK;
+      case OLEIVERB_SHOW:
+      case OLEIVERB_INPLACEACTIVATE:
+        core().inPlace().activate(parent, place);
+        return S_OK;
+      case OLEIVERB_HIDE:
+        core().inPlace().hide();
+        return S_OK;
+      case OLEIVERB_DISCARDUNDOSTATE:
+        return S_OK;
+      default:
+        break;
+    }
+    if (static_cast<std::int16_t>(verb & 0xFFFF) < 0) return E_NOTIMPL;
+    core().inPlace().activate(parent, place);
+    return OLEOBJ_S_INVALIDVERB;
+  });
+}
+
+HRESULT OleObjectPart::EnumVerbs(IEnumOLEVERB** verbs) {
+  if (verbs == nullptr) return E_POINTER;
+  *verbs = nullptr;
+  return OLE_S_USEREG;
+}
+
+HRESULT OleObjectPart::GetUserClassID(CLSID* id) {
+  if (id == nullptr) return E_POINTER;
+  *id = *core().controlClass().id;
+  return S_OK;
+}
+
+HRESULT OleObjectPart::GetUserType(DWORD, LPOLESTR* name) {
+  if (name == nullptr) return E_POINTER;
+  const wchar_t* const text = core().controlClass().userTypeName;
+  const std::size_t bytes = (std::wcslen(text) + 1) * sizeof(wchar_t);
+  *name = static_cast<LPOLESTR>(CoTaskMemAlloc(bytes));
+  if (*name == nullptr) return E_OUTOFMEMORY;
+  std::wmemcpy(*name, text, bytes / sizeof(wchar_t));
+  return S_OK;
+}
+
+HRESULT OleObjectPart::SetExtent(DWORD aspect, SIZEL* himetric) {
+  if (himetric == nullptr) return E_POINTER;
+  if (aspect != DVASPECT_CONTENT) return DV_E_DVASPECT;
+  if (himetric->cx < 0 || himetric->cy < 0) return E_INVALIDARG;
+  return barrier([&] { core().extent(*himetric); });
+}
+
+HRESULT OleObjectPart::GetExtent(DWORD aspect, SIZEL* himetric) {
+  if (himetric == nullptr) return E_POINTER;
+  if (aspect != DVASPECT_CONTENT) return DV_E_DVASPECT;
+  *himetric = core().extent();
+  return S_OK;
+}
+
+HRESULT OleObjectPart::Advise(IAdviseSink* sink, DWORD* connection) {
+  if (connection == nullptr) return E_POINTER;
+  if (!advises_) {
+    const HRESULT made = CreateOleAdviseHolder(advises_.receive());
+    if (FAILED(made)) return made;
+  }
+  return advises_->Advise(sink, connection);
+}
+
+HRESULT OleObjectPart::Unadvise(DWORD connection) {
+  return advises_ ? advises_->Unadvise(connection) : OLE_E_NOCONNECTION;
+}
+
+HRESULT OleObjectPart::EnumAdvise(IEnumSTATDATA** advises) {
+  if (advises == nullptr) return E_POINTER;
+  *advises = nullptr;
+  return advises_ ? advises_->EnumAdvise(advises) : S_OK;
+}
+
+HRESULT OleObjectPart::GetMiscStatus(DWORD aspect, DWORD* status) {
+  if (status == nullptr) return E_POINTER;
+  *status = aspect == DVASPECT_CONTENT ? kMiscStatus : 0;
+  return S_OK;
+}
+
+HRESULT OleObjectPart::GetControlInfo(CONTROLINFO* info) {
+  if (info == nullptr) return E_POINTER;
+  info->cb = sizeof *info;
+  info->hAccel = nullptr;
+  info->cAccel = 0;
+  info->dwFlags = 0;
+  return S_OK;
+}
+
+HRESULT OleObjectPart::OnAmbientPropertyChange(DISPID property) {
+  return barrier([&] {
+    if (property == DISPID_UNKNOWN || property == DISPID_AMBIENT_USERMODE) core().readAmbients();
+  });
+}
+
+HRESULT OleObjectPart::FreezeEvents(BOOL freeze) {
+  core().freezeEvents(freeze != FALSE);
+  return S_OK;
+}
+
+}  // namespace frontpanels::activex

@@ -1,0 +1,29 @@
+// What a panel's window tells the panel, and the control round it.
+#pragma once
+
+#include <cstdint>
+
+namespace frontpanels::activex {
+
+// A press, move or release. Button 1 is left, 2 right, 4 middle; shift has 1 for Shift, 2 for Ctrl, 4 for
+// Alt; twips.
+struct MouseEvent {
+  std::int16_t button = 0;
+  std::int16_t shift = 0;
+  float xTwips = 0;
+  float yTwips = 0;
+};
+
+class PanelEvents {
+ public:
+  virtual ~PanelEvents() = default;
+
+  virtual void paint() = 0;
+  virtual void resized() = 0;
+  virtual void mouseDown(const MouseEvent& event) = 0;
+  virtual void mouseMove(const MouseEvent& event) = 0;
+  virtual void mouseUp(const MouseEvent& event) = 0;
+  virtual void keyDown(std::int16_t keyCode, std::int16_t shift) = 0;
+};
+
+}  // namespace frontpanels::activex

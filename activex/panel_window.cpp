@@ -1,0 +1,281 @@
+#include "activex/panel_window.h"
+
+#include <windowsx.h>
+
+#include <algorithm>
+#include <cwchar>
+#include <iterator>
+#include <new>
+#include <utility>
+
+#include "activex/barrier.h"
+#include "activex/module.h"
+
+namespace frontpanels::activex {
+namespace {
+
+struct ButtonRow {
+  UINT down;
+  UINT doubleClick;
+  UINT up;
+  std::int16_t button;
+};
+constexpr ButtonRow kButtons[] = {
+    {WM_LBUTTONDOWN, WM_LBUTTONDBLCLK, WM_LBUTTONUP, 1},
+    {WM_RBUTTONDOWN, WM_RBUTTONDBLCLK, WM_RBUTTONUP, 2},
+    {WM_MBUTTONDOWN, WM_MBUTTONDBLCLK, WM_MBUTTONUP, 4},
+};
+
+std::int16_t shiftState() {
+  const auto down = [](int key) { return GetKeyState(key) < 0; };
+  return static_cast<std::int16_t>((down(VK_SHIFT) ? 1 : 0) | (down(VK_CONTROL) ? 2 : 0) |
+                                   (down(VK_MENU) ? 4 : 0));
+}
+
+std::int16_t buttonsHeld(WPARAM keys) {
+  return static_cast<std::int16_t>(((keys & MK_LBUTTON) != 0 ? 1 : 0) | ((keys & MK_RBUTTON) != 0 ? 2 : 0) |
+                                   ((keys & MK_MBUTTON) != 0 ? 4 : 0));
+}
+
+// The class outlives a module that is unloaded and would then point into nothing: a name of its own for each
+// address that the module is loaded at keeps a later copy from finding the old one.
+const wchar_t* windowClass(WNDPROC procedure) {
+  static wchar_t name[64];
+  static const ATOM registered = [procedure] {
+    std::swprintf(name, std::size(name), L"FrontPanels.Graph.%p", reinterpret_cast<void*>(procedure));
+    WNDCLASSEXW description{};
+    description.cbSize = sizeof description;
+    // A context of its own: the view's handle stays the same while the window lives.
+    description.style = CS_OWNDC | CS_DBLCLKS;
+    description.lpfnWndProc = procedure;
+    description.hInstance = moduleHandle();
+    description.hbrBackground = reinterpret_cast<HBRUSH>(COLOR_BTNFACE + 1);
+    description.lpszClassName = name;
+    return RegisterClassExW(&description);
+  }();
+  if (registered == 0 && GetLastError() != ERROR_CLASS_ALREADY_EXISTS)
+    throw ComFailure(HRESULT_FROM_WIN32(GetLastError()));
+  return name;
+}
+
+// The control stays alive while its window handles a message: a host may release it inside its own event.
+class HeldControl {
+ public:
+  explicit HeldControl(WindowOwner& owner) noexcept : owner_(owner) { owner_.holdControl(); }
+  ~HeldControl() { owner_.releaseControl(); }
+  HeldControl(const HeldControl&) = delete;
+  HeldControl& operator=(const HeldControl&) = delete;
+
+ private:
+  WindowOwner& owner_;
+};
+
+}  // namespace
+
+// --- Pictures in memory
+
+void MemoryPicture::create(Size sizePx) {
+  release();
+  BITMAPINFO info{};
+  info.bmiHeader.biSize = sizeof info.bmiHeader;
+  info.bmiHeader.biWidth = sizePx.width;
+  info.bmiHeader.biHeight = -sizePx.height;
+  info.bmiHeader.biPlanes = 1;
+  info.bmiHeader.biBitCount = 32;
+  dc_ = CreateCompatibleDC(nullptr);
+  void* bits = nullptr;
+  if (dc_ != nullptr) bitmap_ = CreateDIBSection(dc_, &info, DIB_RGB_COLORS, &bits, nullptr, 0);
+  if (bitmap_ == nullptr) {
+    release();
+    throw std::bad_alloc();
+  }
+  previous_ = SelectObject(dc_, bitmap_);
+  pixels_ = static_cast<std::uint32_t*>(bits);
+  sizePx_ = sizePx;
+  const RECT all{0, 0, sizePx.width, sizePx.height};
+  FillRect(dc_, &all, GetSysColorBrush(COLOR_BTNFACE));
+}
+
+void MemoryPicture::release() noexcept {
+  if (previous_ != nullptr) SelectObject(dc_, previous_);
+  if (bitmap_ != nullptr) DeleteObject(bitmap_);
+  if (dc_ != nullptr) DeleteDC(dc_);
+  dc_ = nullptr;
+  bitmap_ = nullptr;
+  previous_ = nullptr;
+  pixels_ = nullptr;
+  sizePx_ = {};
+}
+
+// --- The window
+
+PanelWindow::PanelWindow(WindowOwner& owner, ScreenMetrics metrics, Size initialSizePx)
+    : owner_(owner), metrics_(metrics) {
+  memory_.create(initialSizePx);
+}
+
+PanelWindow::~PanelWindow() { destroy(); }
+
+void PanelWindow::create(HWND parent, const RECT& place) {
+  const wchar_t* const className = windowClass(windowProcedure);
+  window_ = CreateWindowExW(0, className, L"", WS_CHILD | WS_CLIPSIBLINGS | WS_TABSTOP, place.left, place.top,
+                            place.right - place.left, place.bottom - place.top, parent, nullptr,
+                            moduleHandle(), this);
+  if (window_ == nullptr) throw ComFailure(HRESULT_FROM_WIN32(GetLastError()));
+  windowDC_ = GetDC(window_);
+  if (events_ != nullptr) events_->resized();
+  if (visible_) ShowWindow(window_, SW_SHOWNA);
+}
+
+void PanelWindow::destroy() noexcept {
+  if (window_ != nullptr) DestroyWindow(window_);
+}
+
+void PanelWindow::place(const RECT& rect, const RECT* clip) {
+  if (window_ == nullptr) return;
+  SetWindowPos(window_, nullptr, rect.left, rect.top, rect.right - rect.left, rect.bottom - rect.top,
+               SWP_NOZORDER | SWP_NOACTIVATE);
+  RECT shown{};
+  const bool clipped = clip != nullptr && IntersectRect(&shown, clip, &rect) && !EqualRect(&shown, &rect);
+  if (!clipped) {  // some pages hand over an empty clip for "no clip"
+    SetWindowRgn(window_, nullptr, TRUE);
+    return;
+  }
+  OffsetRect(&shown, -rect.left, -rect.top);
+  SetWindowRgn(window_, CreateRectRgnIndirect(&shown), TRUE);  // the window owns the region now
+}
+
+void PanelWindow::resizeMemory(Size sizePx) {
+  if (sizePx.width <= 0 || sizePx.height <= 0 || sizePx == memory_.sizePx()) return;
+  memory_.create(sizePx);
+  if (window_ == nullptr && events_ != nullptr) events_->resized();
+}
+
+void PanelWindow::render(MemoryPicture& picture) {
+  picture.create(clientSizePx());
+  if (events_ == nullptr) return;
+  const HDC before = std::exchange(rendering_, picture.dc());
+  events_->paint();
+  rendering_ = before;
+}
+
+DcHandle PanelWindow::hdc() {
+  const HDC current = rendering_ != nullptr ? rendering_ : window_ != nullptr ? windowDC_ : memory_.dc();
+  return {reinterpret_cast<std::uintptr_t>(current)};
+}
+
+Size PanelWindow::clientSizePx() {
+  if (window_ == nullptr) return memory_.sizePx();
+  RECT client{};
+  GetClientRect(window_, &client);
+  return {std::max<std::int32_t>(client.right, 1), std::max<std::int32_t>(client.bottom, 1)};
+}
+
+void PanelWindow::mousePointer(MousePointer pointer) {
+  if (pointer == pointer_) return;
+  pointer_ = pointer;
+  if (window_ != nullptr) showPointer();
+}
+
+void PanelWindow::showPointer() const {
+  const wchar_t* const shape = pointer_ == MousePointer::SizeNorthSouth ? IDC_SIZENS
+                               : pointer_ == MousePointer::SizeEastWest ? IDC_SIZEWE
+                                                                        : IDC_ARROW;
+  SetCursor(LoadCursorW(nullptr, shape));
+}
+
+void PanelWindow::visible(bool visible) {
+  visible_ = visible;
+  if (window_ != nullptr) ShowWindow(window_, visible ? SW_SHOWNA : SW_HIDE);
+}
+
+void PanelWindow::refresh() {
+  if (window_ != nullptr) InvalidateRect(window_, nullptr, FALSE);
+}
+
+// --- Messages
+
+LRESULT CALLBACK PanelWindow::windowProcedure(HWND window, UINT message, WPARAM wParam,
+                                              LPARAM lParam) noexcept {
+  if (message == WM_NCCREATE) {
+    const auto* const creation = reinterpret_cast<const CREATESTRUCTW*>(lParam);
+    SetWindowLongPtrW(window, GWLP_USERDATA, reinterpret_cast<LONG_PTR>(creation->lpCreateParams));
+    static_cast<PanelWindow*>(creation->lpCreateParams)->window_ = window;
+  }
+  auto* const self = reinterpret_cast<PanelWindow*>(GetWindowLongPtrW(window, GWLP_USERDATA));
+  if (self == nullptr) return DefWindowProcW(window, message, wParam, lParam);
+  const HeldControl held(self->owner_);
+  LRESULT result = 0;
+  barrier([&] { result = self->handle(message, wParam, lParam); });
+  if (message == WM_NCDESTROY) {
+    SetWindowLongPtrW(window, GWLP_USERDATA, 0);
+    self->window_ = nullptr;
+    self->windowDC_ = nullptr;
+    self->owner_.windowDestroyed();
+  }
+  return result;
+}
+
+LRESULT PanelWindow::handle(UINT message, WPARAM wParam, LPARAM lParam) {
+  for (const ButtonRow& row : kButtons) {
+    if (message == row.down || message == row.doubleClick) return press(row.button, lParam), 0;
+    if (message == row.up) return release(row.button, lParam), 0;
+  }
+  switch (message) {
+    case WM_PAINT:
+      return paint(), 0;
+    case WM_SIZE:
+      if (events_ != nullptr && windowDC_ != nullptr) events_->resized();
+      return 0;
+    case WM_MOUSEACTIVATE:
+      if (owner_.inUse()) owner_.pressed();
+      return MA_ACTIVATE;
+    case WM_MOUSEMOVE:
+      if (events_ != nullptr && owner_.inUse()) events_->mouseMove(mouseEvent(buttonsHeld(wParam), lParam));
+      return 0;
+    case WM_KEYDOWN:
+      if (events_ != nullptr && owner_.inUse())
+        events_->keyDown(static_cast<std::int16_t>(wParam), shiftState());
+      return 0;
+    case WM_GETDLGCODE:
+      return DLGC_WANTARROWS;
+    case WM_SETFOCUS:
+    case WM_KILLFOCUS:
+      return owner_.focusChanged(message == WM_SETFOCUS), 0;
+    case WM_SETCURSOR:
+      if (LOWORD(lParam) != HTCLIENT || pointer_ == MousePointer::Default) break;
+      return showPointer(), TRUE;
+    default:
+      break;
+  }
+  return DefWindowProcW(window_, message, wParam, lParam);
+}
+
+void PanelWindow::paint() {
+  PAINTSTRUCT description;
+  BeginPaint(window_, &description);
+  // Also when the panel fails: a window that is not validated asks to be painted for ever.
+  if (events_ != nullptr) barrier([this] { events_->paint(); });
+  EndPaint(window_, &description);
+}
+
+// The capture is taken before the press goes on: a splitter bar takes it in turn and expects to find a window
+// that held it.
+void PanelWindow::press(std::int16_t button, LPARAM position) {
+  if (!owner_.inUse()) return;
+  SetFocus(window_);
+  SetCapture(window_);
+  if (events_ != nullptr) events_->mouseDown(mouseEvent(button, position));
+}
+
+void PanelWindow::release(std::int16_t button, LPARAM position) {
+  if (events_ != nullptr && owner_.inUse()) events_->mouseUp(mouseEvent(button, position));
+  if (GetCapture() == window_) ReleaseCapture();
+}
+
+MouseEvent PanelWindow::mouseEvent(std::int16_t button, LPARAM position) const {
+  return {button, shiftState(), static_cast<float>(GET_X_LPARAM(position)) * metrics_.twipsPerPixelX,
+          static_cast<float>(GET_Y_LPARAM(position)) * metrics_.twipsPerPixelY};
+}
+
+}  // namespace frontpanels::activex

@@ -1,0 +1,98 @@
+// The window of a panel's graph. Before the control is active there is none, and the graph is drawn into a
+// bitmap in memory instead, so that a panel that a script created works like one on a form.
+#pragma once
+
+#include <windows.h>
+
+#include "activex/panel_events.h"
+#include "platform/windowing.h"
+
+namespace frontpanels::activex {
+
+// The control as its window sees it.
+class WindowOwner {
+ public:
+  virtual ~WindowOwner() = default;
+
+  // Keeps the control alive while one of its messages is being handled.
+  virtual void holdControl() noexcept = 0;
+  virtual void releaseControl() noexcept = 0;
+  virtual void pressed() = 0;  // with the mouse: the control becomes the active one
+  virtual void focusChanged(bool focused) = 0;
+  virtual void windowDestroyed() noexcept = 0;
+  // False while a form is being designed: the panel is a picture then, without input.
+  [[nodiscard]] virtual bool inUse() const = 0;
+};
+
+// A device context in memory with a bitmap of 32-bit pixels, rows from the top.
+class MemoryPicture {
+ public:
+  MemoryPicture() = default;
+  ~MemoryPicture() { release(); }
+  MemoryPicture(const MemoryPicture&) = delete;
+  MemoryPicture& operator=(const MemoryPicture&) = delete;
+
+  // Filled with the face colour. Raises std::bad_alloc.
+  void create(Size sizePx);
+  void release() noexcept;
+  [[nodiscard]] HDC dc() const noexcept { return dc_; }
+  [[nodiscard]] Size sizePx() const noexcept { return sizePx_; }
+  [[nodiscard]] const std::uint32_t* pixels() const noexcept { return pixels_; }
+
+ private:
+  HDC dc_ = nullptr;
+  HBITMAP bitmap_ = nullptr;
+  HGDIOBJ previous_ = nullptr;
+  std::uint32_t* pixels_ = nullptr;
+  Size sizePx_{};
+};
+
+class PanelWindow final : public GraphView {
+ public:
+  PanelWindow(WindowOwner& owner, ScreenMetrics metrics, Size initialSizePx);
+  ~PanelWindow() override;
+  // What is told about paints and input from now on; null for nobody.
+  void events(PanelEvents* events) noexcept { events_ = events; }
+
+  // Makes the child window, hidden when the view is. Raises ComFailure.
+  void create(HWND parent, const RECT& place);
+  void destroy() noexcept;
+  [[nodiscard]] HWND window() const noexcept { return window_; }
+  // Moves the window and clips it where the container shows only a part.
+  void place(const RECT& rect, const RECT* clip);
+  // Gives a view without window its size.
+  void resizeMemory(Size sizePx);
+  // Composes the picture anew into memory of the view's size.
+  void render(MemoryPicture& picture);
+
+  // GraphView
+  DcHandle hdc() override;
+  WindowHandle hwnd() override { return {reinterpret_cast<std::uintptr_t>(window_)}; }
+  Size clientSizePx() override;
+  MousePointer mousePointer() override { return pointer_; }
+  void mousePointer(MousePointer pointer) override;
+  bool visible() override { return visible_; }
+  void visible(bool visible) override;
+  void refresh() override;
+
+ private:
+  static LRESULT CALLBACK windowProcedure(HWND window, UINT message, WPARAM wParam, LPARAM lParam) noexcept;
+  [[nodiscard]] LRESULT handle(UINT message, WPARAM wParam, LPARAM lParam);
+  void paint();
+  void press(std::int16_t button, LPARAM position);
+  void release(std::int16_t button, LPARAM position);
+  [[nodiscard]] MouseEvent mouseEvent(std::int16_t button, LPARAM position) const;
+  void showPointer() const;
+
+  WindowOwner& owner_;
+  ScreenMetrics metrics_;
+  PanelEvents* events_ = nullptr;
+  HWND window_ = nullptr;
+  HDC windowDC_ = nullptr;
+  MemoryPicture memory_;
+  HDC rendering_ = nullptr;  // stands in for the view while a picture is made
+  MousePointer pointer_ = MousePointer::Default;
+  bool visible_ = true;
+};
+
+}  // namespace frontpanels::activex

@@ -1,0 +1,60 @@
+#include "activex/picture_file.h"
+
+#include <wincodec.h>
+
+#include "activex/barrier.h"
+#include "platform/win32/com_pointer.h"
+
+namespace frontpanels::activex {
+namespace {
+
+void encode(const std::wstring& path, const MemoryPicture& picture) {
+  ComPointer<IWICImagingFactory> factory;
+  check(CoCreateInstance(CLSID_WICImagingFactory, nullptr, CLSCTX_INPROC_SERVER, IID_IWICImagingFactory,
+                         reinterpret_cast<void**>(factory.receive())));
+  ComPointer<IWICStream> stream;
+  check(factory->CreateStream(stream.receive()));
+  check(stream->InitializeFromFilename(path.c_str(), GENERIC_WRITE));
+  ComPointer<IWICBitmapEncoder> encoder;
+  check(factory->CreateEncoder(GUID_ContainerFormatPng, nullptr, encoder.receive()));
+  check(encoder->Initialize(stream.get(), WICBitmapEncoderNoCache));
+  ComPointer<IWICBitmapFrameEncode> frame;
+  check(encoder->CreateNewFrame(frame.receive(), nullptr));
+  check(frame->Initialize(nullptr));
+  const auto width = static_cast<UINT>(picture.sizePx().width);
+  const auto height = static_cast<UINT>(picture.sizePx().height);
+  check(frame->SetSize(width, height));
+  ComPointer<IWICBitmap> bitmap;
+  check(factory->CreateBitmapFromMemory(
+      width, height, GUID_WICPixelFormat32bppBGR, width * 4, width * height * 4,
+      reinterpret_cast<BYTE*>(const_cast<std::uint32_t*>(picture.pixels())), bitmap.receive()));
+  WICPixelFormatGUID format = GUID_WICPixelFormat24bppBGR;
+  check(frame->SetPixelFormat(&format));
+  ComPointer<IWICFormatConverter> converter;
+  check(factory->CreateFormatConverter(converter.receive()));
+  check(converter->Initialize(bitmap.get(), format, WICBitmapDitherTypeNone, nullptr, 0,
+                              WICBitmapPaletteTypeCustom));
+  check(frame->WriteSource(converter.get(), nullptr));
+  check(frame->Commit());
+  check(encoder->Commit());
+}
+
+}  // namespace
+
+// Written aside and renamed, so that a full disk leaves no half picture.
+void writePng(const std::wstring& path, const MemoryPicture& picture) {
+  const std::wstring aside = path + L".part";
+  GdiFlush();
+  try {
+    encode(aside, picture);
+  } catch (...) {
+    DeleteFileW(aside.c_str());
+    throw;
+  }
+  if (MoveFileExW(aside.c_str(), path.c_str(), MOVEFILE_REPLACE_EXISTING)) return;
+  const HRESULT failure = HRESULT_FROM_WIN32(GetLastError());
+  DeleteFileW(aside.c_str());
+  throw ComFailure(failure);
+}
+
+}  // namespace frontpanels::activex

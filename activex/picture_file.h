@@ -1,0 +1,14 @@
+// PNG files by the operating system's own imaging component.
+#pragma once
+
+#include <string>
+
+#include "activex/panel_window.h"
+
+namespace frontpanels::activex {
+
+// Replaces a file that is there, and leaves it as it was when writing fails. Raises ComFailure with the
+// system's code.
+void writePng(const std::wstring& path, const MemoryPicture& picture);
+
+}  // namespace frontpanels::activex

@@ -1,0 +1,21 @@
+// What all panels of the process share: the graphics interface, window services, the data hub, the message
+// boxes.
+#pragma once
+
+#include "platform/data_server.h"
+#include "platform/win32/win32_dialogs.h"
+#include "platform/win32/win32_gdi.h"
+#include "platform/win32/win32_windowing.h"
+
+namespace frontpanels::activex {
+
+struct Services {
+  Win32Gdi gdi;
+  Win32Windowing windowing;
+  Win32Dialogs dialogs;
+  DataHub hub;
+};
+// Made with the first object that needs it; connects the error reporter to message boxes.
+[[nodiscard]] Services& services();
+
+}  // namespace frontpanels::activex

@@ -1,0 +1,83 @@
+// FrontPanels.SpectrumView: the spectrum panel as a control.
+#pragma once
+
+#include <optional>
+
+#include "activex/control_core.h"
+#include "activex/dispatch.h"
+#include "activex/panel_events.h"
+#include "framework/panel/panel_host.h"
+#include "frontpanels_h.h"
+#include "spectrum/spectrum_view.h"
+
+namespace frontpanels::activex {
+
+#pragma GCC diagnostic push
+#pragma GCC diagnostic ignored "-Wnon-virtual-dtor"
+
+// A control with its automation interface.
+class SpectrumControlBase : public ControlCore, public ISpectrumView {
+ public:
+  using ControlCore::ControlCore;
+  HRESULT STDMETHODCALLTYPE QueryInterface(REFIID id, void** object) override {
+    return outer()->QueryInterface(id, object);
+  }
+  ULONG STDMETHODCALLTYPE AddRef() override { return outer()->AddRef(); }
+  ULONG STDMETHODCALLTYPE Release() override { return outer()->Release(); }
+};
+
+#pragma GCC diagnostic pop
+
+class SpectrumControl final : public Dispatching<SpectrumControlBase, ISpectrumView>,
+                              public PanelEvents,
+                              public PanelHost,
+                              public PanelContainer {
+ public:
+  explicit SpectrumControl(IUnknown* outer);
+  ~SpectrumControl() override;
+
+  // ISpectrumView
+  HRESULT STDMETHODCALLTYPE vfpOp(LONG hardwareId, short operation, VARIANT parameter, LONG* status) override;
+  HRESULT STDMETHODCALLTYPE vfpSet(LONG hardwareId, short parameterType, short index, VARIANT value,
+                                   LONG* status) override;
+  HRESULT STDMETHODCALLTYPE get_Caption(BSTR* text) override;
+  HRESULT STDMETHODCALLTYPE addMarker() override;
+  HRESULT STDMETHODCALLTYPE markerToMax() override;
+  HRESULT STDMETHODCALLTYPE markerToMin() override;
+  HRESULT STDMETHODCALLTYPE SavePicture(BSTR path) override;
+  HRESULT STDMETHODCALLTYPE get_ViewScaleWidth(float* twips) override;
+  HRESULT STDMETHODCALLTYPE get_ViewScaleHeight(float* twips) override;
+  HRESULT STDMETHODCALLTYPE get_ViewScaleMode(short* mode) override;
+  HRESULT STDMETHODCALLTYPE get_ViewHWnd(LONG* window) override;
+  HRESULT STDMETHODCALLTYPE get_ViewVisible(VARIANT_BOOL* visible) override;
+  HRESULT STDMETHODCALLTYPE Refresh() override;
+
+  // PanelEvents
+  void paint() override { panel_->Paint(); }
+  void resized() override { panel_->Form_Resize(); }
+  void mouseDown(const MouseEvent& e) override { panel_->MouseDown(e.button, e.shift, e.xTwips, e.yTwips); }
+  void mouseMove(const MouseEvent& e) override { panel_->MouseMove(e.button, e.shift, e.xTwips, e.yTwips); }
+  void mouseUp(const MouseEvent& e) override { panel_->MouseUp(e.button, e.shift, e.xTwips, e.yTwips); }
+  void keyDown(std::int16_t keyCode, std::int16_t shift) override { panel_->KeyDown(keyCode, shift); }
+
+  // PanelHost
+  std::int32_t frontPanelOp(std::int32_t hwId, std::int32_t vfpId, std::int16_t operation,
+                            const Variant& argument) override;
+  // PanelContainer: the panel's caption and state are the container's to show once it has an extender;
+  // visibility goes through the view.
+  void caption(std::string_view) override {}
+  void visible(bool) override {}
+  void viewState(std::int16_t) override {}
+
+  // Stored properties
+  std::span<const StoredProperty> storedProperties() const override;
+  bool storedValue(std::size_t property) const override;
+  void storedValue(std::size_t property, bool value) override;
+
+ private:
+  [[nodiscard]] void* findInterface(REFIID id) noexcept override;
+
+  std::optional<SpectrumView> panel_;
+};
+
+}  // namespace frontpanels::activex

@@ -1,0 +1,67 @@
+#include "activex/view_part.h"
+
+#include "activex/barrier.h"
+
+namespace frontpanels::activex {
+
+void ViewPart::changed() {
+  if (!sink_ || (aspects_ & DVASPECT_CONTENT) == 0) return;
+  const ComPointer<IAdviseSink> told = sink_;
+  if ((flags_ & ADVF_ONLYONCE) != 0) sink_.reset();
+  told->OnViewChange(DVASPECT_CONTENT, -1);
+}
+
+HRESULT ViewPart::Draw(DWORD aspect, LONG, void*, DVTARGETDEVICE*, HDC, HDC dc, LPCRECTL bounds, LPCRECTL,
+                       WINBOOL(CALLBACK*)(ULONG_PTR), ULONG_PTR) {
+  if (aspect != DVASPECT_CONTENT) return DV_E_DVASPECT;
+  if (dc == nullptr || bounds == nullptr) return E_INVALIDARG;
+  return barrier([&]() -> HRESULT {
+    MemoryPicture picture;
+    core().window().render(picture);
+    BITMAPINFO info{};
+    info.bmiHeader.biSize = sizeof info.bmiHeader;
+    info.bmiHeader.biWidth = picture.sizePx().width;
+    info.bmiHeader.biHeight = -picture.sizePx().height;
+    info.bmiHeader.biPlanes = 1;
+    info.bmiHeader.biBitCount = 32;
+    const int saved = SaveDC(dc);
+    SetStretchBltMode(dc, COLORONCOLOR);
+    GdiFlush();
+    const int rows = StretchDIBits(
+        dc, static_cast<int>(bounds->left), static_cast<int>(bounds->top),
+        static_cast<int>(bounds->right - bounds->left), static_cast<int>(bounds->bottom - bounds->top), 0, 0,
+        picture.sizePx().width, picture.sizePx().height, picture.pixels(), &info, DIB_RGB_COLORS, SRCCOPY);
+    RestoreDC(dc, saved);
+    return rows == static_cast<int>(GDI_ERROR) ? VIEW_E_DRAW : S_OK;
+  });
+}
+
+HRESULT ViewPart::GetColorSet(DWORD, LONG, void*, DVTARGETDEVICE*, HDC, LOGPALETTE** palette) {
+  if (palette == nullptr) return E_POINTER;
+  *palette = nullptr;
+  return S_FALSE;
+}
+
+HRESULT ViewPart::SetAdvise(DWORD aspects, DWORD flags, IAdviseSink* sink) {
+  aspects_ = aspects;
+  flags_ = flags;
+  sink_ = ComPointer<IAdviseSink>(sink);
+  if ((flags & ADVF_PRIMEFIRST) != 0) changed();
+  return S_OK;
+}
+
+HRESULT ViewPart::GetAdvise(DWORD* aspects, DWORD* flags, IAdviseSink** sink) {
+  if (aspects != nullptr) *aspects = aspects_;
+  if (flags != nullptr) *flags = flags_;
+  if (sink != nullptr) *sink = ComPointer<IAdviseSink>(sink_).detach();
+  return S_OK;
+}
+
+HRESULT ViewPart::GetExtent(DWORD aspect, LONG, DVTARGETDEVICE*, LPSIZEL himetric) {
+  if (himetric == nullptr) return E_POINTER;
+  if (aspect != DVASPECT_CONTENT) return DV_E_DVASPECT;
+  *himetric = core().extent();
+  return S_OK;
+}
+
+}  // namespace frontpanels::activex
