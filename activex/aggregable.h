@@ -10,10 +10,6 @@
 
 namespace frontpanels::activex {
 
-// Interfaces have no virtual destructor: objects end by their last Release.
-#pragma GCC diagnostic push
-#pragma GCC diagnostic ignored "-Wnon-virtual-dtor"
-
 class Aggregable {
  public:
   // A null outer object means that this one stands for itself.
@@ -60,7 +56,5 @@ class Delegating : public Aggregable, public Interfaces... {
   ULONG STDMETHODCALLTYPE AddRef() override { return outer()->AddRef(); }
   ULONG STDMETHODCALLTYPE Release() override { return outer()->Release(); }
 };
-
-#pragma GCC diagnostic pop
 
 }  // namespace frontpanels::activex

@@ -10,9 +10,6 @@
 
 namespace frontpanels::activex {
 
-#pragma GCC diagnostic push
-#pragma GCC diagnostic ignored "-Wnon-virtual-dtor"
-
 class ClassFactory final : public IClassFactory {
  public:
   explicit ClassFactory(const ClassRow& row) noexcept : row_(row) {}
@@ -30,7 +27,5 @@ class ClassFactory final : public IClassFactory {
   const ClassRow& row_;
   std::atomic<ULONG> references_ = 1;
 };
-
-#pragma GCC diagnostic pop
 
 }  // namespace frontpanels::activex

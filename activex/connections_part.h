@@ -12,9 +12,6 @@
 
 namespace frontpanels::activex {
 
-#pragma GCC diagnostic push
-#pragma GCC diagnostic ignored "-Wnon-virtual-dtor"
-
 // An object of its own, which shares the life of the control.
 class EventConnectionPoint final : public IConnectionPoint {
  public:
@@ -42,8 +39,6 @@ class EventConnectionPoint final : public IConnectionPoint {
   std::vector<Connection> connections_;
   DWORD lastCookie_ = 0;
 };
-
-#pragma GCC diagnostic pop
 
 class ConnectionsPart final : public ControlPart<IConnectionPointContainer> {
  public:

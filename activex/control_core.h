@@ -103,9 +103,6 @@ class ControlCore : public Aggregable, public WindowOwner {
   std::unique_ptr<ClassInfoPart> classInfo_;
 };
 
-#pragma GCC diagnostic push
-#pragma GCC diagnostic ignored "-Wnon-virtual-dtor"
-
 // An OLE duty of a control: interfaces whose identity and life are the control's.
 template <class... Interfaces>
 class ControlPart : public Interfaces... {
@@ -127,8 +124,6 @@ class ControlPart : public Interfaces... {
  private:
   ControlCore& core_;
 };
-
-#pragma GCC diagnostic pop
 
 // Pixels and himetric of the screen; symmetric rounding.
 [[nodiscard]] SIZEL himetricOf(Size sizePx) noexcept;

@@ -18,9 +18,6 @@ namespace frontpanels::activex {
 HRESULT invokeByTypeInfo(ITypeInfo& info, void* object, DISPID member, WORD flags, DISPPARAMS* parameters,
                          VARIANT* result, EXCEPINFO* exception, UINT* badArgument);
 
-#pragma GCC diagnostic push
-#pragma GCC diagnostic ignored "-Wnon-virtual-dtor"
-
 // The four methods for a dual interface. `Base` brings the interface and the base methods.
 template <class Base, class Dual>
 class Dispatching : public Base {
@@ -62,7 +59,5 @@ class Dispatching : public Base {
 
   ComPointer<ITypeInfo> typeInfo_;
 };
-
-#pragma GCC diagnostic pop
 
 }  // namespace frontpanels::activex

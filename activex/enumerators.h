@@ -14,9 +14,6 @@
 
 namespace frontpanels::activex {
 
-#pragma GCC diagnostic push
-#pragma GCC diagnostic ignored "-Wnon-virtual-dtor"
-
 // `Traits` gives the item as kept and how one is handed out with a reference of the caller's own.
 template <class Interface, class Traits>
 class Enumerator final : public Interface {
@@ -69,8 +66,6 @@ class Enumerator final : public Interface {
   std::vector<Item> items_;
   std::size_t next_;
 };
-
-#pragma GCC diagnostic pop
 
 struct ConnectionPointTraits {
   using Item = ComPointer<IConnectionPoint>;

@@ -12,9 +12,6 @@
 
 namespace frontpanels::activex {
 
-#pragma GCC diagnostic push
-#pragma GCC diagnostic ignored "-Wnon-virtual-dtor"
-
 // A control with its automation interface.
 class SpectrumControlBase : public ControlCore, public ISpectrumView {
  public:
@@ -25,8 +22,6 @@ class SpectrumControlBase : public ControlCore, public ISpectrumView {
   ULONG STDMETHODCALLTYPE AddRef() override { return outer()->AddRef(); }
   ULONG STDMETHODCALLTYPE Release() override { return outer()->Release(); }
 };
-
-#pragma GCC diagnostic pop
 
 class SpectrumControl final : public Dispatching<SpectrumControlBase, ISpectrumView>,
                               public PanelEvents,

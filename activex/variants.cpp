@@ -89,7 +89,7 @@ Variant fromObject(IUnknown* object) {
 // Types without a counterpart of the same width become doubles where they are numbers.
 Variant fromOtherNumber(const VARIANT& value) {
   OwnedVariant number;
-  if (FAILED(VariantChangeType(&number.value, &value, 0, VT_R8))) raiseTypeMismatch();
+  if (FAILED(VariantChangeType(&number.value, const_cast<VARIANT*>(&value), 0, VT_R8))) raiseTypeMismatch();
   return V_R8(&number.value);
 }
 
@@ -149,7 +149,7 @@ struct ToAutomation {
 Variant fromAutomation(const VARIANT& value) {
   if ((V_VT(&value) & VT_BYREF) != 0) {
     OwnedVariant followed;
-    if (FAILED(VariantCopyInd(&followed.value, &value))) raiseTypeMismatch();
+    if (FAILED(VariantCopyInd(&followed.value, const_cast<VARIANT*>(&value)))) raiseTypeMismatch();
     return fromAutomation(followed.value);
   }
   if ((V_VT(&value) & VT_ARRAY) != 0)
