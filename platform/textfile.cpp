@@ -32,7 +32,7 @@ class FileTextReader : public TextReader {
     line.ended = false;
     std::uint64_t length = 0;
     while (!line.ended && fill()) length += takeFromBlock(line);
-    if (line.ended && length <= keptBytes_ && line.text.ends_with('\r')) {
+    if (line.ended && line.text.ends_with('\r')) {  // in a line that is cut it only shortens what is cut off
       line.text.pop_back();
       --length;
     }

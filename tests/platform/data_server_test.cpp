@@ -73,10 +73,11 @@ TEST_F(DataServerTest, AnswersCountsAndValuesOfScalarsAndArrays) {
 TEST_F(DataServerTest, RaisesForWhatIsNotThere) {
   const auto a = listen("a", "Trace");
   hub.publish("Trace", std::array{1.0F, 2.0F});
+  hub.publish("Scalar", Variant(1.0));
   const std::function<void()> calls[] = {
       [&] { static_cast<void>(a->value(0, 2)); },        [&] { static_cast<void>(a->singleValue(0, -1)); },
       [&] { static_cast<void>(a->itemCount(1)); },       [&] { static_cast<void>(a->singles(-1)); },
-      [&] { static_cast<void>(hub.value("Other", 0)); }, [&] { static_cast<void>(hub.value("Trace", -1)); }};
+      [&] { static_cast<void>(hub.value("Other", 0)); }, [&] { static_cast<void>(hub.value("Scalar", -1)); }};
   for (const auto& call : calls) {
     try {
       call();
@@ -109,7 +110,8 @@ TEST_F(DataServerTest, APublicationInsideAnEventOfItsPathComesAfterTheCurrentOne
     hub.publish("Other", Variant(9.0));  // another path: at once
   };
   hub.publish("Trace", std::array{1.0F});
-  EXPECT_EQ(log, (Log{"a0=1", "b1=9", "b0=1", "a0=2", "b0=2", "a0=3", "b0=3"}));
+  hub.publish("Trace", Variant(4.0));
+  EXPECT_EQ(log, (Log{"a0=1", "b1=9", "b0=1", "a0=2", "b0=2", "a0=3", "b0=3", "a0=4", "b0=4"}));
 }
 
 TEST_F(DataServerTest, ServersMayComeAndGoInsideAnEvent) {

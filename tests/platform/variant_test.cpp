@@ -88,6 +88,11 @@ TEST(TextToNumber, RefusesEverythingElse) {
     EXPECT_EQ(numberOf(text), std::nullopt) << text;
 }
 
+TEST(TextToNumber, WeighsDigitsAgainstTheExponentWhereNoDoubleHoldsTheNumber) {
+  EXPECT_EQ(numberOf("0." + std::string(400, '0') + "1e50"), 0);
+  EXPECT_EQ(numberOf(std::string(400, '9') + "e-50"), std::nullopt);
+}
+
 TEST(NumberToText, WritesDoublesInTheGeneralFormOfFifteenDigits) {
   const struct {
     double number;
