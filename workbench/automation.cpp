@@ -6,8 +6,8 @@
 #include <cstring>
 #include <vector>
 
+#include "platform/win32/utf16.h"
 #include "workbench/failure.h"
-#include "workbench/text.h"
 
 namespace frontpanels::workbench {
 namespace {
@@ -27,7 +27,7 @@ class ExceptionInfo {
   [[nodiscard]] EXCEPINFO* receive() noexcept { return &info_; }
   [[nodiscard]] std::string description() {
     if (info_.pfnDeferredFillIn != nullptr) info_.pfnDeferredFillIn(&info_);
-    if (info_.bstrDescription != nullptr) return narrow(info_.bstrDescription);
+    if (info_.bstrDescription != nullptr) return toUtf8(info_.bstrDescription);
     return describe(info_.scode != 0 ? info_.scode : E_FAIL);
   }
 
@@ -67,7 +67,7 @@ Value::Value(double value) noexcept : Value() {
 }
 
 Value::Value(std::string_view utf8) : Value() {
-  variant_.bstrVal = makeBstr(wide(utf8));
+  variant_.bstrVal = makeBstr(toUtf16(utf8));
   variant_.vt = VT_BSTR;
 }
 
@@ -100,12 +100,12 @@ std::int32_t Value::toInt32() const {
 std::string Value::toText() const {
   Value converted;
   check(VariantChangeType(&converted.variant_, withoutConst(variant_), 0, VT_BSTR), "Reading a text");
-  return narrow({converted.variant_.bstrVal, SysStringLen(converted.variant_.bstrVal)});
+  return toUtf8({converted.variant_.bstrVal, SysStringLen(converted.variant_.bstrVal)});
 }
 
 CLSID registeredClass(const std::string& progId) {
   CLSID id{};
-  if (FAILED(CLSIDFromProgID(wide(progId).c_str(), &id))) throw NotRegistered(progId);
+  if (FAILED(CLSIDFromProgID(toUtf16(progId).c_str(), &id))) throw NotRegistered(progId);
   return id;
 }
 
@@ -171,7 +171,7 @@ void Automation::invoke(WORD flags, const std::string& name, Arguments arguments
 
 DISPID Automation::member(const std::string& name) {
   if (const auto known = members_.find(name); known != members_.end()) return known->second;
-  std::wstring wideName = wide(name);
+  std::wstring wideName = toUtf16(name);
   LPOLESTR pointer = wideName.data();
   DISPID id = DISPID_UNKNOWN;
   check(object_->GetIDsOfNames(IID_NULL, &pointer, 1, LOCALE_USER_DEFAULT, &id), "Looking up " + name);

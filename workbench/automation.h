@@ -11,7 +11,7 @@
 #include <string>
 #include <string_view>
 
-#include "workbench/com_pointer.h"
+#include "platform/win32/com_pointer.h"
 
 namespace frontpanels::workbench {
 

@@ -5,7 +5,7 @@
 
 #include <atomic>
 
-#include "workbench/com_pointer.h"
+#include "platform/win32/com_pointer.h"
 
 namespace frontpanels::workbench {
 

@@ -4,7 +4,7 @@
 #include <new>
 
 #include "platform/runtime_error.h"
-#include "workbench/text.h"
+#include "platform/win32/utf16.h"
 
 namespace frontpanels::workbench {
 namespace {
@@ -15,7 +15,7 @@ std::string systemText(DWORD code) {
                                       code, 0, text, static_cast<DWORD>(std::size(text)), nullptr);
   std::wstring_view words(text, length);
   const auto last = words.find_last_not_of(L"\r\n .");
-  return narrow(words.substr(0, last == std::wstring_view::npos ? 0 : last + 1));
+  return toUtf8(words.substr(0, last == std::wstring_view::npos ? 0 : last + 1));
 }
 
 }  // namespace

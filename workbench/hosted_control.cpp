@@ -40,15 +40,15 @@ void HostedControl::activate() {
   const RECT rect = place_.panelRect();
   SIZEL extent{himetricFromPixels(rect.right - rect.left), himetricFromPixels(rect.bottom - rect.top)};
   object_->SetExtent(DVASPECT_CONTENT, &extent);
-  doVerb(OLEIVERB_INPLACEACTIVATE);
+  check(doVerb(OLEIVERB_INPLACEACTIVATE), "Activating the panel");
   inPlace_ = object_.query<IOleInPlaceObject>();
   if (!inPlace_) throw HostFailure("The panel cannot be active in a window");
   layOut();
 }
 
-void HostedControl::doVerb(LONG verb) {
+HRESULT HostedControl::doVerb(LONG verb) {
   const RECT rect = place_.panelRect();
-  check(object_->DoVerb(verb, nullptr, site_.get(), 0, place_.parentWindow(), &rect), "Activating the panel");
+  return object_->DoVerb(verb, nullptr, site_.get(), 0, place_.parentWindow(), &rect);
 }
 
 Automation HostedControl::automation() const {
@@ -63,7 +63,8 @@ void HostedControl::layOut() {
   inPlace_->SetObjectRects(&rect, &rect);
 }
 
-void HostedControl::focus() { doVerb(OLEIVERB_UIACTIVATE); }
+// A control that does not want the keyboard leaves it where it is.
+void HostedControl::focus() { static_cast<void>(doVerb(OLEIVERB_UIACTIVATE)); }
 
 void HostedControl::frameActivated(bool active) {
   if (activeObject_) activeObject_->OnFrameWindowActivate(active);
@@ -78,7 +79,7 @@ bool HostedControl::translateAccelerator(MSG& message) {
 void HostedControl::visible(bool visible) {
   if (visible == visible_) return;
   visible_ = visible;
-  doVerb(visible ? OLEIVERB_SHOW : OLEIVERB_HIDE);
+  check(doVerb(visible ? OLEIVERB_SHOW : OLEIVERB_HIDE), "Showing or hiding the panel");
 }
 
 void HostedControl::close() noexcept {

@@ -7,8 +7,8 @@
 #include <optional>
 #include <string>
 
+#include "platform/win32/com_pointer.h"
 #include "workbench/automation.h"
-#include "workbench/com_pointer.h"
 #include "workbench/control_owner.h"
 #include "workbench/control_site.h"
 #include "workbench/event_sink.h"
@@ -45,7 +45,7 @@ class HostedControl final : private ControlOwner {
 
   void siteAndInitialise(const std::wstring& name);
   void activate();
-  void doVerb(LONG verb);
+  [[nodiscard]] HRESULT doVerb(LONG verb);
   void close() noexcept;
 
   PanelPlace& place_;

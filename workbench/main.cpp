@@ -9,10 +9,10 @@
 #include <vector>
 
 #include "platform/textfile.h"
+#include "platform/win32/utf16.h"
 #include "workbench/console.h"
 #include "workbench/failure.h"
 #include "workbench/options.h"
-#include "workbench/text.h"
 #include "workbench/workbench.h"
 
 namespace frontpanels::workbench {
@@ -33,7 +33,7 @@ std::vector<std::string> commandLine() {
   };
   const std::unique_ptr<LPWSTR, Free> words(CommandLineToArgvW(GetCommandLineW(), &count));
   std::vector<std::string> arguments;
-  for (int i = 1; i < count; ++i) arguments.push_back(narrow(words.get()[i]));
+  for (int i = 1; i < count; ++i) arguments.push_back(toUtf8(words.get()[i]));
   return arguments;
 }
 
@@ -43,7 +43,7 @@ bool isUnattended(const std::vector<std::string>& arguments) {
 
 void tell(bool unattended, const std::string& text, UINT icon) {
   writeError(text);
-  if (!unattended) MessageBoxW(nullptr, wide(text).c_str(), L"Front Panels workbench", MB_OK | icon);
+  if (!unattended) MessageBoxW(nullptr, toUtf16(text).c_str(), L"Front Panels workbench", MB_OK | icon);
 }
 
 ExitCode runProgram(const std::vector<std::string>& arguments, int showCommand) {

@@ -6,10 +6,10 @@
 #include <array>
 #include <utility>
 
+#include "platform/win32/utf16.h"
 #include "workbench/failure.h"
 #include "workbench/resource_ids.h"
 #include "workbench/screen_scale.h"
-#include "workbench/text.h"
 
 namespace frontpanels::workbench {
 namespace {
@@ -24,7 +24,7 @@ constexpr int kHeight = 640;
 constexpr int kMinimumWidth = 320;
 constexpr int kMinimumHeight = 240;
 // Right edges of the status bar's parts but the last, which has the rest.
-constexpr std::array<int, 3> kPartEdges = {220, 440, 580};
+constexpr std::array<int, 3> kPartEdges = {300, 500, 650};
 
 void registerClass(WNDPROC procedure) {
   WNDCLASSEXW windowClass{};
@@ -86,7 +86,7 @@ void MainWindow::occupy(HostedControl* control) {
 
 void MainWindow::status(StatusPart part, const std::string& text) {
   SendMessageW(statusBar_, SB_SETTEXTW, static_cast<WPARAM>(part),
-               reinterpret_cast<LPARAM>(wide(text).c_str()));
+               reinterpret_cast<LPARAM>(toUtf16(text).c_str()));
 }
 
 void MainWindow::startTicking(std::chrono::milliseconds period) {
@@ -124,7 +124,7 @@ void MainWindow::panelCaption(const std::wstring& text) {
   SetWindowTextW(window_, text.empty() ? kTitle : (text + L" - " + kTitle).c_str());
 }
 
-void MainWindow::statusText(const std::wstring& text) { status(StatusPart::Message, narrow(text)); }
+void MainWindow::statusText(const std::wstring& text) { status(StatusPart::Message, toUtf8(text)); }
 
 bool MainWindow::translateAccelerator(MSG& message) {
   return TranslateAcceleratorW(window_, accelerators_, &message) != 0;

@@ -22,7 +22,7 @@ enum Parameter : std::int16_t {
   kResource = 315,
   kAutoScale = 722,
 };
-enum Operation : std::int16_t { kAddTrace = 10, kShow = 12 };
+enum Operation : std::int16_t { kClose = 1, kAddTrace = 10, kShow = 12 };
 
 void checkStatus(std::int32_t status, const char* meaning) {
   if (status == 0) return;
@@ -45,6 +45,14 @@ SpectrumPanel::SpectrumPanel(PanelPlace& place, PanelRequests& requests)
   operate(kAddTrace, "trace", static_cast<std::int32_t>(kAddTrace));
   set(kAutoScale, "auto scale", true);
   operate(kShow, "order to show", std::int32_t{0});
+}
+
+// A panel that refuses to be closed goes all the same.
+SpectrumPanel::~SpectrumPanel() {
+  try {
+    operate(kClose, "close", std::int32_t{0});
+  } catch (...) {
+  }
 }
 
 void SpectrumPanel::show(const DisplaySweep& sweep) {

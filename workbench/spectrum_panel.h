@@ -18,6 +18,9 @@ class SpectrumPanel {
 
   // Raises `NotRegistered`, or a failure that says what the panel refused.
   SpectrumPanel(PanelPlace& place, PanelRequests& requests);
+  SpectrumPanel(const SpectrumPanel&) = delete;
+  SpectrumPanel& operator=(const SpectrumPanel&) = delete;
+  ~SpectrumPanel();
 
   // Retunes the panel when the range is another, and hands it the levels.
   void show(const DisplaySweep& sweep);

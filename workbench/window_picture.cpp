@@ -6,9 +6,9 @@
 #include <memory>
 #include <type_traits>
 
-#include "workbench/com_pointer.h"
+#include "platform/win32/com_pointer.h"
+#include "platform/win32/utf16.h"
 #include "workbench/failure.h"
-#include "workbench/text.h"
 
 namespace frontpanels::workbench {
 namespace {
@@ -99,7 +99,7 @@ void writePng(const Picture& picture, const std::string& path) {
         attempt);
   ComPointer<IWICStream> file;
   check(factory->CreateStream(file.receive()), attempt);
-  check(file->InitializeFromFilename(wide(path).c_str(), GENERIC_WRITE), attempt);
+  check(file->InitializeFromFilename(toUtf16(path).c_str(), GENERIC_WRITE), attempt);
   ComPointer<IWICBitmapEncoder> encoder;
   check(factory->CreateEncoder(GUID_ContainerFormatPng, nullptr, encoder.receive()), attempt);
   check(encoder->Initialize(file.get(), WICBitmapEncoderNoCache), attempt);

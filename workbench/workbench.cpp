@@ -10,10 +10,10 @@
 #include <filesystem>
 #include <iterator>
 
+#include "platform/win32/utf16.h"
 #include "workbench/console.h"
 #include "workbench/failure.h"
 #include "workbench/resource_ids.h"
-#include "workbench/text.h"
 #include "workbench/window_picture.h"
 
 namespace frontpanels::workbench {
@@ -36,11 +36,11 @@ std::filesystem::path programFolder() {
 }
 
 std::string carriedRecording() {
-  return narrow((programFolder() / L"recordings" / L"fm_band.csv").wstring());
+  return toUtf8((programFolder() / L"recordings" / L"fm_band.csv").wstring());
 }
 
 std::string fileName(const std::string& path) {
-  return narrow(std::filesystem::path(wide(path)).filename().wstring());
+  return toUtf8(std::filesystem::path(toUtf16(path)).filename().wstring());
 }
 
 const char* stateName(SweepPlayer::State state) {
@@ -157,7 +157,7 @@ void Workbench::askForRecording() {
   dialog.nMaxFile = static_cast<DWORD>(std::size(path));
   dialog.lpstrTitle = L"Open recording";
   dialog.Flags = OFN_FILEMUSTEXIST | OFN_PATHMUSTEXIST | OFN_HIDEREADONLY | OFN_NOCHANGEDIR;
-  if (GetOpenFileNameW(&dialog)) openRecording(narrow(path));
+  if (GetOpenFileNameW(&dialog)) openRecording(toUtf8(path));
 }
 
 void Workbench::openRecording(const std::string& path) {
@@ -262,13 +262,13 @@ void Workbench::showMessages() {
 }
 
 void Workbench::takeScreenshots() {
-  const std::filesystem::path folder = std::filesystem::absolute(wide(options_.screenshotFolder));
+  const std::filesystem::path folder = std::filesystem::absolute(toUtf16(options_.screenshotFolder));
   std::filesystem::create_directories(folder);
   wchar_t number[24];
   std::swprintf(number, std::size(number), L"%04llu.png",
                 static_cast<unsigned long long>(player_.sweepNumber()));
-  saveWindowPicture(window_.handle(), narrow((folder / (std::wstring(L"window-") + number)).wstring()));
-  if (panel_) panel_->savePicture(narrow((folder / (std::wstring(L"spectrum-") + number)).wstring()));
+  saveWindowPicture(window_.handle(), toUtf8((folder / (std::wstring(L"window-") + number)).wstring()));
+  if (panel_) panel_->savePicture(toUtf8((folder / (std::wstring(L"spectrum-") + number)).wstring()));
 }
 
 // --- Ending, and telling the user
@@ -328,7 +328,7 @@ void Workbench::report(const std::string& message, bool withBox) {
 }
 
 void Workbench::box(const std::string& message, UINT icon) {
-  MessageBoxW(window_.handle(), wide(message).c_str(), L"Front Panels workbench", MB_OK | icon);
+  MessageBoxW(window_.handle(), toUtf16(message).c_str(), L"Front Panels workbench", MB_OK | icon);
 }
 
 }  // namespace frontpanels::workbench
