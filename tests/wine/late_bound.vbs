@@ -1,0 +1,93 @@
+' A stranger's script: everything by name, nothing known beforehand. Its last line says that it came to its end.
+Option Explicit
+
+Const SpectrumPath = "Brantor Scanner/Spectrum/Spectrum Trace"
+Dim folder, diagnostics, panel, hub
+
+Sub Check(what, actual, expected)
+  If CStr(actual) = CStr(expected) Then
+    WScript.Echo "ok script: " & what
+  Else
+    WScript.Echo "not ok script: " & what & ": [" & actual & "], not [" & expected & "]"
+  End If
+End Sub
+
+Function LastMessage()
+  LastMessage = Replace(diagnostics.Message(diagnostics.Count - 1), vbCr, "|")
+End Function
+
+Sub Statuses()
+  Check "resource id is taken", panel.vfpSet(0, 315, 0, 7), 0
+  Check "text that reads as a number is one", panel.vfpSet(0, 312, 0, "12"), 0
+  Check "other text is an unusable parameter", panel.vfpSet(0, 312, 0, "abc"), -8
+  Check "and is reported word for word", LastMessage(), "clsBaseVFP::vfpSet() PARM_MEASUREMENT_ID must be numeric|"
+  Check "an unlisted code answers 0", panel.vfpSet(0, 12, 0, 1), 0
+  Check "null is passed over where the panel's own code wants a number", panel.vfpSet(0, 13, 0, Null), 0
+  Check "caption is applied", panel.vfpSet(0, 314, 0, "Receiver 1"), 0
+  Check "and read back", panel.Caption, "Receiver 1"
+  Check "showing works without a parameter", panel.vfpOp(0, 12), 0
+  Check "an unknown operation answers -1", panel.vfpOp(0, 99, 1), -1
+  Check "operation 10 wants 10", panel.vfpOp(0, 10, 9), -8
+  Check "operation 10 with 10 adds the trace", panel.vfpOp(0, 10, 10), 0
+End Sub
+
+Sub Errors()
+  On Error Resume Next
+  panel.noSuchMember
+  Check "an unknown member is error 438", Err.Number, 438
+  Err.Clear
+  panel.vfpOp 0, 70000, 1
+  Check "a value too large for its width is error 6", Err.Number, 6
+  Err.Clear
+  hub.Value "no such path", 0
+  Check "an item that is not there is error 9", Err.Number, 9
+  Check "and explains itself", Err.Description, "Subscript out of range"
+  Err.Clear
+  panel.SavePicture "Z:\no such folder\x.png"
+  Check "a picture nowhere is an error", Err.Number <> 0, True
+  Err.Clear
+End Sub
+
+Sub Sweep()
+  Dim levels(512), i, files
+  For i = 0 To 512
+    levels(i) = -90 + 50 / (1 + (i - 200) * (i - 200) / 16)
+  Next
+  Check "centre is taken", panel.vfpSet(0, 13, 0, 98000000), 0
+  Check "span is taken", panel.vfpSet(0, 14, 0, "20000000"), 0
+  hub.Publish SpectrumPath, levels
+  Check "the hub holds the sweep", hub.ItemCount(SpectrumPath), 513
+  Check "and its items", hub.Value(SpectrumPath, 200), -40
+  panel.addMarker
+  panel.markerToMax
+  panel.SavePicture folder & "\late_bound.png"
+  Set files = CreateObject("Scripting.FileSystemObject")
+  Check "the picture is written", files.FileExists(folder & "\late_bound.png"), True
+  Check "nothing else was reported", diagnostics.Count, 1
+  Dim tooMany(513)
+  hub.Publish SpectrumPath, tooMany
+  Check "a sweep of 514 points is refused", LastMessage(), "SpectrumView::DfiSpectrum_DataChanged()|Subscript out of range"
+End Sub
+
+Sub Closing()
+  Check "closing answers 0", panel.vfpOp(0, 1), 0
+  Check "then everything does", panel.vfpSet(0, 312, 0, "abc"), 0
+  diagnostics.Clear
+  Check "and nothing is reported", diagnostics.Count, 0
+  hub.Publish SpectrumPath, -50
+  Check "a sweep after the close is ignored", diagnostics.Count, 0
+End Sub
+
+folder = WScript.Arguments(0)
+Set diagnostics = CreateObject("FrontPanels.Diagnostics")
+diagnostics.ShowMessages = False
+diagnostics.Clear
+Set panel = CreateObject("FrontPanels.SpectrumView")
+Set hub = CreateObject("FrontPanels.DataHub.1")
+Check "messages can be kept without boxes", diagnostics.ShowMessages, False
+Statuses
+Errors
+Sweep
+Closing
+Set panel = Nothing
+WScript.Echo "script finished"

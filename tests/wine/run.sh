@@ -1,0 +1,104 @@
+#!/usr/bin/env bash
+# Everything that only Windows shows, in one session under Wine: the unit tests against its run-time library, the drawing
+# seam pixel by pixel, the registered control driven by a script and by a container, the workbench, the undoing of the
+# registration, and what both libraries import and export. Needs the presets native-release, win64 and win32 built.
+# Ends with "N passed, N failed".
+set -uo pipefail
+root=$(cd "$(dirname "$0")/../.." && pwd)
+
+if [ "${FRONTPANELS_WINE_SESSION:-}" != yes ]; then
+  # One display round the whole session: a server started without one leaves a desktop that no window can be made on.
+  export FRONTPANELS_WINE_SESSION=yes WINEPREFIX="$root/build/wine" WINEDEBUG=-all WINEDLLOVERRIDES='mscoree,mshtml='
+  wineserver -k >/dev/null 2>&1
+  mkdir -p "$WINEPREFIX"
+  exec xvfb-run -a -s '-screen 0 1024x768x24' bash "$0" "$@"
+fi
+
+here=$root/tests/wine
+library=$root/build/win64/frontpanels.ocx
+out=$root/build/wine-tests
+rm -rf "$out"
+mkdir -p "$out"
+passed=0
+failed=0
+
+ok() { echo "ok $*"; passed=$((passed + 1)); }
+not_ok() { echo "not ok $*"; failed=$((failed + 1)); }
+judge() { if [ "$1" -eq 0 ]; then ok "$2"; else not_ok "$2"; fi; }
+windows_path() { printf 'Z:%s' "${1//\//\\}"; }
+# Counts a part that ends with "N passed, N failed".
+count() {
+  local counts
+  counts=$(grep -oE '^[0-9]+ passed, [0-9]+ failed' "$1" | tail -n 1)
+  [ -n "$counts" ] || { not_ok "$2 ended without a result"; tail -n 5 "$1"; return; }
+  # shellcheck disable=SC2086 -- the words of "N passed, N failed"
+  set -- $counts
+  passed=$((passed + $1))
+  failed=$((failed + $3))
+}
+
+# Script hosts hide every failure behind status 0: what counts is the last line.
+script() {
+  timeout 120 wine cscript //nologo "$(windows_path "$here/$1")" "$(windows_path "$out")" >"$out/$1.txt" 2>&1
+  tr -d '\r' <"$out/$1.txt" | grep -E '^(ok|not ok) '
+  passed=$((passed + $(grep -cE '^ok ' "$out/$1.txt")))
+  failed=$((failed + $(grep -cE '^not ok ' "$out/$1.txt")))
+  tr -d '\r' <"$out/$1.txt" | tail -n 1 | grep -qx 'script finished'
+  judge $? "$1 ran to its end"
+}
+
+unit_tests() {
+  timeout 300 wine "$root/build/win64/tests/wine/cross_tests.exe" --gtest_brief=1 >"$out/cross_tests.txt" 2>&1
+  judge $? "unit tests against the Windows run-time library ($(grep -oE '[0-9]+ tests from' "$out/cross_tests.txt" | head -n 1 | cut -d' ' -f1))"
+  grep -E 'FAILED|Failure' "$out/cross_tests.txt"
+}
+
+# The type library and every class by number and name are there, and after the undoing nothing is.
+registered_keys() {
+  wine reg query 'HKLM\Software\Classes' /s /f FrontPanels /k 2>/dev/null | tr -d '\r' | grep -cE 'HKEY_LOCAL_MACHINE.*FrontPanels'
+}
+
+imports_and_exports() {
+  local width file strange names
+  for width in 64:x86_64 32:i686; do
+    file=$root/build/win${width%%:*}/frontpanels.ocx
+    strange=$("${width##*:}"-w64-mingw32-objdump -p "$file" | sed -n 's/.*DLL Name: //p' |
+      grep -vixE '(advapi32|gdi32|kernel32|msvcrt|ole32|oleaut32|user32|windowscodecs)\.dll')
+    [ -z "$strange" ]
+    judge $? "the ${width%%:*}-bit library imports system libraries only${strange:+: $strange}"
+    names=$("${width##*:}"-w64-mingw32-objdump -p "$file" | sed -n '/\[Ordinal\/Name Pointer\]/,/^$/s/.*\] *//p' | tail -n +2 | sort | tr '\n' ' ')
+    [ "$names" = "DllCanUnloadNow DllGetClassObject DllInstall DllRegisterServer DllUnregisterServer " ]
+    judge $? "the ${width%%:*}-bit library exports its five functions undecorated: $names"
+  done
+}
+
+imports_and_exports
+timeout 180 wine wineboot -i >/dev/null 2>&1
+unit_tests
+timeout 300 "$here/compare_scenes.sh" >"$out/scenes.txt" 2>&1
+judge $? "the real and the raster graphics interface draw the same: $(tail -n 1 "$out/scenes.txt")"
+
+timeout 60 wine regsvr32 /s "$(windows_path "$library")"
+judge $? "the library registers"
+[ "$(registered_keys)" -gt 0 ]
+judge $? "its names are in the registry"
+script late_bound.vbs
+timeout 300 wine "$root/build/win64/tests/wine/container_test.exe" "$(windows_path "$out")" >"$out/container.txt" 2>&1
+tr -d '\r' <"$out/container.txt" >"$out/container.log"
+grep -E '^(ok|not ok) ' "$out/container.log"
+count "$out/container.log" "the container's test"
+if [ -f "$here/workbench.sh" ]; then
+  bash "$here/workbench.sh" >"$out/workbench.txt" 2>&1
+  grep -E '^(ok|not ok) ' "$out/workbench.txt"
+  count "$out/workbench.txt" "the workbench's test"
+fi
+timeout 60 wine regsvr32 /s /u "$(windows_path "$library")"
+judge $? "the library unregisters"
+[ "$(registered_keys)" -eq 0 ]
+judge $? "no name of it is left in the registry"
+timeout 60 wine regsvr32 /s /u "$(windows_path "$library")"
+judge $? "unregistering twice succeeds"
+wineserver -k >/dev/null 2>&1
+
+printf '%d passed, %d failed\n' "$passed" "$failed"
+[ "$failed" -eq 0 ]
