@@ -23,6 +23,7 @@ class DataServer;
 class DataHub {
  public:
   DataHub() = default;
+  ~DataHub() = default;
   DataHub(const DataHub&) = delete;
   DataHub& operator=(const DataHub&) = delete;
 

@@ -73,7 +73,7 @@ class FileTextReader : public TextReader {
   std::ifstream file_;
   std::uint64_t sizeBytes_;
   std::size_t keptBytes_;
-  std::array<char, 65536> block_;
+  std::array<char, 65536> block_{};
   std::size_t at_ = 0;
   std::size_t filled_ = 0;
   std::uint64_t positionBytes_ = 0;

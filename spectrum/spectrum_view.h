@@ -20,6 +20,8 @@ class SpectrumView {
  public:
   SpectrumView(const PanelEnvironment& environment, PanelHost& host, PanelContainer& container);
   ~SpectrumView();
+  SpectrumView(const SpectrumView&) = delete;
+  SpectrumView& operator=(const SpectrumView&) = delete;
 
   // Entry points of the host. Each answers a status: 0 done, -1 unknown operation, -8 unusable parameter.
   std::int32_t vfpOp(std::int32_t hardwareId, std::int16_t operation, const Variant& parameter);
