@@ -57,6 +57,14 @@ void removeTree(Scope scope, const std::wstring& key) {
     throw ComFailure(HRESULT_FROM_WIN32(static_cast<DWORD>(status)));
 }
 
+bool exists(Scope scope, const std::wstring& key) {
+  HKEY opened = nullptr;
+  const std::wstring path = L"Software\\Classes\\" + key;
+  if (RegOpenKeyExW(rootOf(scope), path.c_str(), 0, KEY_READ, &opened) != ERROR_SUCCESS) return false;
+  RegCloseKey(opened);
+  return true;
+}
+
 std::wstring progIdOf(const ClassRow& row) { return std::wstring(L"FrontPanels.") + row.name; }
 
 struct Entry {
@@ -114,13 +122,11 @@ void unregisterLibrary(Scope scope) {
     removeTree(scope, progIdOf(row) + L".1");
     removeTree(scope, progIdOf(row));
   }
-  const HRESULT removed =
-      scope == Scope::Machine
-          ? UnRegisterTypeLib(LIBID_FrontPanels, kMajorVersion, kMinorVersion, LOCALE_NEUTRAL, kSystemKind)
-          : UnRegisterTypeLibForUser(LIBID_FrontPanels, kMajorVersion, kMinorVersion, LOCALE_NEUTRAL,
-                                     kSystemKind);
-  if (FAILED(removed) && removed != TYPE_E_REGISTRYACCESS && removed != TYPE_E_LIBNOTREGISTERED)
-    throw ComFailure(removed);
+  if (!exists(scope, L"TypeLib\\" + textOf(LIBID_FrontPanels))) return;
+  check(scope == Scope::Machine
+            ? UnRegisterTypeLib(LIBID_FrontPanels, kMajorVersion, kMinorVersion, LOCALE_NEUTRAL, kSystemKind)
+            : UnRegisterTypeLibForUser(LIBID_FrontPanels, kMajorVersion, kMinorVersion, LOCALE_NEUTRAL,
+                                       kSystemKind));
 }
 
 }  // namespace frontpanels::activex
