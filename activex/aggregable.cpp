@@ -22,6 +22,7 @@ ULONG Aggregable::Inner::Release() {
   const ULONG left = --references_;
   if (left == 0) {
     references_ = 1;  // whatever the destruction hands out and takes back does not end it a second time
+    owner_.lastRelease();
     delete &owner_;
   }
   return left;

@@ -26,6 +26,8 @@ class Aggregable {
  protected:
   // The pointer that answers for an interface, without a reference; null for one that the object lacks.
   [[nodiscard]] virtual void* findInterface(REFIID id) noexcept = 0;
+  // Called once, before the destruction begins: the object is still whole and may call out.
+  virtual void lastRelease() noexcept {}
 
  private:
   class Inner final : public IUnknown {

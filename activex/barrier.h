@@ -5,7 +5,10 @@
 #include <windows.h>
 
 #include <string>
+#include <type_traits>
+#include <utility>
 
+#include "activex/floating_point.h"
 #include "platform/runtime_error.h"
 
 namespace frontpanels::activex {
@@ -29,6 +32,7 @@ inline void check(HRESULT result) {
 
 template <class Body>
 HRESULT barrier(const IID& source, Body&& body) noexcept {
+  const MaskedFloatingPoint masked;
   try {
     if constexpr (std::is_void_v<decltype(body())>) {
       body();

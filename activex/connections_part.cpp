@@ -72,11 +72,16 @@ HRESULT EventConnectionPoint::EnumConnections(IEnumConnections** connections) {
   });
 }
 
+void EventConnectionPoint::disconnectAll() noexcept {
+  const std::vector<Connection> dropped = std::move(connections_);  // their ends may call back
+  connections_.clear();
+}
+
 // --- The container of connection points
 
 LONG ConnectionsPart::raiseForStatus(DISPID event, std::span<const VARIANT> arguments) {
   LONG answer = 0;
-  if (core().eventsFrozen()) return answer;
+  if (!core().raisesEvents()) return answer;
   const ComPointer<IUnknown> alive(core().outer());
   // A copy: sinks come and go inside an event.
   const std::vector<EventConnectionPoint::Connection> told = events_.connections();

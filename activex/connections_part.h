@@ -24,6 +24,7 @@ class EventConnectionPoint final : public IConnectionPoint {
   };
   [[nodiscard]] const std::vector<Connection>& connections() const noexcept { return connections_; }
   [[nodiscard]] bool connected(DWORD cookie) const noexcept;
+  void disconnectAll() noexcept;
 
   HRESULT STDMETHODCALLTYPE QueryInterface(REFIID id, void** object) override;
   ULONG STDMETHODCALLTYPE AddRef() override { return core_.outer()->AddRef(); }
@@ -45,9 +46,10 @@ class ConnectionsPart final : public ControlPart<IConnectionPointContainer> {
   explicit ConnectionsPart(ControlCore& core) noexcept : ControlPart(core), events_(core) {}
 
   // Raises an event whose last argument is a status that the host answers in. Each sink sees the answer so
-  // far, the last that handles the event decides; 0 when nobody does or while events are frozen. `arguments`
-  // are in the order of the declaration, without the status.
+  // far, the last that handles the event decides; 0 when nobody does or while the control raises none.
+  // `arguments` are in the order of the declaration, without the status.
   [[nodiscard]] LONG raiseForStatus(DISPID event, std::span<const VARIANT> arguments);
+  void disconnectAll() noexcept { events_.disconnectAll(); }
 
   HRESULT STDMETHODCALLTYPE EnumConnectionPoints(IEnumConnectionPoints** points) override;
   HRESULT STDMETHODCALLTYPE FindConnectionPoint(REFIID id, IConnectionPoint** point) override;

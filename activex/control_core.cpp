@@ -2,11 +2,13 @@
 
 #include <olectl.h>
 
+#include "activex/barrier.h"
 #include "activex/class_info_part.h"
 #include "activex/connections_part.h"
 #include "activex/in_place_part.h"
 #include "activex/ole_object_part.h"
 #include "activex/persistence_part.h"
+#include "activex/variants.h"
 #include "activex/view_part.h"
 #include "platform/win32/win32_windowing.h"
 
@@ -51,6 +53,13 @@ ControlCore::ControlCore(IUnknown* outer, const ControlClass& controlClass)
 
 ControlCore::~ControlCore() = default;
 
+// A container that lets go without closing first gets its window back all the same.
+void ControlCore::lastRelease() noexcept {
+  inPlace_->deactivate();
+  connections_->disconnectAll();
+  site_.reset();
+}
+
 void* ControlCore::findPart(REFIID id) noexcept {
   struct Row {
     const IID& id;
@@ -79,7 +88,7 @@ void* ControlCore::findPart(REFIID id) noexcept {
 }
 
 void ControlCore::site(IOleClientSite* site) {
-  if (site == nullptr) inPlace_->deactivate();
+  if (site != site_.get()) inPlace_->deactivate();
   site_ = ComPointer<IOleClientSite>(site);
   readAmbients();
 }
@@ -98,6 +107,35 @@ void ControlCore::readAmbients() {
   VariantClear(&value);
 }
 
+// Some containers answer the control itself: asking it would call us back for ever.
+ComPointer<IDispatch> ControlCore::extender() const {
+  ComPointer<IDispatch> extended;
+  const auto controlSite = site_.query<IOleControlSite>();
+  if (!controlSite || FAILED(controlSite->GetExtendedControl(extended.receive()))) return {};
+  const ComPointer<IUnknown> own = ComPointer<IUnknown>(outer()).query<IUnknown>();
+  if (extended.query<IUnknown>().get() == own.get()) return {};
+  return extended;
+}
+
+bool ControlCore::putExtended(const wchar_t* name, const Variant& value) noexcept {
+  const ComPointer<IUnknown> alive(outer());
+  return barrier([&]() -> HRESULT {
+           const ComPointer<IDispatch> extended = extender();
+           if (!extended) return E_NOTIMPL;
+           std::wstring text = name;
+           LPOLESTR pointer = text.data();
+           DISPID id = DISPID_UNKNOWN;
+           check(extended->GetIDsOfNames(IID_NULL, &pointer, 1, LOCALE_USER_DEFAULT, &id));
+           VARIANT argument = toAutomation(value);
+           DISPID put = DISPID_PROPERTYPUT;
+           DISPPARAMS parameters{&argument, &put, 1, 1};
+           const HRESULT done = extended->Invoke(id, IID_NULL, LOCALE_USER_DEFAULT, DISPATCH_PROPERTYPUT,
+                                                 &parameters, nullptr, nullptr, nullptr);
+           VariantClear(&argument);
+           return done;
+         }) == S_OK;
+}
+
 void ControlCore::extent(SIZEL himetric) {
   extent_ = himetric;
   dirty_ = true;
@@ -108,12 +146,16 @@ void ControlCore::extent(SIZEL himetric) {
 void ControlCore::adoptSize(Size sizePx) {
   if (sizePx.width <= 0 || sizePx.height <= 0 || pixelsOf(extent_) == sizePx) return;
   extent_ = himetricOf(sizePx);
+  dirty_ = true;
 }
 
 void ControlCore::pressed() { inPlace_->activateUi(); }
 
+// Focus that comes by the Tab key makes the control active like a click. A designer has the focus itself.
 void ControlCore::focusChanged(bool focused) {
+  if (!userMode_) return;
   if (const auto controlSite = site_.query<IOleControlSite>()) controlSite->OnFocus(focused);
+  if (focused) inPlace_->activateUi();
 }
 
 void ControlCore::windowDestroyed() noexcept { inPlace_->windowLost(); }

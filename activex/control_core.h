@@ -11,6 +11,7 @@
 
 #include "activex/aggregable.h"
 #include "activex/panel_window.h"
+#include "platform/variant.h"
 #include "platform/win32/com_pointer.h"
 
 namespace frontpanels::activex {
@@ -53,9 +54,12 @@ class ControlCore : public Aggregable, public WindowOwner {
   [[nodiscard]] ViewPart& view() noexcept { return *view_; }
   [[nodiscard]] ConnectionsPart& connections() noexcept { return *connections_; }
   [[nodiscard]] const ComPointer<IOleClientSite>& site() const noexcept { return site_; }
-  // Reads the ambient properties anew; a null site lets go of everything that was the container's.
+  // Reads the ambient properties anew; leaving a site ends the activity in it.
   void site(IOleClientSite* site);
   void readAmbients();
+  // Sets a property of the place that the container keeps for the control: Caption, Visible and the like.
+  // False when the container keeps none, or not this one.
+  bool putExtended(const wchar_t* name, const Variant& value) noexcept;
 
   // Himetric; what the container set is kept as it is.
   [[nodiscard]] SIZEL extent() const noexcept { return extent_; }
@@ -67,7 +71,8 @@ class ControlCore : public Aggregable, public WindowOwner {
   void dirty(bool dirty) noexcept { dirty_ = dirty; }
   // A count: containers nest their freezes.
   void freezeEvents(bool freeze) noexcept { freezes_ += freeze ? 1 : freezes_ > 0 ? -1 : 0; }
-  [[nodiscard]] bool eventsFrozen() const noexcept { return freezes_ > 0; }
+  // Neither while the container holds events back nor in a designer.
+  [[nodiscard]] bool raisesEvents() const noexcept { return freezes_ == 0 && userMode_; }
 
   // What the control stores through the container.
   [[nodiscard]] virtual std::span<const StoredProperty> storedProperties() const = 0;
@@ -87,6 +92,9 @@ class ControlCore : public Aggregable, public WindowOwner {
   [[nodiscard]] void* findPart(REFIID id) noexcept;
 
  private:
+  void lastRelease() noexcept final;
+  [[nodiscard]] ComPointer<IDispatch> extender() const;
+
   const ControlClass& class_;
   SIZEL extent_{};
   PanelWindow window_;

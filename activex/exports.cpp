@@ -24,6 +24,7 @@ extern "C" BOOL WINAPI DllMain(HINSTANCE instance, DWORD reason, void*) {
 extern "C" HRESULT WINAPI DllGetClassObject(REFCLSID classId, REFIID id, void** object) {
   if (object == nullptr) return E_POINTER;
   *object = nullptr;
+  if (!onModuleThread()) return RPC_E_WRONG_THREAD;
   return barrier([&]() -> HRESULT {
     for (const ClassRow& row : classes()) {
       if (*row.id != classId) continue;
@@ -47,6 +48,7 @@ extern "C" HRESULT WINAPI DllUnregisterServer() {
 // "user" registers for the current user alone.
 extern "C" HRESULT WINAPI DllInstall(WINBOOL install, LPCWSTR argument) {
   const bool user = argument != nullptr && _wcsicmp(argument, L"user") == 0;
+  if (!user && argument != nullptr && *argument != L'\0') return E_INVALIDARG;
   const Scope scope = user ? Scope::User : Scope::Machine;
   return barrier([&] { install ? registerLibrary(scope) : unregisterLibrary(scope); });
 }

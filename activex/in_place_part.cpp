@@ -48,6 +48,7 @@ void InPlacePart::enterSite(HWND parent, const RECT* place) {
     throw;
   }
   active_ = true;
+  addBoxOwner(*this);
   core().adoptSize({area.right - area.left, area.bottom - area.top});
   if (core().site()) core().site()->ShowObject();
 }
@@ -56,14 +57,23 @@ void InPlacePart::activateUi() {
   if (!active_ || uiActive_) return;
   uiActive_ = true;
   const ComPointer<IUnknown> alive(core().outer());
-  inPlaceSite_->OnUIActivate();
-  if (!active_) return;  // the container changed its mind on hearing it
-  SetFocus(core().window().window());
-  if (frame_) frame_->SetActiveObject(this, kObjectName);
-  if (document_) document_->SetActiveObject(this, kObjectName);
+  const ComPointer<IOleInPlaceSite> site = inPlaceSite_;  // may close in its answer
+  site->OnUIActivate();
+  // In each answer the container may change its mind.
+  if (active_ && GetFocus() != core().window().window()) SetFocus(core().window().window());
+  if (active_) nameActiveObject(this);
+}
+
+void InPlacePart::nameActiveObject(IOleInPlaceActiveObject* object) {
+  const ComPointer<IOleInPlaceFrame> frame = frame_;
+  const ComPointer<IOleInPlaceUIWindow> document = document_;
+  const wchar_t* const name = object != nullptr ? kObjectName : nullptr;
+  if (frame) frame->SetActiveObject(object, name);
+  if (document) document->SetActiveObject(object, name);
+  if (object == nullptr) return;
   // The control brings no tool bars: whatever room the containers offer for them is theirs.
-  if (frame_) frame_->SetBorderSpace(nullptr);
-  if (document_) document_->SetBorderSpace(nullptr);
+  if (frame) frame->SetBorderSpace(nullptr);
+  if (document) document->SetBorderSpace(nullptr);
 }
 
 void InPlacePart::hide() {
@@ -74,9 +84,9 @@ void InPlacePart::hide() {
 // The state is cleared before the container hears of it: it may call back with anything.
 void InPlacePart::deactivateUi() {
   if (!std::exchange(uiActive_, false)) return;
-  if (document_) document_->SetActiveObject(nullptr, nullptr);
-  if (frame_) frame_->SetActiveObject(nullptr, nullptr);
-  if (inPlaceSite_) inPlaceSite_->OnUIDeactivate(FALSE);
+  const ComPointer<IOleInPlaceSite> site = inPlaceSite_;
+  nameActiveObject(nullptr);
+  if (site) site->OnUIDeactivate(FALSE);
 }
 
 void InPlacePart::deactivate() {
@@ -84,11 +94,21 @@ void InPlacePart::deactivate() {
   const ComPointer<IUnknown> alive(core().outer());
   deactivateUi();
   active_ = false;
+  removeBoxOwner(*this);
   core().window().destroy();
   const ComPointer<IOleInPlaceSite> site = std::exchange(inPlaceSite_, {});
   frame_.reset();
   document_.reset();
   if (site) site->OnInPlaceDeactivate();
+}
+
+void InPlacePart::windowLost() noexcept {
+  active_ = false;
+  removeBoxOwner(*this);
+}
+
+void InPlacePart::enableHost(bool enable) noexcept {
+  if (const ComPointer<IOleInPlaceFrame> frame = frame_) frame->EnableModeless(enable);
 }
 
 HRESULT InPlacePart::GetWindow(HWND* window) {

@@ -2,12 +2,14 @@
 #pragma once
 
 #include "activex/control_core.h"
+#include "activex/message_boxes.h"
 
 namespace frontpanels::activex {
 
-class InPlacePart final : public ControlPart<IOleInPlaceObject, IOleInPlaceActiveObject> {
+class InPlacePart final : public ControlPart<IOleInPlaceObject, IOleInPlaceActiveObject>, private BoxOwner {
  public:
   using ControlPart::ControlPart;
+  ~InPlacePart() override { removeBoxOwner(*this); }
 
   // Makes the control a child window of the container; takes neither focus nor frame. Does nothing when it is
   // one, but shows it again. Raises ComFailure.
@@ -18,7 +20,7 @@ class InPlacePart final : public ControlPart<IOleInPlaceObject, IOleInPlaceActiv
   // Twice does no harm.
   void deactivate();
   // The window went away by itself, with the container's.
-  void windowLost() noexcept { active_ = false; }
+  void windowLost() noexcept;
   [[nodiscard]] bool active() const noexcept { return active_; }
 
   // IOleWindow
@@ -39,6 +41,8 @@ class InPlacePart final : public ControlPart<IOleInPlaceObject, IOleInPlaceActiv
  private:
   void enterSite(HWND parent, const RECT* place);
   void deactivateUi();
+  void nameActiveObject(IOleInPlaceActiveObject* object);
+  void enableHost(bool enable) noexcept override;
 
   ComPointer<IOleInPlaceSite> inPlaceSite_;
   ComPointer<IOleInPlaceFrame> frame_;

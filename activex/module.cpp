@@ -8,6 +8,7 @@ namespace {
 
 HINSTANCE instance = nullptr;
 std::atomic<long> locks = 0;
+std::atomic<DWORD> ownThread = 0;
 
 }  // namespace
 
@@ -23,9 +24,12 @@ std::wstring modulePath() {
   }
 }
 
-void lockModule() noexcept { ++locks; }
+void lockModule() noexcept {
+  if (++locks == 1) ownThread = GetCurrentThreadId();
+}
 void unlockModule() noexcept { --locks; }
 long moduleLocks() noexcept { return locks; }
+bool onModuleThread() noexcept { return locks == 0 || ownThread == GetCurrentThreadId(); }
 
 ModuleLock::ModuleLock() noexcept { lockModule(); }
 ModuleLock::~ModuleLock() { unlockModule(); }

@@ -22,6 +22,9 @@ class ModuleLock {
 void lockModule() noexcept;
 void unlockModule() noexcept;
 [[nodiscard]] long moduleLocks() noexcept;
+// The library's state is kept without locks: while anything of it is in use, all calls belong to the thread
+// that took the first lock.
+[[nodiscard]] bool onModuleThread() noexcept;
 
 // Called by DllMain alone.
 void attachModule(HINSTANCE instance) noexcept;

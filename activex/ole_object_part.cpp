@@ -10,6 +10,7 @@
 namespace frontpanels::activex {
 
 HRESULT OleObjectPart::SetClientSite(IOleClientSite* site) {
+  const ComPointer<IUnknown> alive(core().outer());
   return barrier([&] { core().site(site); });
 }
 
@@ -23,9 +24,11 @@ HRESULT OleObjectPart::GetClientSite(IOleClientSite** site) {
 HRESULT OleObjectPart::Close(DWORD saveOption) {
   const ComPointer<IUnknown> alive(core().outer());
   return barrier([&] {
-    if (saveOption != OLECLOSE_NOSAVE && core().dirty() && core().site()) core().site()->SaveObject();
+    const ComPointer<IOleClientSite> site = core().site();
+    if (saveOption != OLECLOSE_NOSAVE && core().dirty() && site) site->SaveObject();
     core().inPlace().deactivate();
-    if (advises_) advises_->SendOnClose();
+    const ComPointer<IOleAdviseHolder> advises = advises_;
+    if (advises) advises->SendOnClose();
   });
 }
 
@@ -65,6 +68,7 @@ HRESULT OleObjectPart::DoVerb(LONG verb, LPMSG, IOleClientSite*, LONG, HWND pare
     }
     if (static_cast<std::int16_t>(verb & 0xFFFF) < 0) return E_NOTIMPL;
     core().inPlace().activate(parent, place);
+    core().inPlace().activateUi();
     return OLEOBJ_S_INVALIDVERB;
   });
 }

@@ -3,6 +3,8 @@
 
 #include <cstdint>
 
+#include "platform/geometry.h"
+
 namespace frontpanels::activex {
 
 // A press, move or release. Button 1 is left, 2 right, 4 middle; shift has 1 for Shift, 2 for Ctrl, 4 for
@@ -19,6 +21,8 @@ class PanelEvents {
   virtual ~PanelEvents() = default;
 
   virtual void paint() = 0;
+  // What paint covers, in pixels of the view; the rest is background.
+  [[nodiscard]] virtual Rect paintedAreaPx() = 0;
   virtual void resized() = 0;
   virtual void mouseDown(const MouseEvent& event) = 0;
   virtual void mouseMove(const MouseEvent& event) = 0;

@@ -41,7 +41,7 @@ std::int16_t buttonsHeld(WPARAM keys) {
 // address that the module is loaded at keeps a later copy from finding the old one.
 const wchar_t* windowClass(WNDPROC procedure) {
   static wchar_t name[64];
-  static const ATOM registered = [procedure] {
+  static const bool registered = [procedure] {
     std::swprintf(name, std::size(name), L"FrontPanels.Graph.%p", reinterpret_cast<void*>(procedure));
     WNDCLASSEXW description{};
     description.cbSize = sizeof description;
@@ -49,12 +49,10 @@ const wchar_t* windowClass(WNDPROC procedure) {
     description.style = CS_OWNDC | CS_DBLCLKS;
     description.lpfnWndProc = procedure;
     description.hInstance = moduleHandle();
-    description.hbrBackground = reinterpret_cast<HBRUSH>(COLOR_BTNFACE + 1);
     description.lpszClassName = name;
-    return RegisterClassExW(&description);
+    return RegisterClassExW(&description) != 0 || GetLastError() == ERROR_CLASS_ALREADY_EXISTS;
   }();
-  if (registered == 0 && GetLastError() != ERROR_CLASS_ALREADY_EXISTS)
-    throw ComFailure(HRESULT_FROM_WIN32(GetLastError()));
+  if (!registered) throw ComFailure(E_FAIL);
   return name;
 }
 
@@ -219,11 +217,15 @@ LRESULT CALLBACK PanelWindow::windowProcedure(HWND window, UINT message, WPARAM 
 LRESULT PanelWindow::handle(UINT message, WPARAM wParam, LPARAM lParam) {
   for (const ButtonRow& row : kButtons) {
     if (message == row.down || message == row.doubleClick) return press(row.button, lParam), 0;
-    if (message == row.up) return release(row.button, lParam), 0;
+    if (message == row.up) return release(row.button, wParam, lParam), 0;
   }
   switch (message) {
     case WM_PAINT:
       return paint(), 0;
+    case WM_ERASEBKGND:
+      return 1;  // all of the view is painted at once; erasing it before would flicker
+    case WM_PRINTCLIENT:
+      return paintInto(reinterpret_cast<HDC>(wParam)), 0;
     case WM_SIZE:
       if (events_ != nullptr && windowDC_ != nullptr) events_->resized();
       return 0;
@@ -253,10 +255,33 @@ LRESULT PanelWindow::handle(UINT message, WPARAM wParam, LPARAM lParam) {
 
 void PanelWindow::paint() {
   PAINTSTRUCT description;
-  BeginPaint(window_, &description);
+  const HWND painted = window_;
+  const HDC dc = BeginPaint(painted, &description);
   // Also when the panel fails: a window that is not validated asks to be painted for ever.
-  if (events_ != nullptr) barrier([this] { events_->paint(); });
-  EndPaint(window_, &description);
+  barrier([&] {
+    fillMargins(dc);
+    if (events_ != nullptr) events_->paint();
+  });
+  EndPaint(painted, &description);
+}
+
+void PanelWindow::paintInto(HDC dc) {
+  const HDC before = std::exchange(rendering_, dc);
+  barrier([&] {
+    fillMargins(dc);
+    if (events_ != nullptr) events_->paint();
+  });
+  rendering_ = before;
+}
+
+void PanelWindow::fillMargins(HDC dc) {
+  const Size size = clientSizePx();
+  const RECT all{0, 0, size.width, size.height};
+  const Rect graph = events_ != nullptr ? events_->paintedAreaPx() : Rect{};
+  const int saved = SaveDC(dc);
+  ExcludeClipRect(dc, graph.left, graph.top, graph.right, graph.bottom);
+  FillRect(dc, &all, GetSysColorBrush(COLOR_BTNFACE));
+  RestoreDC(dc, saved);
 }
 
 // The capture is taken before the press goes on: a splitter bar takes it in turn and expects to find a window
@@ -268,9 +293,10 @@ void PanelWindow::press(std::int16_t button, LPARAM position) {
   if (events_ != nullptr) events_->mouseDown(mouseEvent(button, position));
 }
 
-void PanelWindow::release(std::int16_t button, LPARAM position) {
+// The capture ends with the last button.
+void PanelWindow::release(std::int16_t button, WPARAM keys, LPARAM position) {
   if (events_ != nullptr && owner_.inUse()) events_->mouseUp(mouseEvent(button, position));
-  if (GetCapture() == window_) ReleaseCapture();
+  if (buttonsHeld(keys) == 0 && window_ != nullptr && GetCapture() == window_) ReleaseCapture();
 }
 
 MouseEvent PanelWindow::mouseEvent(std::int16_t button, LPARAM position) const {

@@ -79,8 +79,10 @@ class PanelWindow final : public GraphView {
   static LRESULT CALLBACK windowProcedure(HWND window, UINT message, WPARAM wParam, LPARAM lParam) noexcept;
   [[nodiscard]] LRESULT handle(UINT message, WPARAM wParam, LPARAM lParam);
   void paint();
+  void paintInto(HDC dc);
+  void fillMargins(HDC dc);
   void press(std::int16_t button, LPARAM position);
-  void release(std::int16_t button, LPARAM position);
+  void release(std::int16_t button, WPARAM keys, LPARAM position);
   [[nodiscard]] MouseEvent mouseEvent(std::int16_t button, LPARAM position) const;
   void showPointer() const;
 

@@ -105,15 +105,24 @@ std::vector<Entry> entriesOf(const ClassRow& row, const std::wstring& path) {
   return entries;
 }
 
-}  // namespace
-
-void registerLibrary(Scope scope) {
+void writeAll(Scope scope) {
   std::wstring path = modulePath();
   for (const ClassRow& row : classes())
     for (const Entry& entry : entriesOf(row, path)) setValue(scope, entry.key, entry.name, entry.value);
   const ComPointer<ITypeLib> library = ownTypeLibrary();
   check(scope == Scope::Machine ? RegisterTypeLib(library.get(), path.data(), nullptr)
                                 : RegisterTypeLibForUser(library.get(), path.data(), nullptr));
+}
+
+}  // namespace
+
+void registerLibrary(Scope scope) {
+  try {
+    writeAll(scope);
+  } catch (...) {
+    barrier([scope] { unregisterLibrary(scope); });
+    throw;
+  }
 }
 
 void unregisterLibrary(Scope scope) {

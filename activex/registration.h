@@ -8,7 +8,8 @@ namespace frontpanels::activex {
 // Per-user registration serves hosts that may not write the machine's part; elevated hosts do not see it.
 enum class Scope { Machine, User };
 
-// Both raise ComFailure. Removing what is not there succeeds.
+// Both raise ComFailure. A registration that fails takes back what it wrote; removing what is not there
+// succeeds.
 void registerLibrary(Scope scope);
 void unregisterLibrary(Scope scope);
 

@@ -2,8 +2,8 @@
 // boxes.
 #pragma once
 
+#include "activex/message_boxes.h"
 #include "platform/data_server.h"
-#include "platform/win32/win32_dialogs.h"
 #include "platform/win32/win32_gdi.h"
 #include "platform/win32/win32_windowing.h"
 
@@ -12,7 +12,7 @@ namespace frontpanels::activex {
 struct Services {
   Win32Gdi gdi;
   Win32Windowing windowing;
-  Win32Dialogs dialogs;
+  MessageBoxes dialogs;
   DataHub hub;
 };
 // Made with the first object that needs it; connects the error reporter to message boxes.

@@ -5,6 +5,7 @@
 #include "activex/services.h"
 #include "activex/variants.h"
 #include "framework/panel/base_vfp.h"
+#include "framework/support/numeric.h"
 #include "platform/win32/utf16.h"
 
 namespace frontpanels::activex {
@@ -135,6 +136,13 @@ std::int32_t SpectrumControl::frontPanelOp(std::int32_t hwId, std::int32_t vfpId
   const LONG status = connections().raiseForStatus(kFrontPanelOpEvent, arguments);
   VariantClear(&arguments[3]);
   return static_cast<std::int32_t>(status);
+}
+
+Rect SpectrumControl::paintedAreaPx() {
+  const PanelArea& area = panel_->base().traceManager().drawingAreaPx();
+  const std::int32_t left = toInt32(area.left);
+  const std::int32_t top = toInt32(area.top);
+  return {left, top, left + toInt32(area.width), top + toInt32(area.height)};
 }
 
 // --- Stored properties

@@ -49,6 +49,7 @@ class SpectrumControl final : public Dispatching<SpectrumControlBase, ISpectrumV
 
   // PanelEvents
   void paint() override { panel_->Paint(); }
+  Rect paintedAreaPx() override;
   void resized() override { panel_->Form_Resize(); }
   void mouseDown(const MouseEvent& e) override { panel_->MouseDown(e.button, e.shift, e.xTwips, e.yTwips); }
   void mouseMove(const MouseEvent& e) override { panel_->MouseMove(e.button, e.shift, e.xTwips, e.yTwips); }
@@ -58,11 +59,10 @@ class SpectrumControl final : public Dispatching<SpectrumControlBase, ISpectrumV
   // PanelHost
   std::int32_t frontPanelOp(std::int32_t hwId, std::int32_t vfpId, std::int16_t operation,
                             const Variant& argument) override;
-  // PanelContainer: the panel's caption and state are the container's to show once it has an extender;
-  // visibility goes through the view.
-  void caption(std::string_view) override {}
-  void visible(bool) override {}
-  void viewState(std::int16_t) override {}
+  // PanelContainer: a container that keeps no such property goes without.
+  void caption(std::string_view text) override { putExtended(L"Caption", std::string(text)); }
+  void visible(bool visible) override { putExtended(L"Visible", visible); }
+  void viewState(std::int16_t state) override { putExtended(L"ViewState", state); }
 
   // Stored properties
   std::span<const StoredProperty> storedProperties() const override;
