@@ -3,7 +3,7 @@
 #include "bench/paint_traces_scene.h"
 #include "platform/raster/raster_gdi.h"
 
-int main() {
+int main(int argc, char** argv) {
   using namespace frontpanels;
   RasterGdi gdi;
   const DcHandle view = gdi.createScreen(bench::kScenePx);
@@ -16,5 +16,5 @@ int main() {
     }
     return copy;
   };
-  return bench::reportPaintTraces(gdi, view, readPixels) ? 0 : 1;
+  return bench::reportPaintTraces(gdi, view, readPixels, bench::roundsFrom(argc, argv)) ? 0 : 1;
 }

@@ -10,8 +10,8 @@
 namespace frontpanels::bench {
 namespace {
 
-constexpr int kRounds = 41;
-constexpr int kFramesARound = 50;
+// Short stretches in turn: what else the machine does falls on both alike.
+constexpr int kFramesARound = 10;
 
 template <class Draw>
 double microsecondsAFrame(Draw draw) {
@@ -35,7 +35,7 @@ bool samePicture(PaintTracesScene& scene, const ReadPixels& readPixels) {
 
 }  // namespace
 
-bool reportPaintTraces(Gdi& gdi, DcHandle view, const ReadPixels& readPixels) {
+bool reportPaintTraces(Gdi& gdi, DcHandle view, const ReadPixels& readPixels, int rounds) {
   bool same = true;
   std::printf("%-10s %12s %12s %8s %12s\n", "T x P", "panel, us", "bare, us", "ratio", "allocations");
   for (const SceneSize& size : kSceneSizes) {
@@ -49,7 +49,7 @@ bool reportPaintTraces(Gdi& gdi, DcHandle view, const ReadPixels& readPixels) {
     std::vector<double> bare;
     std::vector<double> ratio;
     std::uint64_t allocations = 0;
-    for (int round = 0; round < kRounds; ++round) {
+    for (int round = 0; round < rounds; ++round) {
       const std::uint64_t before = allocationCount();
       panel.push_back(microsecondsAFrame([&] { scene.drawPanel(); }));
       allocations = allocationCount() - before;

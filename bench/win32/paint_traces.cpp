@@ -5,7 +5,7 @@
 #include "bench/paint_traces_scene.h"
 #include "platform/win32/win32_gdi.h"
 
-int main() {
+int main(int argc, char** argv) {
   using namespace frontpanels;
   BITMAPINFO info{};
   info.bmiHeader.biSize = sizeof info.bmiHeader;
@@ -24,7 +24,8 @@ int main() {
     return std::vector<std::uint32_t>(first, first + bench::kScenePx.width * bench::kScenePx.height);
   };
   Win32Gdi gdi;
-  const bool same = bench::reportPaintTraces(gdi, DcHandle{reinterpret_cast<std::uintptr_t>(dc)}, readPixels);
+  const bool same = bench::reportPaintTraces(gdi, DcHandle{reinterpret_cast<std::uintptr_t>(dc)}, readPixels,
+                                             bench::roundsFrom(argc, argv));
   SelectObject(dc, previous);
   DeleteObject(bitmap);
   DeleteDC(dc);
