@@ -12,12 +12,12 @@ namespace frontpanels::activex {
 
 // --- The connection point
 
-bool EventConnectionPoint::connected(DWORD cookie) const noexcept {
+bool ControlConnectionPoint::connected(DWORD cookie) const noexcept {
   return std::any_of(connections_.begin(), connections_.end(),
                      [cookie](const Connection& connection) { return connection.cookie == cookie; });
 }
 
-HRESULT EventConnectionPoint::QueryInterface(REFIID id, void** object) {
+HRESULT ControlConnectionPoint::QueryInterface(REFIID id, void** object) {
   if (object == nullptr) return E_POINTER;
   *object = id == IID_IUnknown || id == IID_IConnectionPoint ? static_cast<IConnectionPoint*>(this) : nullptr;
   if (*object == nullptr) return E_NOINTERFACE;
@@ -25,33 +25,34 @@ HRESULT EventConnectionPoint::QueryInterface(REFIID id, void** object) {
   return S_OK;
 }
 
-HRESULT EventConnectionPoint::GetConnectionInterface(IID* id) {
+HRESULT ControlConnectionPoint::GetConnectionInterface(IID* id) {
   if (id == nullptr) return E_POINTER;
-  *id = *core_.controlClass().eventInterface;
+  *id = id_;
   return S_OK;
 }
 
-HRESULT EventConnectionPoint::GetConnectionPointContainer(IConnectionPointContainer** container) {
+HRESULT ControlConnectionPoint::GetConnectionPointContainer(IConnectionPointContainer** container) {
   if (container == nullptr) return E_POINTER;
   return core_.outer()->QueryInterface(IID_IConnectionPointContainer, reinterpret_cast<void**>(container));
 }
 
-// A sink answers for the event interface, or for plain dispatch only.
-HRESULT EventConnectionPoint::Advise(IUnknown* sink, DWORD* cookie) {
+// A sink of events answers for their interface, or for plain dispatch only.
+HRESULT ControlConnectionPoint::Advise(IUnknown* sink, DWORD* cookie) {
   if (sink == nullptr || cookie == nullptr) return E_POINTER;
   *cookie = 0;
-  ComPointer<IDispatch> events;
-  if (FAILED(sink->QueryInterface(*core_.controlClass().eventInterface,
-                                  reinterpret_cast<void**>(events.receive()))) &&
-      FAILED(sink->QueryInterface(IID_IDispatch, reinterpret_cast<void**>(events.receive()))))
+  ComPointer<IUnknown> joined;
+  const auto place = reinterpret_cast<void**>(joined.receive());
+  const bool events = id_ == *core_.controlClass().eventInterface;
+  if (FAILED(sink->QueryInterface(id_, place)) &&
+      (!events || FAILED(sink->QueryInterface(IID_IDispatch, place))))
     return CONNECT_E_CANNOTCONNECT;
   return barrier([&] {
-    connections_.push_back({lastCookie_ + 1, std::move(events)});
+    connections_.push_back({lastCookie_ + 1, std::move(joined)});
     *cookie = ++lastCookie_;
   });
 }
 
-HRESULT EventConnectionPoint::Unadvise(DWORD cookie) {
+HRESULT ControlConnectionPoint::Unadvise(DWORD cookie) {
   const auto found =
       std::find_if(connections_.begin(), connections_.end(),
                    [cookie](const Connection& connection) { return connection.cookie == cookie; });
@@ -61,7 +62,7 @@ HRESULT EventConnectionPoint::Unadvise(DWORD cookie) {
   return S_OK;
 }
 
-HRESULT EventConnectionPoint::EnumConnections(IEnumConnections** connections) {
+HRESULT ControlConnectionPoint::EnumConnections(IEnumConnections** connections) {
   if (connections == nullptr) return E_POINTER;
   *connections = nullptr;
   return barrier([&] {
@@ -72,7 +73,7 @@ HRESULT EventConnectionPoint::EnumConnections(IEnumConnections** connections) {
   });
 }
 
-void EventConnectionPoint::disconnectAll() noexcept {
+void ControlConnectionPoint::disconnectAll() noexcept {
   const std::vector<Connection> dropped = std::move(connections_);  // their ends may call back
   connections_.clear();
 }
@@ -84,8 +85,8 @@ LONG ConnectionsPart::raiseForStatus(DISPID event, std::span<const VARIANT> argu
   if (!core().raisesEvents()) return answer;
   const ComPointer<IUnknown> alive(core().outer());
   // A copy: sinks come and go inside an event.
-  const std::vector<EventConnectionPoint::Connection> told = events_.connections();
-  for (const EventConnectionPoint::Connection& connection : told) {
+  const std::vector<ControlConnectionPoint::Connection> told = events_.connections();
+  for (const ControlConnectionPoint::Connection& connection : told) {
     if (!events_.connected(connection.cookie)) continue;
     LONG cell = answer;
     std::vector<VARIANT> reversed(1);
@@ -95,12 +96,26 @@ LONG ConnectionsPart::raiseForStatus(DISPID event, std::span<const VARIANT> argu
     DISPPARAMS parameters{reversed.data(), nullptr, static_cast<UINT>(reversed.size()), 0};
     VARIANT result;
     VariantInit(&result);
-    const HRESULT handled = connection.sink->Invoke(event, IID_NULL, LOCALE_USER_DEFAULT, DISPATCH_METHOD,
-                                                    &parameters, &result, nullptr, nullptr);
+    const HRESULT handled = static_cast<IDispatch*>(connection.sink.get())
+                                ->Invoke(event, IID_NULL, LOCALE_USER_DEFAULT, DISPATCH_METHOD, &parameters,
+                                         &result, nullptr, nullptr);
     VariantClear(&result);
     if (SUCCEEDED(handled)) answer = cell;
   }
   return answer;
+}
+
+void ConnectionsPart::notifyChanged(DISPID property) {
+  const ComPointer<IUnknown> alive(core().outer());
+  const std::vector<ControlConnectionPoint::Connection> told = changes_.connections();
+  for (const ControlConnectionPoint::Connection& connection : told)
+    if (changes_.connected(connection.cookie))
+      static_cast<IPropertyNotifySink*>(connection.sink.get())->OnChanged(property);
+}
+
+void ConnectionsPart::disconnectAll() noexcept {
+  events_.disconnectAll();
+  changes_.disconnectAll();
 }
 
 HRESULT ConnectionsPart::EnumConnectionPoints(IEnumConnectionPoints** points) {
@@ -109,6 +124,7 @@ HRESULT ConnectionsPart::EnumConnectionPoints(IEnumConnectionPoints** points) {
   return barrier([&] {
     std::vector<ComPointer<IConnectionPoint>> items;
     items.emplace_back(&events_);
+    items.emplace_back(&changes_);
     *points = new ConnectionPointEnumerator(std::move(items));
   });
 }
@@ -116,10 +132,9 @@ HRESULT ConnectionsPart::EnumConnectionPoints(IEnumConnectionPoints** points) {
 HRESULT ConnectionsPart::FindConnectionPoint(REFIID id, IConnectionPoint** point) {
   if (point == nullptr) return E_POINTER;
   *point = nullptr;
-  if (id != *core().controlClass().eventInterface) return CONNECT_E_NOCONNECTION;
-  *point = &events_;
-  events_.AddRef();
-  return S_OK;
+  for (ControlConnectionPoint* const candidate : {&events_, &changes_})
+    if (candidate->id() == id) *point = ComPointer<IConnectionPoint>(candidate).detach();
+  return *point != nullptr ? S_OK : CONNECT_E_NOCONNECTION;
 }
 
 }  // namespace frontpanels::activex

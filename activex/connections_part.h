@@ -1,5 +1,5 @@
-// IConnectionPointContainer and the connection point of the control's events. Events are raised at once: a
-// host answers some of them through an argument.
+// IConnectionPointContainer and the connection points: the control's events, and changes of its properties.
+// Events are raised at once: a host answers some of them through an argument.
 #pragma once
 
 #include <ocidl.h>
@@ -13,14 +13,15 @@
 namespace frontpanels::activex {
 
 // An object of its own, which shares the life of the control.
-class EventConnectionPoint final : public IConnectionPoint {
+class ControlConnectionPoint final : public IConnectionPoint {
  public:
-  explicit EventConnectionPoint(ControlCore& core) noexcept : core_(core) {}
-  virtual ~EventConnectionPoint() = default;
+  ControlConnectionPoint(ControlCore& core, const IID& id) noexcept : core_(core), id_(id) {}
+  virtual ~ControlConnectionPoint() = default;
+  [[nodiscard]] const IID& id() const noexcept { return id_; }
 
   struct Connection {
-    DWORD cookie = 0;  // never used twice
-    ComPointer<IDispatch> sink;
+    DWORD cookie = 0;           // never used twice
+    ComPointer<IUnknown> sink;  // the outgoing interface itself, or IDispatch in its place
   };
   [[nodiscard]] const std::vector<Connection>& connections() const noexcept { return connections_; }
   [[nodiscard]] bool connected(DWORD cookie) const noexcept;
@@ -37,25 +38,31 @@ class EventConnectionPoint final : public IConnectionPoint {
 
  private:
   ControlCore& core_;
+  const IID& id_;
   std::vector<Connection> connections_;
   DWORD lastCookie_ = 0;
 };
 
 class ConnectionsPart final : public ControlPart<IConnectionPointContainer> {
  public:
-  explicit ConnectionsPart(ControlCore& core) noexcept : ControlPart(core), events_(core) {}
+  explicit ConnectionsPart(ControlCore& core) noexcept
+      : ControlPart(core),
+        events_(core, *core.controlClass().eventInterface),
+        changes_(core, IID_IPropertyNotifySink) {}
 
   // Raises an event whose last argument is a status that the host answers in. Each sink sees the answer so
   // far, the last that handles the event decides; 0 when nobody does or while the control raises none.
   // `arguments` are in the order of the declaration, without the status.
   [[nodiscard]] LONG raiseForStatus(DISPID event, std::span<const VARIANT> arguments);
-  void disconnectAll() noexcept { events_.disconnectAll(); }
+  void notifyChanged(DISPID property);
+  void disconnectAll() noexcept;
 
   HRESULT STDMETHODCALLTYPE EnumConnectionPoints(IEnumConnectionPoints** points) override;
   HRESULT STDMETHODCALLTYPE FindConnectionPoint(REFIID id, IConnectionPoint** point) override;
 
  private:
-  EventConnectionPoint events_;
+  ControlConnectionPoint events_;
+  ControlConnectionPoint changes_;
 };
 
 }  // namespace frontpanels::activex

@@ -6,7 +6,13 @@
 namespace frontpanels::activex {
 
 HRESULT DataHubObject::Publish(BSTR path, VARIANT values) {
-  return barrier(IID_IDataHub, [&] { services().hub.publish(fromBstr(path), fromAutomation(values)); });
+  return barrier(IID_IDataHub, [&] {
+    const std::string name = fromBstr(path);
+    DataHub& hub = services().hub;
+    // A sweep of singles goes through without an array of its own.
+    if (!withSingles(values, [&](std::span<const float> singles) { hub.publish(name, singles); }))
+      hub.publish(name, fromAutomation(values));
+  });
 }
 
 HRESULT DataHubObject::ItemCount(BSTR path, LONG* count) {

@@ -38,11 +38,14 @@ class Dispatching : public Base {
       (*info)->AddRef();
     });
   }
-  HRESULT STDMETHODCALLTYPE GetIDsOfNames(REFIID, LPOLESTR* names, UINT count, LCID, DISPID* ids) override {
+  HRESULT STDMETHODCALLTYPE GetIDsOfNames(REFIID reserved, LPOLESTR* names, UINT count, LCID,
+                                          DISPID* ids) override {
+    if (reserved != IID_NULL) return DISP_E_UNKNOWNINTERFACE;
     return barrier([&] { return typeInfo()->GetIDsOfNames(names, count, ids); });
   }
-  HRESULT STDMETHODCALLTYPE Invoke(DISPID member, REFIID, LCID, WORD flags, DISPPARAMS* parameters,
+  HRESULT STDMETHODCALLTYPE Invoke(DISPID member, REFIID reserved, LCID, WORD flags, DISPPARAMS* parameters,
                                    VARIANT* result, EXCEPINFO* exception, UINT* badArgument) override {
+    if (reserved != IID_NULL) return DISP_E_UNKNOWNINTERFACE;
     // The host may let go of the object inside the member that it calls.
     const ComPointer<IUnknown> alive(this->outer());
     return barrier([&] {

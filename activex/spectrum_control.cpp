@@ -4,6 +4,7 @@
 #include "activex/picture_file.h"
 #include "activex/services.h"
 #include "activex/variants.h"
+#include "activex/view_part.h"
 #include "framework/panel/base_vfp.h"
 #include "framework/support/numeric.h"
 #include "platform/win32/utf16.h"
@@ -14,10 +15,19 @@ namespace {
 constexpr ControlClass kClass{&CLSID_SpectrumView, &IID_ISpectrumView, &DIID__ISpectrumViewEvents,
                               L"Front Panels SpectrumView"};
 constexpr DISPID kFrontPanelOpEvent = 1;
-constexpr short kTwipsScale = 1;
 
 enum Stored : std::size_t { kDisplayPanelVisible, kMeasurementPanelVisible };
 constexpr StoredProperty kStored[] = {{L"DisplayPanelVisible", true}, {L"MeasurementPanelVisible", true}};
+
+constexpr DISPID kStoredIds[] = {26, 27};
+
+VARIANT_BOOL variantBool(bool value) noexcept { return value ? VARIANT_TRUE : VARIANT_FALSE; }
+
+// Handles of the system have 32 significant bits in either width.
+template <class Tag>
+LONG numberOf(Handle<Tag> handle) noexcept {
+  return static_cast<LONG>(static_cast<LONG_PTR>(handle.value));
+}
 
 std::string commandLine() { return toUtf8(GetCommandLineW()); }
 
@@ -88,30 +98,130 @@ HRESULT SpectrumControl::SavePicture(BSTR path) {
   });
 }
 
-HRESULT SpectrumControl::get_ViewScaleWidth(float* twips) {
-  return give(twips, [&] {
-    return static_cast<float>(window().clientSizePx().width) * readScreenMetrics().twipsPerPixelX;
+HRESULT SpectrumControl::put_Caption(BSTR text) {
+  return barrier(IID_ISpectrumView, [&] { panel_->base().Caption(fromBstr(text)); });
+}
+
+HRESULT SpectrumControl::get_DisplayPanelVisible(VARIANT_BOOL* visible) {
+  return give(visible, [&] { return variantBool(storedValue(kDisplayPanelVisible)); });
+}
+
+HRESULT SpectrumControl::put_DisplayPanelVisible(VARIANT_BOOL visible) {
+  return change(kDisplayPanelVisible, visible);
+}
+
+HRESULT SpectrumControl::get_MeasurementPanelVisible(VARIANT_BOOL* visible) {
+  return give(visible, [&] { return variantBool(storedValue(kMeasurementPanelVisible)); });
+}
+
+HRESULT SpectrumControl::put_MeasurementPanelVisible(VARIANT_BOOL visible) {
+  return change(kMeasurementPanelVisible, visible);
+}
+
+HRESULT SpectrumControl::change(std::size_t property, VARIANT_BOOL value) {
+  const ComPointer<IUnknown> alive(outer());
+  return barrier(IID_ISpectrumView, [&] {
+    storedValue(property, value != VARIANT_FALSE);
+    dirty(true);
+    view().changed();
+    connections().notifyChanged(kStoredIds[property]);
   });
+}
+
+HRESULT SpectrumControl::closeVfp() {
+  const ComPointer<IUnknown> alive(outer());
+  return barrier(IID_ISpectrumView, [&] { panel_->base().closeVfp(); });
+}
+
+HRESULT SpectrumControl::refreshControls() {
+  return barrier(IID_ISpectrumView, [&] { panel_->control().refreshControls(); });
+}
+
+// --- The surface that the graph is drawn on
+
+HRESULT SpectrumControl::get_ViewScaleLeft(float* twips) {
+  return give(twips, [&] { return panel_->control().ViewScaleLeft(); });
+}
+
+HRESULT SpectrumControl::get_ViewScaleTop(float* twips) {
+  return give(twips, [&] { return panel_->control().ViewScaleTop(); });
+}
+
+HRESULT SpectrumControl::get_ViewScaleWidth(float* twips) {
+  return give(twips, [&] { return panel_->control().ViewScaleWidth(); });
 }
 
 HRESULT SpectrumControl::get_ViewScaleHeight(float* twips) {
-  return give(twips, [&] {
-    return static_cast<float>(window().clientSizePx().height) * readScreenMetrics().twipsPerPixelY;
-  });
+  return give(twips, [&] { return panel_->control().ViewScaleHeight(); });
+}
+
+HRESULT SpectrumControl::get_ViewUsableScaleWidth(float* twips) {
+  return give(twips, [&] { return panel_->control().ViewUseableScaleWidth(); });
+}
+
+HRESULT SpectrumControl::get_ViewUsableScaleHeight(float* twips) {
+  return give(twips, [&] { return panel_->control().ViewUseableScaleHeight(); });
 }
 
 HRESULT SpectrumControl::get_ViewScaleMode(short* mode) {
-  return give(mode, [] { return kTwipsScale; });
+  return give(mode, [&] { return static_cast<short>(panel_->control().ViewScaleMode()); });
 }
 
-// A window handle has 32 significant bits in either width.
 HRESULT SpectrumControl::get_ViewHWnd(LONG* windowHandle) {
-  return give(windowHandle, [&] { return static_cast<LONG>(reinterpret_cast<LONG_PTR>(window().window())); });
+  return give(windowHandle, [&] { return numberOf(panel_->control().ViewHWnd()); });
+}
+
+HRESULT SpectrumControl::get_ViewHDC(LONG* dc) {
+  return give(dc, [&] { return numberOf(panel_->control().ViewHDC()); });
+}
+
+HRESULT SpectrumControl::get_ViewDrawMode(short* mode) {
+  return give(mode, [&] { return static_cast<short>(panel_->control().ViewDrawMode()); });
+}
+
+HRESULT SpectrumControl::put_ViewDrawMode(short mode) {
+  return barrier(IID_ISpectrumView, [&] { panel_->control().ViewDrawMode(static_cast<DrawMode>(mode)); });
+}
+
+HRESULT SpectrumControl::get_ViewDrawStyle(short* style) {
+  return give(style, [&] { return static_cast<short>(panel_->control().ViewDrawStyle()); });
+}
+
+HRESULT SpectrumControl::put_ViewDrawStyle(short style) {
+  return barrier(IID_ISpectrumView, [&] { panel_->control().ViewDrawStyle(static_cast<PenStyle>(style)); });
+}
+
+HRESULT SpectrumControl::get_ViewDrawWidth(short* widthPx) {
+  return give(widthPx, [&] { return panel_->control().ViewDrawWidth(); });
+}
+
+HRESULT SpectrumControl::get_ViewMousePointer(short* pointer) {
+  return give(pointer, [&] { return static_cast<short>(panel_->control().ViewMousePointer()); });
+}
+
+HRESULT SpectrumControl::put_ViewMousePointer(short pointer) {
+  return barrier(IID_ISpectrumView,
+                 [&] { panel_->control().ViewMousePointer(static_cast<MousePointer>(pointer)); });
+}
+
+HRESULT SpectrumControl::get_ViewState(short* state) {
+  return give(state, [&] { return panel_->control().winState(); });
+}
+
+HRESULT SpectrumControl::put_ViewState(short state) {
+  return barrier(IID_ISpectrumView, [&] { panel_->control().ViewState(state); });
 }
 
 HRESULT SpectrumControl::get_ViewVisible(VARIANT_BOOL* visible) {
-  return give(visible,
-              [&] { return static_cast<VARIANT_BOOL>(window().visible() ? VARIANT_TRUE : VARIANT_FALSE); });
+  return give(visible, [&] { return variantBool(window().visible()); });
+}
+
+HRESULT SpectrumControl::put_ViewVisible(VARIANT_BOOL visible) {
+  return barrier(IID_ISpectrumView, [&] { panel_->control().ViewVisible(visible != VARIANT_FALSE); });
+}
+
+HRESULT SpectrumControl::ViewRefresh() {
+  return barrier(IID_ISpectrumView, [&] { panel_->control().ViewRefresh(); });
 }
 
 HRESULT SpectrumControl::Refresh() {

@@ -46,6 +46,30 @@ class SpectrumControl final : public Dispatching<SpectrumControlBase, ISpectrumV
   HRESULT STDMETHODCALLTYPE get_ViewHWnd(LONG* window) override;
   HRESULT STDMETHODCALLTYPE get_ViewVisible(VARIANT_BOOL* visible) override;
   HRESULT STDMETHODCALLTYPE Refresh() override;
+  HRESULT STDMETHODCALLTYPE put_Caption(BSTR text) override;
+  HRESULT STDMETHODCALLTYPE put_ViewVisible(VARIANT_BOOL visible) override;
+  HRESULT STDMETHODCALLTYPE get_ViewHDC(LONG* dc) override;
+  HRESULT STDMETHODCALLTYPE get_ViewScaleLeft(float* twips) override;
+  HRESULT STDMETHODCALLTYPE get_ViewScaleTop(float* twips) override;
+  HRESULT STDMETHODCALLTYPE get_ViewUsableScaleWidth(float* twips) override;
+  HRESULT STDMETHODCALLTYPE get_ViewUsableScaleHeight(float* twips) override;
+  HRESULT STDMETHODCALLTYPE get_ViewDrawMode(short* mode) override;
+  HRESULT STDMETHODCALLTYPE put_ViewDrawMode(short mode) override;
+  HRESULT STDMETHODCALLTYPE get_ViewDrawStyle(short* style) override;
+  HRESULT STDMETHODCALLTYPE put_ViewDrawStyle(short style) override;
+  HRESULT STDMETHODCALLTYPE get_ViewDrawWidth(short* widthPx) override;
+  HRESULT STDMETHODCALLTYPE get_ViewMousePointer(short* pointer) override;
+  HRESULT STDMETHODCALLTYPE put_ViewMousePointer(short pointer) override;
+  HRESULT STDMETHODCALLTYPE get_ViewState(short* state) override;
+  HRESULT STDMETHODCALLTYPE put_ViewState(short state) override;
+  HRESULT STDMETHODCALLTYPE ViewRefresh() override;
+  HRESULT STDMETHODCALLTYPE get_DisplayPanelVisible(VARIANT_BOOL* visible) override;
+  HRESULT STDMETHODCALLTYPE put_DisplayPanelVisible(VARIANT_BOOL visible) override;
+  HRESULT STDMETHODCALLTYPE get_MeasurementPanelVisible(VARIANT_BOOL* visible) override;
+  HRESULT STDMETHODCALLTYPE put_MeasurementPanelVisible(VARIANT_BOOL visible) override;
+  HRESULT STDMETHODCALLTYPE closeVfp() override;
+  HRESULT STDMETHODCALLTYPE refreshControls() override;
+  HRESULT STDMETHODCALLTYPE get_hWnd(LONG* window) override { return get_ViewHWnd(window); }
 
   // PanelEvents
   void paint() override { panel_->Paint(); }
@@ -71,6 +95,7 @@ class SpectrumControl final : public Dispatching<SpectrumControlBase, ISpectrumV
 
  private:
   [[nodiscard]] void* findInterface(REFIID id) noexcept override;
+  HRESULT change(std::size_t property, VARIANT_BOOL value);
 
   std::optional<SpectrumView> panel_;
 };

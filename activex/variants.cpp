@@ -61,6 +61,8 @@ Variant::Variants elementsOf(const LockedArray& array, SAFEARRAY* source, VARTYP
   return elements;
 }
 
+bool isReferenceToVariant(const VARIANT& value) noexcept { return V_VT(&value) == (VT_BYREF | VT_VARIANT); }
+
 Variant fromArray(SAFEARRAY* source, VARTYPE type) {
   const LockedArray array(source);
   switch (type) {
@@ -147,6 +149,9 @@ struct ToAutomation {
 }  // namespace
 
 Variant fromAutomation(const VARIANT& value) {
+  if (isReferenceToVariant(value)) return fromAutomation(*V_VARIANTREF(&value));
+  if (V_VT(&value) == (VT_BYREF | VT_ARRAY | (V_VT(&value) & VT_TYPEMASK)))
+    return fromArray(*V_ARRAYREF(&value), static_cast<VARTYPE>(V_VT(&value) & VT_TYPEMASK));
   if ((V_VT(&value) & VT_BYREF) != 0) {
     OwnedVariant followed;
     if (FAILED(VariantCopyInd(&followed.value, const_cast<VARIANT*>(&value)))) raiseTypeMismatch();
@@ -184,6 +189,14 @@ Variant fromAutomation(const VARIANT& value) {
     default:
       return fromOtherNumber(value);
   }
+}
+
+bool withSingles(const VARIANT& value, const std::function<void(std::span<const float>)>& body) {
+  if (isReferenceToVariant(value)) return withSingles(*V_VARIANTREF(&value), body);
+  if ((V_VT(&value) & ~VT_BYREF) != (VT_ARRAY | VT_R4)) return false;
+  const LockedArray array((V_VT(&value) & VT_BYREF) != 0 ? *V_ARRAYREF(&value) : V_ARRAY(&value));
+  body({&array.at<float>(0), array.count()});
+  return true;
 }
 
 VARIANT toAutomation(const Variant& value) {

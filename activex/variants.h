@@ -3,6 +3,8 @@
 
 #include <oaidl.h>
 
+#include <functional>
+#include <span>
 #include <string>
 #include <string_view>
 
@@ -14,6 +16,8 @@ namespace frontpanels::activex {
 // the panels know; other element types arrive as arrays of variants. Raises "Type mismatch" for what has no
 // counterpart and "Out of memory".
 [[nodiscard]] Variant fromAutomation(const VARIANT& value);
+// A view of an array of singles where it lies. False, without a call, for any other value.
+bool withSingles(const VARIANT& value, const std::function<void(std::span<const float>)>& body);
 // A new value that the caller clears. Raises "Out of memory".
 [[nodiscard]] VARIANT toAutomation(const Variant& value);
 

@@ -347,6 +347,7 @@ void SpectrumView::addMarker() { implementation_->addMarker(); }
 void SpectrumView::markerToMax() { base().traceManager().markerToMax(); }
 void SpectrumView::markerToMin() { base().traceManager().markerToMin(); }
 clsBaseVFP& SpectrumView::base() { return implementation_->base(); }
+PanelControl& SpectrumView::control() { return *implementation_; }
 const FrequencyPlan& SpectrumView::frequencyPlan() const { return implementation_->plan(); }
 
 }  // namespace frontpanels

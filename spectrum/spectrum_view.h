@@ -15,6 +15,7 @@ namespace frontpanels {
 
 class clsBaseVFP;
 class FrequencyPlan;
+class PanelControl;
 
 class SpectrumView {
  public:
@@ -46,6 +47,7 @@ class SpectrumView {
   // The parts behind the panel. They live as long as it does.
   [[nodiscard]] clsBaseVFP& base();
   [[nodiscard]] const FrequencyPlan& frequencyPlan() const;
+  [[nodiscard]] PanelControl& control();  // with the surface that the graph is drawn on
 
   static constexpr const char* kTypeName = "SpectrumView";
   static constexpr const char* kSpectrumPath = "Brantor Scanner/Spectrum/Spectrum Trace";

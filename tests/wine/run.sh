@@ -47,6 +47,15 @@ script() {
   judge $? "$1 ran to its end"
 }
 
+# program NAME EXECUTABLE ARGUMENTS...: a program that prints its checks and counts them.
+program() {
+  local name=$1 file=$2
+  shift 2
+  timeout 300 wine "$root/build/win64/tests/wine/$file.exe" "$@" 2>&1 </dev/null | tr -d '\r' >"$out/$name.log"
+  grep -E '^(ok|not ok) ' "$out/$name.log"
+  count "$out/$name.log" "$name"
+}
+
 unit_tests() {
   timeout 300 wine "$root/build/win64/tests/wine/cross_tests.exe" --gtest_brief=1 >"$out/cross_tests.txt" 2>&1
   judge $? "unit tests against the Windows run-time library ($(grep -oE '[0-9]+ tests from' "$out/cross_tests.txt" | head -n 1 | cut -d' ' -f1))"
@@ -90,10 +99,9 @@ for name in SpectrumView SpectrumView.1 DataHub DataHub.1 Diagnostics Diagnostic
   judge $? "FrontPanels.$name is in the registry"
 done
 script late_bound.vbs
-timeout 300 wine "$root/build/win64/tests/wine/container_test.exe" "$(windows_path "$out")" >"$out/container.txt" 2>&1
-tr -d '\r' <"$out/container.txt" >"$out/container.log"
-grep -E '^(ok|not ok) ' "$out/container.log"
-count "$out/container.log" "the container's test"
+program container container_test "$(windows_path "$out")"
+program contract contract_test
+program foreign_container contract_test atl atl.dll
 if [ -f "$here/workbench.sh" ]; then
   bash "$here/workbench.sh" >"$out/workbench.txt" 2>&1
   grep -E '^(ok|not ok) ' "$out/workbench.txt"

@@ -1,0 +1,85 @@
+#include "tests/wine/com_client.h"
+
+#include <cstdio>
+#include <cstring>
+
+namespace frontpanels::testing {
+namespace {
+
+int passed = 0;
+int failed = 0;
+std::string about;
+
+}  // namespace
+
+void expect(bool good, const std::string& what) {
+  std::printf("%s %s: %s\n", good ? "ok" : "not ok", about.c_str(), what.c_str());
+  std::fflush(stdout);
+  ++(good ? passed : failed);
+}
+
+void chapter(std::string name) { about = std::move(name); }
+
+int verdict() {
+  std::printf("%d passed, %d failed\n", passed, failed);
+  return failed == 0 && passed > 0 ? 0 : 1;
+}
+
+Value::Value(const std::vector<float>& singles) : Value() {
+  SAFEARRAY* const array = SafeArrayCreateVector(VT_R4, 0, static_cast<ULONG>(singles.size()));
+  void* data = nullptr;
+  SafeArrayAccessData(array, &data);
+  std::memcpy(data, singles.data(), singles.size() * sizeof(float));
+  SafeArrayUnaccessData(array);
+  V_VT(&variant_) = VT_ARRAY | VT_R4;
+  V_ARRAY(&variant_) = array;
+}
+
+int Value::number() const {
+  Value converted;
+  const HRESULT result = VariantChangeType(&converted.variant_, const_cast<VARIANT*>(&variant_), 0, VT_I4);
+  return SUCCEEDED(result) && V_VT(&variant_) != VT_EMPTY ? static_cast<int>(V_I4(&converted.variant_))
+                                                          : -12345;
+}
+
+std::wstring Value::text() const {
+  return V_VT(&variant_) == VT_BSTR ? std::wstring(V_BSTR(&variant_), SysStringLen(V_BSTR(&variant_)))
+                                    : L"(no text)";
+}
+
+CLSID classOf(const wchar_t* progId) {
+  CLSID id{};
+  CLSIDFromProgID(progId, &id);
+  return id;
+}
+
+DISPID memberOf(IDispatch& object, const wchar_t* name) {
+  LPOLESTR names[] = {const_cast<LPOLESTR>(name)};
+  DISPID member = DISPID_UNKNOWN;
+  object.GetIDsOfNames(IID_NULL, names, 1, LOCALE_USER_DEFAULT, &member);
+  return member;
+}
+
+Value call(IDispatch& object, const wchar_t* name, std::initializer_list<Value> arguments) {
+  std::vector<VARIANT> reversed;
+  for (const Value& argument : arguments) reversed.insert(reversed.begin(), argument.variant());
+  DISPPARAMS parameters{reversed.data(), nullptr, static_cast<UINT>(reversed.size()), 0};
+  Value result;
+  object.Invoke(memberOf(object, name), IID_NULL, LOCALE_USER_DEFAULT, DISPATCH_METHOD | DISPATCH_PROPERTYGET,
+                &parameters, result.get(), nullptr, nullptr);
+  return result;
+}
+
+HRESULT put(IDispatch& object, const wchar_t* name, Value value) {
+  DISPID named = DISPID_PROPERTYPUT;
+  DISPPARAMS parameters{value.get(), &named, 1, 1};
+  return object.Invoke(memberOf(object, name), IID_NULL, LOCALE_USER_DEFAULT, DISPATCH_PROPERTYPUT,
+                       &parameters, nullptr, nullptr, nullptr);
+}
+
+void pumpMessages() {
+  MSG message;
+  while (PeekMessageW(&message, nullptr, 0, 0, PM_REMOVE)) DispatchMessageW(&message);
+}
+
+}  // namespace frontpanels::testing

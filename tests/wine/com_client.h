@@ -1,0 +1,72 @@
+// A client of registered classes: calls by name, and a line for each check.
+#pragma once
+
+#include <windows.h>
+
+#include <oleauto.h>
+
+#include <cstdint>
+#include <initializer_list>
+#include <string>
+#include <utility>
+#include <vector>
+
+#include "platform/win32/com_pointer.h"
+
+namespace frontpanels::testing {
+
+// Prints "ok NAME: WHAT" or "not ok NAME: WHAT" and counts it.
+void expect(bool good, const std::string& what);
+// What the checks that follow are about.
+void chapter(std::string name);
+// Prints "N passed, N failed"; 0 when all passed.
+[[nodiscard]] int verdict();
+
+class Value {
+ public:
+  Value() { VariantInit(&variant_); }
+  Value(int number) : Value() { V_VT(&variant_) = VT_I4, V_I4(&variant_) = number; }
+  Value(double number) : Value() { V_VT(&variant_) = VT_R8, V_R8(&variant_) = number; }
+  Value(bool flag) : Value() {
+    V_VT(&variant_) = VT_BOOL, V_BOOL(&variant_) = flag ? VARIANT_TRUE : VARIANT_FALSE;
+  }
+  Value(const wchar_t* text) : Value() {
+    V_VT(&variant_) = VT_BSTR, V_BSTR(&variant_) = SysAllocString(text);
+  }
+  explicit Value(const std::vector<float>& singles);
+  Value(const Value& other) : Value() { VariantCopy(&variant_, const_cast<VARIANT*>(&other.variant_)); }
+  Value(Value&& other) noexcept : variant_(std::exchange(other.variant_, VARIANT{})) {}
+  Value& operator=(Value other) noexcept {
+    std::swap(variant_, other.variant_);
+    return *this;
+  }
+  ~Value() { VariantClear(&variant_); }
+
+  [[nodiscard]] VARIANT* get() noexcept { return &variant_; }
+  [[nodiscard]] const VARIANT& variant() const noexcept { return variant_; }
+  // -12345 for what is no whole number.
+  [[nodiscard]] int number() const;
+  [[nodiscard]] std::wstring text() const;
+
+ private:
+  VARIANT variant_;
+};
+
+[[nodiscard]] CLSID classOf(const wchar_t* progId);
+
+template <class Interface>
+[[nodiscard]] ComPointer<Interface> create(const wchar_t* progId) {
+  ComPointer<Interface> object;
+  CoCreateInstance(classOf(progId), nullptr, CLSCTX_INPROC_SERVER, __uuidof(Interface),
+                   reinterpret_cast<void**>(object.receive()));
+  return object;
+}
+
+[[nodiscard]] DISPID memberOf(IDispatch& object, const wchar_t* name);
+// A method or a property; arguments in the order of the declaration.
+Value call(IDispatch& object, const wchar_t* name, std::initializer_list<Value> arguments = {});
+HRESULT put(IDispatch& object, const wchar_t* name, Value value);
+
+void pumpMessages();
+
+}  // namespace frontpanels::testing

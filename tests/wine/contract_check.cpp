@@ -1,0 +1,666 @@
+// What containers of many kinds rely on, one chapter a duty. Knows the control by its registration alone.
+// Prints a line a check, at the end "N passed, N failed". With "atl DLL" as arguments the control stands in
+// the window of a container that somebody else wrote.
+#include <windows.h>
+
+#include <objbase.h>
+#include <ocidl.h>
+#include <olectl.h>
+
+#include <algorithm>
+#include <cfloat>
+#include <limits>
+#include <map>
+#include <string>
+#include <vector>
+
+#include "tests/wine/com_client.h"
+#include "tests/wine/full_container.h"
+
+namespace frontpanels::testing {
+namespace {
+
+const wchar_t kSpectrumPath[] = L"Brantor Scanner/Spectrum/Spectrum Trace";
+constexpr COLORREF kTraceColor = RGB(50, 156, 50);
+constexpr int kHardwareId = 7;
+
+using Texts = std::vector<std::string>;
+
+void publish(const std::vector<float>& sweep) {
+  const auto hub = create<IDispatch>(L"FrontPanels.DataHub");
+  call(*hub.get(), L"Publish", {kSpectrumPath, Value(sweep)});
+}
+std::vector<float> carrier() {
+  std::vector<float> sweep(513, -100.0F);
+  sweep[256] = -30.0F;
+  return sweep;
+}
+
+int count(HDC dc, const RECT& area, COLORREF color) {
+  int pixels = 0;
+  for (int y = area.top; y < area.bottom; ++y)
+    for (int x = area.left; x < area.right; ++x) pixels += GetPixel(dc, x, y) == color;
+  return pixels;
+}
+
+std::wstring takeMessages(IDispatch& diagnostics) {
+  std::wstring all;
+  const int messages = call(diagnostics, L"Count").number();
+  for (int i = 0; i < messages; ++i) all += call(diagnostics, L"Message", {i}).text() + L"|";
+  call(diagnostics, L"Clear");
+  return all;
+}
+
+// --- Requests
+
+void answersOfTheHost(IDispatch& diagnostics) {
+  chapter("requests");
+  Hosted hosted;
+  call(*hosted.members.get(), L"vfpSet", {0, 315, 0, kHardwareId});
+  call(*hosted.members.get(), L"closeVfp");
+  expect(takeMessages(diagnostics).empty(), "without a sink the answer is 0");
+
+  const auto point = pointOf(*hosted.members.get(), eventsOf(*hosted.members.get()));
+  RequestSink first;
+  RequestSink second;
+  DWORD firstCookie = 0;
+  DWORD secondCookie = 0;
+  point->Advise(&first, &firstCookie);
+  point->Advise(&second, &secondCookie);
+  first.status = 5;
+  call(*hosted.members.get(), L"closeVfp");
+  expect(first.received == std::vector<int>{kHardwareId, 0, 1, 0}, "resource, panel and operation arrive");
+  expect(second.received == std::vector<int>{kHardwareId, 0, 1, 5}, "the next sink sees the answer so far");
+  expect(takeMessages(diagnostics).empty(), "the last sink decides");
+
+  second.answer = DISP_E_MEMBERNOTFOUND;
+  call(*hosted.members.get(), L"closeVfp");
+  expect(takeMessages(diagnostics) == L"QUILL_VFP_CLOSE failed|",
+         "a sink without a handler leaves the answer alone");
+
+  second.answer = S_OK;
+  second.received.clear();
+  first.during = [&] { point->Unadvise(secondCookie); };
+  call(*hosted.members.get(), L"closeVfp");
+  expect(second.received.empty() && takeMessages(diagnostics) == L"QUILL_VFP_CLOSE failed|",
+         "a sink that has left in the meantime hears nothing");
+  first.during = [] {};
+
+  const auto control = hosted.members.query<IOleControl>();
+  control->FreezeEvents(TRUE);
+  control->FreezeEvents(TRUE);
+  control->FreezeEvents(FALSE);
+  first.received.clear();
+  call(*hosted.members.get(), L"closeVfp");
+  expect(first.received.empty(), "frozen twice and thawed once is still frozen");
+  control->FreezeEvents(FALSE);
+  call(*hosted.members.get(), L"closeVfp");
+  expect(!first.received.empty(), "thawed twice is not");
+  point->Unadvise(firstCookie);
+  expect(first.references == 1 && second.references == 1, "no reference to a sink is left");
+}
+
+void closedInItsOwnRequest(HWND window) {
+  chapter("closed in its own request");
+  FullContainer container(window);
+  RequestSink sink;
+  {
+    Hosted hosted;
+    hosted.object->SetClientSite(&container);
+    hosted.verb(OLEIVERB_UIACTIVATE);
+    DWORD cookie = 0;
+    const auto point = pointOf(*hosted.members.get(), eventsOf(*hosted.members.get()));
+    point->Advise(&sink, &cookie);
+    IDispatch* const members = hosted.members.get();
+    sink.during = [&] {
+      hosted.close();
+      const_cast<ComPointer<IConnectionPoint>&>(point).reset();
+    };
+    call(*members, L"closeVfp");
+  }
+  expect(container.count("OnInPlaceDeactivate") == 1, "it is deactivated once");
+  expect(container.references == 1 && sink.references == 1, "and holds nothing any more");
+}
+
+// --- Messages
+
+void CALLBACK answerTheBox(HWND, UINT, UINT_PTR timer, DWORD) {
+  const HWND box = FindWindowW(L"#32770", nullptr);
+  if (box == nullptr) return;
+  KillTimer(nullptr, timer);
+  PostMessageW(box, WM_COMMAND, IDOK, 0);
+}
+
+// A box that nobody answers would hold this up until its time is over.
+void showsBoxesToUsersOnly(IDispatch& diagnostics, HWND window) {
+  chapter("messages");
+  const auto wrong = [](Hosted& hosted) {
+    return call(*hosted.members.get(), L"vfpSet", {0, 312, 0, L"abc"}).number();
+  };
+  const std::wstring text = L"clsBaseVFP::vfpSet() PARM_MEASUREMENT_ID must be numeric\r|";
+  put(diagnostics, L"ShowMessages", true);
+  {
+    Hosted script;
+    expect(wrong(script) == -8 && takeMessages(diagnostics) == text,
+           "without a window a message is kept only");
+  }
+  FullContainer container(window);
+  Hosted hosted;
+  hosted.object->SetClientSite(&container);
+  hosted.verb(OLEIVERB_INPLACEACTIVATE);
+  SetTimer(nullptr, 0, 10, answerTheBox);
+  expect(wrong(hosted) == -8 && takeMessages(diagnostics) == text, "with one a box shows it");
+  expect(container.count("EnableModeless(off)") == 1 && container.count("EnableModeless") == 1,
+         "and the host waits for its end");
+  put(diagnostics, L"ShowMessages", false);
+}
+
+// --- The container's place
+
+void tellsItsPlace(HWND window) {
+  chapter("place");
+  FullContainer container(window);
+  PlaceProperties place;
+  container.extender = &place;
+  Hosted hosted;
+  hosted.object->SetClientSite(&container);
+  call(*hosted.members.get(), L"vfpSet", {0, 314, 0, L"Receiver 1"});
+  call(*hosted.members.get(), L"vfpOp", {0, 12});
+  const std::vector<std::wstring> expected = {L"Caption=Receiver 1", L"Visible=False", L"ViewState=0",
+                                              L"Visible=True", L"Caption=Receiver 1"};
+  expect(place.told == expected, "caption, visibility and state reach the container's place");
+  container.extender = hosted.members.get();
+  expect(call(*hosted.members.get(), L"vfpOp", {0, 12}).number() == 0,
+         "a container that answers the control itself is not asked in circles");
+  container.extender = nullptr;
+  expect(call(*hosted.members.get(), L"vfpOp", {0, 12}).number() == 0, "a container without a place will do");
+  hosted.close();
+  expect(container.references == 1 && place.references == 1, "no reference is left");
+}
+
+void staysQuietInADesigner(HWND window) {
+  chapter("designer");
+  FullContainer container(window);
+  container.userMode = false;
+  Hosted hosted;
+  hosted.object->SetClientSite(&container);
+  RequestSink sink;
+  DWORD cookie = 0;
+  const auto point = pointOf(*hosted.members.get(), eventsOf(*hosted.members.get()));
+  point->Advise(&sink, &cookie);
+  call(*hosted.members.get(), L"closeVfp");
+  expect(sink.received.empty(), "raises nothing");
+  hosted.verb(OLEIVERB_INPLACEACTIVATE);
+  SendMessageW(hosted.window(), WM_LBUTTONDOWN, MK_LBUTTON, MAKELPARAM(50, 50));
+  expect(GetCapture() == nullptr && GetFocus() != hosted.window(), "takes neither mouse nor focus");
+  container.userMode = true;
+  hosted.members.query<IOleControl>()->OnAmbientPropertyChange(DISPID_UNKNOWN);
+  call(*hosted.members.get(), L"closeVfp");
+  expect(!sink.received.empty(), "until the container runs");
+  point->Unadvise(cookie);
+}
+
+// --- Activation
+
+void activatesStepByStep(HWND window) {
+  chapter("activation");
+  FullContainer container(window);
+  Hosted hosted;
+  hosted.object->SetClientSite(&container);
+  SetFocus(window);
+  expect(hosted.verb(OLEIVERB_INPLACEACTIVATE) == S_OK, "in place");
+  expect(container.told == Texts{"OnInPlaceActivate", "ShowObject"}, "takes neither focus nor frame");
+  RECT rect{};
+  GetWindowRect(hosted.window(), &rect);
+  MapWindowPoints(nullptr, window, reinterpret_cast<POINT*>(&rect), 2);
+  expect(EqualRect(&rect, &container.place) != 0, "stands where the container said");
+  container.told.clear();
+  expect(hosted.verb(0xFFFC) == S_OK, "a verb passed as 16 bits is understood");  // OLEIVERB_UIACTIVATE
+  expect(container.told == Texts{"OnUIActivate", "OnFocus", "SetActiveObject", "SetBorderSpace(none)"},
+         "with the user's attention it has focus and frame, once each");
+  expect(GetFocus() == hosted.window(), "the focus is its window's");
+  expect(hosted.verb(-99) == E_NOTIMPL, "an unknown verb of the system's is refused");
+  expect(hosted.verb(99) == OLEOBJ_S_INVALIDVERB, "an unknown verb of its own activates it");
+
+  const HWND view = hosted.window();
+  hosted.verb(OLEIVERB_HIDE);
+  expect(hosted.window() == view && (GetWindowLongW(view, GWL_STYLE) & WS_VISIBLE) == 0,
+         "hidden it keeps its window");
+  hosted.verb(OLEIVERB_SHOW);
+  expect((GetWindowLongW(view, GWL_STYLE) & WS_VISIBLE) != 0, "and shows it again");
+
+  container.told.clear();
+  hosted.verb(OLEIVERB_UIACTIVATE);
+  container.told.clear();
+  hosted.inPlace->InPlaceDeactivate();
+  const Texts left = {"SetActiveObject(none)", "OnUIDeactivate", "OnFocus(off)", "OnInPlaceDeactivate"};
+  expect(container.told == left, "leaves the frame first and the place last");
+  hosted.inPlace->InPlaceDeactivate();
+  expect(container.count("OnInPlaceDeactivate") == 1, "once");
+  expect(container.count("OnPosRectChange") == 0, "never asks for another place by itself");
+}
+
+void focusByTab(HWND window) {
+  chapter("focus by Tab");
+  FullContainer container(window);
+  Hosted hosted;
+  hosted.object->SetClientSite(&container);
+  hosted.verb(OLEIVERB_INPLACEACTIVATE);
+  SetFocus(hosted.window());
+  expect(container.count("OnUIActivate") == 1 && container.count("OnFocus") == 1,
+         "makes it the active object");
+  hosted.inPlace->UIDeactivate();
+  container.told.clear();
+  const LRESULT answer = SendMessageW(hosted.window(), WM_MOUSEACTIVATE, reinterpret_cast<WPARAM>(window),
+                                      MAKELPARAM(HTCLIENT, WM_LBUTTONDOWN));
+  expect(answer == MA_ACTIVATE && container.count("OnUIActivate") == 1, "like a click");
+}
+
+void losesItsWindow() {
+  chapter("lost window");
+  const HWND parent = CreateWindowExW(0, L"STATIC", L"", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 0, 0, 500, 400,
+                                      nullptr, nullptr, nullptr, nullptr);
+  FullContainer container(parent);
+  Hosted hosted;
+  hosted.object->SetClientSite(&container);
+  hosted.verb(OLEIVERB_INPLACEACTIVATE);
+  publish(carrier());
+  DestroyWindow(parent);
+  publish(carrier());
+  expect(hosted.window() == nullptr, "goes with its parent's");
+  hosted.close();
+  expect(container.count("OnInPlaceDeactivate") == 1 && container.references == 1, "closes all the same");
+
+  FullContainer careless(GetDesktopWindow());
+  {
+    Hosted released;
+    released.object->SetClientSite(&careless);
+    released.verb(OLEIVERB_INPLACEACTIVATE);
+    const HWND view = released.window();
+    released.release();  // without a close
+    expect(!IsWindow(view), "goes with the last reference");
+  }
+  expect(careless.count("OnInPlaceDeactivate") == 1 && careless.references == 1,
+         "and the container hears of it");
+}
+
+void changesItsSite(HWND window) {
+  chapter("sites");
+  FullContainer first(window);
+  FullContainer second(window);
+  Hosted hosted;
+  hosted.object->SetClientSite(&first);
+  hosted.verb(OLEIVERB_INPLACEACTIVATE);
+  hosted.object->SetClientSite(&second);
+  expect(first.count("OnInPlaceDeactivate") == 1 && first.references == 1,
+         "leaves the one before it takes another");
+  expect(hosted.verb(OLEIVERB_INPLACEACTIVATE) == S_OK && second.count("OnInPlaceActivate") == 1,
+         "is active there");
+}
+
+// --- Keys and mouse
+
+void sharesTheKeys(HWND window) {
+  chapter("keys");
+  FullContainer container(window);
+  Hosted hosted;
+  hosted.object->SetClientSite(&container);
+  hosted.verb(OLEIVERB_UIACTIVATE);
+  const auto active = hosted.object.query<IOleInPlaceActiveObject>();
+  MSG left{hosted.window(), WM_KEYDOWN, VK_LEFT, 0, 0, {}};
+  expect(active->TranslateAccelerator(&left) == S_FALSE && container.count("TranslateAccelerator") == 0,
+         "an arrow is the panel's, unasked");
+  MSG tab{hosted.window(), WM_KEYDOWN, VK_TAB, 0, 0, {}};
+  expect(active->TranslateAccelerator(&tab) == S_OK && container.count("TranslateAccelerator") == 1,
+         "Tab is the container's");
+}
+
+void capturesTheMouse(HWND window) {
+  chapter("mouse");
+  FullContainer container(window);
+  Hosted hosted;
+  hosted.object->SetClientSite(&container);
+  hosted.verb(OLEIVERB_UIACTIVATE);
+  const HWND view = hosted.window();
+  SendMessageW(view, WM_LBUTTONDOWN, MK_LBUTTON, MAKELPARAM(50, 50));
+  expect(GetCapture() == view, "a press takes the capture");
+  SendMessageW(view, WM_RBUTTONDOWN, MK_LBUTTON | MK_RBUTTON, MAKELPARAM(50, 50));
+  SendMessageW(view, WM_LBUTTONUP, MK_RBUTTON, MAKELPARAM(-500, 50));
+  expect(GetCapture() == view, "which lasts while a button is down");
+  SendMessageW(view, WM_RBUTTONUP, 0, MAKELPARAM(50, 50));
+  expect(GetCapture() == nullptr, "and ends with the last one");
+}
+
+// --- Pictures
+
+void paintsAllOfItself(HWND window) {
+  chapter("window");
+  FullContainer container(window);
+  Hosted hosted;
+  hosted.object->SetClientSite(&container);
+  hosted.verb(OLEIVERB_INPLACEACTIVATE);
+  const int contextBefore = call(*hosted.members.get(), L"ViewHDC").number();
+  publish(carrier());
+  const HWND view = hosted.window();
+  const HDC dc = GetDC(view);
+  RECT all{};
+  GetClientRect(view, &all);
+  FillRect(dc, &all, static_cast<HBRUSH>(GetStockObject(BLACK_BRUSH)));
+  InvalidateRect(view, nullptr, TRUE);
+  pumpMessages();
+  expect(GetPixel(dc, 0, 0) == GetSysColor(COLOR_BTNFACE) &&
+             GetPixel(dc, all.right - 1, all.bottom - 1) == GetSysColor(COLOR_BTNFACE),
+         "the margins are painted, too");
+  expect(count(dc, all, kTraceColor) > 200, "with the trace");
+  const int left = container.place.right - container.place.left;
+  expect(call(*hosted.members.get(), L"ViewScaleWidth").number() == left * 15,
+         "its scale is twips: 15 a pixel");
+  expect(call(*hosted.members.get(), L"ViewHDC").number() == contextBefore,
+         "its device context stays the same");
+  ReleaseDC(view, dc);
+}
+
+void drawsIntoMetafiles() {
+  chapter("metafile");
+  Hosted hosted;
+  publish(carrier());
+  const auto view = hosted.object.query<IViewObject2>();
+  const HDC recording = CreateEnhMetaFileW(nullptr, nullptr, nullptr, nullptr);
+  const RECTL bounds{100, 50, 740, 530};
+  expect(view->Draw(DVASPECT_CONTENT, -1, nullptr, nullptr, nullptr, recording, &bounds, nullptr, nullptr,
+                    0) == S_OK,
+         "takes the drawing");
+  const HENHMETAFILE file = CloseEnhMetaFile(recording);
+  ENHMETAHEADER header{};
+  GetEnhMetaFileHeader(file, sizeof header, &header);
+  expect(header.nRecords > 2 && header.rclBounds.left >= 99 && header.rclBounds.top >= 49 &&
+             header.rclBounds.right <= 740 && header.rclBounds.bottom <= 530,
+         "inside its bounds");
+  DeleteEnhMetaFile(file);
+}
+
+// --- Storage
+
+// Knows texts only, as a page does.
+class TextBag final : public Counted<IPropertyBag> {
+ public:
+  std::map<std::wstring, std::wstring> texts;
+  HRESULT STDMETHODCALLTYPE Read(LPCOLESTR name, VARIANT* value, IErrorLog*) override {
+    if (texts.count(name) == 0) return E_INVALIDARG;
+    V_VT(value) = VT_BSTR;
+    V_BSTR(value) = SysAllocString(texts[name].c_str());
+    return S_OK;
+  }
+  HRESULT STDMETHODCALLTYPE Write(LPCOLESTR name, VARIANT* value) override {
+    Value text;
+    VariantChangeType(text.get(), value, VARIANT_ALPHABOOL, VT_BSTR);
+    texts[name] = text.text();
+    return S_OK;
+  }
+
+ protected:
+  void* find(REFIID id) override { return id == IID_IUnknown || id == IID_IPropertyBag ? this : nullptr; }
+};
+
+class ErrorLog final : public Counted<IErrorLog> {
+ public:
+  std::vector<std::wstring> names;
+  HRESULT STDMETHODCALLTYPE AddError(LPCOLESTR name, EXCEPINFO*) override {
+    return names.push_back(name), S_OK;
+  }
+
+ protected:
+  void* find(REFIID id) override { return id == IID_IUnknown || id == IID_IErrorLog ? this : nullptr; }
+};
+
+using Bag = std::map<std::wstring, std::wstring>;
+
+void keepsPropertiesInABag() {
+  chapter("property bag");
+  Hosted hosted;
+  const auto persist = hosted.object.query<IPersistPropertyBag>();
+  TextBag bag;
+  persist->Save(&bag, TRUE, FALSE);
+  expect(bag.texts.empty(), "what is as usual is not written");
+  persist->Save(&bag, TRUE, TRUE);
+  expect(bag.texts == Bag{{L"DisplayPanelVisible", L"True"}, {L"MeasurementPanelVisible", L"True"}},
+         "unless all is asked for");
+  ChangeSink changes;
+  DWORD cookie = 0;
+  const auto point = pointOf(*hosted.members.get(), IID_IPropertyNotifySink);
+  point->Advise(&changes, &cookie);
+  put(*hosted.members.get(), L"DisplayPanelVisible", false);
+  expect(changes.changed == std::vector<DISPID>{26}, "a change is told");
+  point->Unadvise(cookie);
+  expect(hosted.object.query<IPersistStreamInit>()->IsDirty() == S_OK, "and makes the control dirty");
+  bag.texts.clear();
+  persist->Save(&bag, TRUE, FALSE);
+  expect(bag.texts == Bag{{L"DisplayPanelVisible", L"False"}}, "the change alone is written");
+
+  Hosted other;
+  const auto loading = other.object.query<IPersistPropertyBag>();
+  loading->Load(&bag, nullptr);
+  expect(call(*other.members.get(), L"DisplayPanelVisible").number() == 0 &&
+             call(*other.members.get(), L"MeasurementPanelVisible").number() == -1,
+         "and comes back from a text");
+  ErrorLog log;
+  bag.texts = {{L"DisplayPanelVisible", L"perhaps"}, {L"MeasurementPanelVisible", L"0"}};
+  expect(loading->Load(&bag, &log) == S_OK && log.names == std::vector<std::wstring>{L"DisplayPanelVisible"},
+         "a bad value is logged");
+  expect(call(*other.members.get(), L"DisplayPanelVisible").number() == -1, "and the usual one kept");
+}
+
+void keepsStateInAStorage() {
+  chapter("storage");
+  Hosted hosted;
+  ComPointer<IStorage> storage;
+  StgCreateDocfile(nullptr, STGM_CREATE | STGM_READWRITE | STGM_SHARE_EXCLUSIVE | STGM_DELETEONRELEASE, 0,
+                   storage.receive());
+  const auto persist = hosted.object.query<IPersistStorage>();
+  persist->InitNew(storage.get());
+  SIZEL extent{7001, 5003};
+  hosted.object->SetExtent(DVASPECT_CONTENT, &extent);
+  expect(persist->Save(storage.get(), TRUE) == S_OK && persist->IsDirty() == S_OK, "saved is dirty still");
+  expect(persist->SaveCompleted(nullptr) == S_OK && persist->IsDirty() == S_FALSE, "until it is for good");
+  Hosted other;
+  expect(other.object.query<IPersistStorage>()->Load(storage.get()) == S_OK, "loads");
+  SIZEL back{};
+  other.object->GetExtent(DVASPECT_CONTENT, &back);
+  expect(back.cx == 7001 && back.cy == 5003, "with the extent to the unit");
+}
+
+// --- Calls by name
+
+void callsByName() {
+  chapter("calls by name");
+  Hosted hosted;
+  IDispatch& members = *hosted.members.get();
+  DISPPARAMS none{};
+  Value result;
+  const auto invoke = [&](DISPID id, REFIID reserved, WORD flags, DISPPARAMS& parameters) {
+    return members.Invoke(id, reserved, LOCALE_USER_DEFAULT, flags, &parameters, result.get(), nullptr,
+                          nullptr);
+  };
+  expect(invoke(DISPID_READYSTATE, IID_NULL, DISPATCH_PROPERTYGET, none) == DISP_E_MEMBERNOTFOUND,
+         "what a page probes for is answered quietly");
+  expect(invoke(15, IID_IUnknown, DISPATCH_PROPERTYGET, none) == DISP_E_UNKNOWNINTERFACE,
+         "the reserved interface must be none");
+  Value caption(L"Both ways");
+  DISPID put = DISPID_PROPERTYPUT;
+  DISPPARAMS parameters{caption.get(), &put, 1, 1};
+  expect(
+      invoke(DISPID_CAPTION, IID_NULL, DISPATCH_PROPERTYPUT | DISPATCH_PROPERTYPUTREF, parameters) == S_OK &&
+          call(members, L"Caption").text() == L"Both ways",
+      "a property takes both kinds of put at once");
+  // As script hosts pass variables: by reference to a variant of whatever type.
+  Value status;
+  Value variables[] = {Value(L"Variable"), Value(L"0"), Value(314.0), Value(true)};
+  VARIANT references[4] = {};
+  for (int i = 0; i < 4; ++i) {
+    V_VT(&references[i]) = VT_BYREF | VT_VARIANT;
+    V_VARIANTREF(&references[i]) = variables[i].get();
+  }
+  DISPPARAMS byReference{references, nullptr, 4, 0};
+  members.Invoke(memberOf(members, L"vfpSet"), IID_NULL, LOCALE_USER_DEFAULT, DISPATCH_METHOD, &byReference,
+                 status.get(), nullptr, nullptr);
+  expect(status.number() == 0 && call(members, L"Caption").text() == L"Variable",
+         "variables of any type convert");
+}
+
+void countsEveryHolder() {
+  chapter("library");
+  ComPointer<IEnumConnectionPoints> points;
+  {
+    Hosted hosted;
+    hosted.object.query<IConnectionPointContainer>()->EnumConnectionPoints(points.receive());
+  }
+  const HMODULE library = GetModuleHandleW(L"frontpanels.ocx");
+  const auto canUnload = reinterpret_cast<HRESULT(WINAPI*)()>(
+      reinterpret_cast<void*>(GetProcAddress(library, "DllCanUnloadNow")));
+  const auto classObject = reinterpret_cast<HRESULT(WINAPI*)(REFCLSID, REFIID, void**)>(
+      reinterpret_cast<void*>(GetProcAddress(library, "DllGetClassObject")));
+  expect(canUnload() == S_FALSE, "an enumerator keeps it loaded");
+  struct Elsewhere {
+    decltype(classObject) function;
+    HRESULT answer;
+  } elsewhere{classObject, S_OK};
+  const HANDLE thread = CreateThread(
+      nullptr, 0,
+      [](void* argument) -> DWORD {
+        auto& call = *static_cast<Elsewhere*>(argument);
+        ComPointer<IClassFactory> factory;
+        call.answer = call.function(classOf(L"FrontPanels.DataHub"), IID_IClassFactory,
+                                    reinterpret_cast<void**>(factory.receive()));
+        return 0;
+      },
+      &elsewhere, 0, nullptr);
+  WaitForSingleObject(thread, INFINITE);
+  CloseHandle(thread);
+  expect(elsewhere.answer == RPC_E_WRONG_THREAD, "a second thread is turned away while it is in use");
+  IConnectionPoint* fetched[3] = {};
+  ULONG number = 0;
+  expect(points->Next(3, fetched, &number) == S_FALSE && number == 2,
+         "the control has two connection points");
+  for (IConnectionPoint* const point : fetched)
+    if (point != nullptr) point->Release();
+  points.reset();
+  expect(canUnload() == S_OK, "when the last holder goes it may go, too");
+  ComPointer<IUnknown> nothing;
+  expect(classObject(IID_IUnknown, IID_IUnknown, reinterpret_cast<void**>(nothing.receive())) ==
+             CLASS_E_CLASSNOTAVAILABLE,
+         "it makes no class that is not its own");
+}
+
+// Hosts exist in which a division by zero is an exception of the processor.
+void worksWithoutMaskedExceptions(HWND window) {
+  chapter("floating point");
+  FullContainer container(window);
+  Hosted hosted;
+  hosted.object->SetClientSite(&container);
+  hosted.verb(OLEIVERB_INPLACEACTIVATE);
+  std::vector<float> gaps = carrier();
+  gaps[100] = std::numeric_limits<float>::quiet_NaN();
+  gaps[101] = std::numeric_limits<float>::infinity();
+  const unsigned unmasked = _MCW_EM & ~static_cast<unsigned>(_EM_INVALID | _EM_ZERODIVIDE | _EM_OVERFLOW);
+  const unsigned before = _controlfp(0, 0);
+  _controlfp(unmasked, _MCW_EM);
+  publish(gaps);
+  call(*hosted.members.get(), L"vfpSet", {0, 14, 0, 0.0});
+  UpdateWindow(hosted.window());
+  const unsigned after = _controlfp(0, 0);
+  _controlfp(before, _MCW_EM);
+  expect((after & _MCW_EM) == unmasked, "gaps are drawn, and the host's settings put back");
+}
+
+void checkAll(IDispatch& diagnostics, HWND window) {
+  answersOfTheHost(diagnostics);
+  closedInItsOwnRequest(window);
+  takeMessages(diagnostics);  // what closing in the middle of a request reports is not looked at
+  showsBoxesToUsersOnly(diagnostics, window);
+  tellsItsPlace(window);
+  staysQuietInADesigner(window);
+  activatesStepByStep(window);
+  focusByTab(window);
+  losesItsWindow();
+  changesItsSite(window);
+  sharesTheKeys(window);
+  capturesTheMouse(window);
+  paintsAllOfItself(window);
+  drawsIntoMetafiles();
+  keepsPropertiesInABag();
+  keepsStateInAStorage();
+  callsByName();
+  worksWithoutMaskedExceptions(window);
+  chapter("all chapters");
+  expect(takeMessages(diagnostics).empty(), "nothing else was reported");
+}
+
+// --- A container of somebody else's
+
+void standsInAForeignContainer(const wchar_t* libraryName) {
+  chapter("foreign container");
+  const HMODULE library = LoadLibraryW(libraryName);
+  const auto initialise =
+      reinterpret_cast<BOOL(WINAPI*)()>(reinterpret_cast<void*>(GetProcAddress(library, "AtlAxWinInit")));
+  const auto controlOf = reinterpret_cast<HRESULT(WINAPI*)(HWND, IUnknown**)>(
+      reinterpret_cast<void*>(GetProcAddress(library, "AtlAxGetControl")));
+  expect(library != nullptr && initialise != nullptr && initialise() != FALSE, "is there");
+  const HWND frame = CreateWindowExW(0, L"STATIC", L"", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 0, 0, 700, 600,
+                                     nullptr, nullptr, nullptr, nullptr);
+  const HWND host = CreateWindowExW(0, L"AtlAxWin", L"FrontPanels.SpectrumView", WS_CHILD | WS_VISIBLE, 20,
+                                    20, 600, 400, frame, nullptr, nullptr, nullptr);
+  ComPointer<IUnknown> control;
+  expect(host != nullptr && controlOf(host, control.receive()) == S_OK, "creates the control by its name");
+  const auto members = control.query<IDispatch>();
+  const auto inPlace = control.query<IOleInPlaceObject>();
+  if (!members) return;
+  expect(call(*members.get(), L"vfpOp", {0, 10, 10}).number() == 0, "passes calls on");
+  publish(carrier());
+  pumpMessages();
+  HWND view = nullptr;
+  inPlace->GetWindow(&view);
+  RECT client{};
+  GetClientRect(view, &client);
+  expect(GetParent(view) == host && client.right == 600 && client.bottom == 400,
+         "gives it all of its window");
+  const HDC dc = GetDC(view);
+  expect(count(dc, client, kTraceColor) > 200, "shows the sweep");
+  MoveWindow(host, 20, 20, 500, 300, TRUE);
+  pumpMessages();
+  GetClientRect(view, &client);
+  expect(client.right == 500 && client.bottom == 300 && count(dc, client, kTraceColor) > 150,
+         "also in another size");
+  ReleaseDC(view, dc);
+  control = {};
+  DestroyWindow(frame);
+  expect(!IsWindow(view), "closes it with its window");
+}
+
+}  // namespace
+
+int check(int count, wchar_t** arguments) {
+  OleInitialize(nullptr);
+  {
+    const auto diagnostics = create<IDispatch>(L"FrontPanels.Diagnostics");
+    chapter("registration");
+    expect(static_cast<bool>(diagnostics), "the classes can be created");
+    if (!diagnostics) return verdict();
+    put(*diagnostics.get(), L"ShowMessages", false);
+    call(*diagnostics.get(), L"Clear");
+    const HWND window = CreateWindowExW(0, L"STATIC", L"container", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 0, 0,
+                                        800, 600, nullptr, nullptr, nullptr, nullptr);
+    if (count == 3 && std::wstring(arguments[1]) == L"atl")
+      standsInAForeignContainer(arguments[2]);
+    else
+      checkAll(*diagnostics.get(), window);
+    DestroyWindow(window);
+  }
+  countsEveryHolder();
+  const int result = verdict();
+  OleUninitialize();
+  return result;
+}
+
+}  // namespace frontpanels::testing
+
+int wmain(int count, wchar_t** arguments) { return frontpanels::testing::check(count, arguments); }

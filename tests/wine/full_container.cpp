@@ -1,0 +1,122 @@
+#include "tests/wine/full_container.h"
+
+#include <algorithm>
+
+namespace frontpanels::testing {
+namespace {
+
+constexpr const wchar_t* kPlaceNames[] = {L"Caption", L"Visible", L"ViewState"};
+
+}  // namespace
+
+HRESULT RequestSink::Invoke(DISPID member, REFIID, LCID, WORD, DISPPARAMS* parameters, VARIANT*, EXCEPINFO*,
+                            UINT*) {
+  if (answer != S_OK) return answer;
+  if (member != 1 || parameters->cArgs != 5) return DISP_E_BADPARAMCOUNT;
+  const VARIANT* const arguments = parameters->rgvarg;  // the last comes first
+  if (V_VT(&arguments[0]) != (VT_BYREF | VT_I4)) return DISP_E_TYPEMISMATCH;
+  received = {static_cast<int>(V_I4(&arguments[4])), static_cast<int>(V_I4(&arguments[3])),
+              V_I2(&arguments[2]), static_cast<int>(*V_I4REF(&arguments[0]))};
+  *V_I4REF(&arguments[0]) = status;
+  during();
+  return S_OK;
+}
+
+HRESULT PlaceProperties::GetIDsOfNames(REFIID, LPOLESTR* names, UINT, LCID, DISPID* ids) {
+  for (DISPID i = 0; i < 3; ++i)
+    if (std::wstring(names[0]) == kPlaceNames[i]) return ids[0] = i, S_OK;
+  return DISP_E_UNKNOWNNAME;
+}
+
+HRESULT PlaceProperties::Invoke(DISPID member, REFIID, LCID, WORD flags, DISPPARAMS* parameters, VARIANT*,
+                                EXCEPINFO*, UINT*) {
+  if (flags != DISPATCH_PROPERTYPUT || parameters->cNamedArgs != 1) return DISP_E_MEMBERNOTFOUND;
+  Value text;
+  VariantChangeType(text.get(), &parameters->rgvarg[0], VARIANT_ALPHABOOL, VT_BSTR);
+  told.push_back(std::wstring(kPlaceNames[member]) + L"=" + text.text());
+  return S_OK;
+}
+
+int FullContainer::count(const std::string& what) const {
+  return static_cast<int>(std::count(told.begin(), told.end(), what));
+}
+
+HRESULT FullContainer::GetWindowContext(IOleInPlaceFrame** frame, IOleInPlaceUIWindow** document, LPRECT area,
+                                        LPRECT clip, LPOLEINPLACEFRAMEINFO info) {
+  *frame = this;
+  AddRef();
+  *document = nullptr;
+  *area = *clip = place;
+  info->fMDIApp = FALSE;
+  info->hwndFrame = window_;
+  info->haccel = nullptr;
+  info->cAccelEntries = 0;
+  return S_OK;
+}
+
+HRESULT FullContainer::GetExtendedControl(IDispatch** extended) {
+  *extended = extender;
+  if (extender == nullptr) return E_NOTIMPL;
+  extender->AddRef();
+  return S_OK;
+}
+
+HRESULT FullContainer::Invoke(DISPID member, REFIID, LCID, WORD, DISPPARAMS*, VARIANT* result, EXCEPINFO*,
+                              UINT*) {
+  if (member != DISPID_AMBIENT_USERMODE) return DISP_E_MEMBERNOTFOUND;
+  V_VT(result) = VT_BOOL;
+  V_BOOL(result) = userMode ? VARIANT_TRUE : VARIANT_FALSE;
+  return S_OK;
+}
+
+void* FullContainer::find(REFIID id) {
+  if (id == IID_IUnknown || id == IID_IOleClientSite) return static_cast<IOleClientSite*>(this);
+  if (id == IID_IOleWindow || id == IID_IOleInPlaceSite) return static_cast<IOleInPlaceSite*>(this);
+  if (id == IID_IOleControlSite) return static_cast<IOleControlSite*>(this);
+  if (id == IID_IOleInPlaceUIWindow || id == IID_IOleInPlaceFrame)
+    return static_cast<IOleInPlaceFrame*>(this);
+  if (id == IID_IDispatch) return static_cast<IDispatch*>(this);
+  return nullptr;
+}
+
+Hosted::Hosted(const wchar_t* progId)
+    : object(create<IOleObject>(progId)),
+      members(object.query<IDispatch>()),
+      inPlace(object.query<IOleInPlaceObject>()) {}
+
+HRESULT Hosted::verb(LONG verb) { return object->DoVerb(verb, nullptr, nullptr, 0, nullptr, nullptr); }
+
+HWND Hosted::window() const {
+  HWND window = nullptr;
+  inPlace->GetWindow(&window);
+  return window;
+}
+
+void Hosted::release() {
+  members.reset();
+  inPlace.reset();
+  object.reset();
+}
+
+void Hosted::close() {
+  if (!object) return;
+  object->Close(OLECLOSE_NOSAVE);
+  object->SetClientSite(nullptr);
+  release();
+}
+
+ComPointer<IConnectionPoint> pointOf(IDispatch& control, const IID& id) {
+  ComPointer<IConnectionPoint> point;
+  if (const auto points = ComPointer<IDispatch>(&control).query<IConnectionPointContainer>())
+    points->FindConnectionPoint(id, point.receive());
+  return point;
+}
+
+IID eventsOf(IDispatch& control) {
+  IID id{};
+  if (const auto info = ComPointer<IDispatch>(&control).query<IProvideClassInfo2>())
+    info->GetGUID(GUIDKIND_DEFAULT_SOURCE_DISP_IID, &id);
+  return id;
+}
+
+}  // namespace frontpanels::testing
