@@ -77,6 +77,24 @@ HRESULT put(IDispatch& object, const wchar_t* name, Value value) {
                        &parameters, nullptr, nullptr, nullptr);
 }
 
+std::vector<float> carrier() {
+  std::vector<float> sweep(513, -100.0F);
+  sweep[256] = -30.0F;
+  return sweep;
+}
+
+void publish(const std::vector<float>& sweep) {
+  const auto hub = create<IDispatch>(L"FrontPanels.DataHub");
+  call(*hub.get(), L"Publish", {L"Brantor Scanner/Spectrum/Spectrum Trace", Value(sweep)});
+}
+
+int pixelsOf(HDC dc, const RECT& area, COLORREF color) {
+  int pixels = 0;
+  for (int y = area.top; y < area.bottom; ++y)
+    for (int x = area.left; x < area.right; ++x) pixels += GetPixel(dc, x, y) == color;
+  return pixels;
+}
+
 void pumpMessages() {
   MSG message;
   while (PeekMessageW(&message, nullptr, 0, 0, PM_REMOVE)) DispatchMessageW(&message);

@@ -69,4 +69,12 @@ HRESULT put(IDispatch& object, const wchar_t* name, Value value);
 
 void pumpMessages();
 
+// A sweep with one carrier in its middle, and its way to the panels.
+[[nodiscard]] std::vector<float> carrier();
+void publish(const std::vector<float>& sweep);
+
+inline constexpr COLORREF kTraceColor = RGB(50, 156, 50);
+// How many pixels of an area have a colour.
+[[nodiscard]] int pixelsOf(HDC dc, const RECT& area, COLORREF color);
+
 }  // namespace frontpanels::testing

@@ -20,28 +20,9 @@
 namespace frontpanels::testing {
 namespace {
 
-const wchar_t kSpectrumPath[] = L"Brantor Scanner/Spectrum/Spectrum Trace";
-constexpr COLORREF kTraceColor = RGB(50, 156, 50);
 constexpr int kHardwareId = 7;
 
 using Texts = std::vector<std::string>;
-
-void publish(const std::vector<float>& sweep) {
-  const auto hub = create<IDispatch>(L"FrontPanels.DataHub");
-  call(*hub.get(), L"Publish", {kSpectrumPath, Value(sweep)});
-}
-std::vector<float> carrier() {
-  std::vector<float> sweep(513, -100.0F);
-  sweep[256] = -30.0F;
-  return sweep;
-}
-
-int count(HDC dc, const RECT& area, COLORREF color) {
-  int pixels = 0;
-  for (int y = area.top; y < area.bottom; ++y)
-    for (int x = area.left; x < area.right; ++x) pixels += GetPixel(dc, x, y) == color;
-  return pixels;
-}
 
 std::wstring takeMessages(IDispatch& diagnostics) {
   std::wstring all;
@@ -97,6 +78,12 @@ void answersOfTheHost(IDispatch& diagnostics) {
   call(*hosted.members.get(), L"closeVfp");
   expect(!first.received.empty(), "thawed twice is not");
   point->Unadvise(firstCookie);
+  DWORD again = 0;
+  point->Advise(&first, &again);
+  expect(
+      again != firstCookie && again != secondCookie && point->Unadvise(firstCookie) == CONNECT_E_NOCONNECTION,
+      "a cookie is never used twice");
+  point->Unadvise(again);
   expect(first.references == 1 && second.references == 1, "no reference to a sink is left");
 }
 
@@ -351,7 +338,7 @@ void paintsAllOfItself(HWND window) {
   expect(GetPixel(dc, 0, 0) == GetSysColor(COLOR_BTNFACE) &&
              GetPixel(dc, all.right - 1, all.bottom - 1) == GetSysColor(COLOR_BTNFACE),
          "the margins are painted, too");
-  expect(count(dc, all, kTraceColor) > 200, "with the trace");
+  expect(pixelsOf(dc, all, kTraceColor) > 200, "with the trace");
   const int left = container.place.right - container.place.left;
   expect(call(*hosted.members.get(), L"ViewScaleWidth").number() == left * 15,
          "its scale is twips: 15 a pixel");
@@ -507,6 +494,20 @@ void callsByName() {
          "variables of any type convert");
 }
 
+using ClassObject = HRESULT(WINAPI*)(REFCLSID, REFIID, void**);
+struct Elsewhere {
+  ClassObject function;
+  HRESULT answer;
+};
+
+DWORD WINAPI askElsewhere(void* argument) {
+  auto& elsewhere = *static_cast<Elsewhere*>(argument);
+  ComPointer<IClassFactory> factory;
+  elsewhere.answer = elsewhere.function(classOf(L"FrontPanels.DataHub"), IID_IClassFactory,
+                                        reinterpret_cast<void**>(factory.receive()));
+  return 0;
+}
+
 void countsEveryHolder() {
   chapter("library");
   ComPointer<IEnumConnectionPoints> points;
@@ -517,23 +518,11 @@ void countsEveryHolder() {
   const HMODULE library = GetModuleHandleW(L"frontpanels.ocx");
   const auto canUnload = reinterpret_cast<HRESULT(WINAPI*)()>(
       reinterpret_cast<void*>(GetProcAddress(library, "DllCanUnloadNow")));
-  const auto classObject = reinterpret_cast<HRESULT(WINAPI*)(REFCLSID, REFIID, void**)>(
-      reinterpret_cast<void*>(GetProcAddress(library, "DllGetClassObject")));
+  const auto classObject =
+      reinterpret_cast<ClassObject>(reinterpret_cast<void*>(GetProcAddress(library, "DllGetClassObject")));
   expect(canUnload() == S_FALSE, "an enumerator keeps it loaded");
-  struct Elsewhere {
-    decltype(classObject) function;
-    HRESULT answer;
-  } elsewhere{classObject, S_OK};
-  const HANDLE thread = CreateThread(
-      nullptr, 0,
-      [](void* argument) -> DWORD {
-        auto& call = *static_cast<Elsewhere*>(argument);
-        ComPointer<IClassFactory> factory;
-        call.answer = call.function(classOf(L"FrontPanels.DataHub"), IID_IClassFactory,
-                                    reinterpret_cast<void**>(factory.receive()));
-        return 0;
-      },
-      &elsewhere, 0, nullptr);
+  Elsewhere elsewhere{classObject, S_OK};
+  const HANDLE thread = CreateThread(nullptr, 0, askElsewhere, &elsewhere, 0, nullptr);
   WaitForSingleObject(thread, INFINITE);
   CloseHandle(thread);
   expect(elsewhere.answer == RPC_E_WRONG_THREAD, "a second thread is turned away while it is in use");
@@ -624,11 +613,11 @@ void standsInAForeignContainer(const wchar_t* libraryName) {
   expect(GetParent(view) == host && client.right == 600 && client.bottom == 400,
          "gives it all of its window");
   const HDC dc = GetDC(view);
-  expect(count(dc, client, kTraceColor) > 200, "shows the sweep");
+  expect(pixelsOf(dc, client, kTraceColor) > 200, "shows the sweep");
   MoveWindow(host, 20, 20, 500, 300, TRUE);
   pumpMessages();
   GetClientRect(view, &client);
-  expect(client.right == 500 && client.bottom == 300 && count(dc, client, kTraceColor) > 150,
+  expect(client.right == 500 && client.bottom == 300 && pixelsOf(dc, client, kTraceColor) > 150,
          "also in another size");
   ReleaseDC(view, dc);
   control = {};
