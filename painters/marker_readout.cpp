@@ -16,6 +16,16 @@ void appendX(std::string& text, double value, const ReadoutFormat& format) {
   format.x.append(text, value, numberFormat, true);
 }
 
+constexpr std::string_view kNoLevel = "---";
+
+void appendY(std::string& text, double level, const ReadoutFormat& format) {
+  if (std::isfinite(level)) {
+    format.y.append(text, level, format.yMarkerFormat, true);
+  } else {
+    text += kNoLevel;
+  }
+}
+
 // A difference is shown with its sign, in the unit that its size calls for; the display offset of the axis
 // cancels out of it.
 char signOf(double difference) { return difference < 0 ? '-' : '+'; }
@@ -26,12 +36,12 @@ void appendReadout(std::string& text, const clsMarker& marker, const ReadoutForm
   (text += marker.id) += kGap;
   appendX(text, marker.valueX, format);
   text += kGap;
-  format.y.append(text, marker.valueY, format.yMarkerFormat, true);
+  appendY(text, marker.valueY, format);
 }
 
 void appendLevelReadout(std::string& text, const clsMarker& marker, const ReadoutFormat& format) {
   (text += marker.id) += kGap;
-  format.y.append(text, marker.valueY, format.yMarkerFormat, true);
+  appendY(text, marker.valueY, format);
 }
 
 void appendDeltaReadout(std::string& text, const clsMarker& delta, const clsMarker& partner,
@@ -40,8 +50,9 @@ void appendDeltaReadout(std::string& text, const clsMarker& delta, const clsMark
   const double y = delta.valueY - partner.valueY;
   ((text += delta.id) += kGap) += signOf(x);
   appendX(text, std::fabs(x) + format.x.formatOffset(), format);
-  (text += kGap) += signOf(y);
-  format.y.append(text, std::fabs(y) + format.y.formatOffset(), format.yMarkerFormat, true);
+  text += kGap;
+  if (std::isfinite(y)) text += signOf(y);
+  appendY(text, std::fabs(y) + format.y.formatOffset(), format);
   // The difference of two levels in dBm is a ratio.
   if (text.ends_with(" dBm")) text.pop_back();
 }

@@ -133,14 +133,9 @@ void clsMultiTracePainter::removeATrace(std::int16_t traceId) {
       errorHandler().Assert("removeATrace() ... can't find trace");
       return;
     }
-    const auto owns = [&](const MarkerPointer& marker) {
-      return marker != nullptr && traces_.findMarker(marker.get()) == index;
-    };
-    if (owns(activeMarker_)) activeMarker_ = nullptr;
-    if (owns(mouseActiveMarker_)) mouseActiveMarker_ = nullptr;
     traces_.remove(index);
     if (selectedTraceIndex_ > index) --selectedTraceIndex_;
-    keepSelectionInRange();
+    forgetWhatIsGone();
   });
 }
 
@@ -154,7 +149,12 @@ void clsMultiTracePainter::clearTrace() {
   });
 }
 
-void clsMultiTracePainter::keepSelectionInRange() noexcept {
+void clsMultiTracePainter::forgetWhatIsGone() noexcept {
+  const auto gone = [this](const MarkerPointer& marker) {
+    return marker != nullptr && traces_.findMarker(marker.get()) == -1;
+  };
+  if (gone(activeMarker_)) activeMarker(nullptr);
+  if (gone(mouseActiveMarker_)) mouseActiveMarker_ = nullptr;
   const int last = std::max(0, traces_.count() - 1);
   selectedTraceIndex_ = static_cast<std::int16_t>(std::min<int>(selectedTraceIndex_, last));
 }
@@ -236,7 +236,7 @@ void clsMultiTracePainter::leastRecentlyUsed(std::vector<std::int16_t> order) {
 void clsMultiTracePainter::numberOfTraces(std::int16_t count) {
   guard("clsMultiTracePainter::numberOfTraces() ...", [&] {
     traces_.count(count);
-    keepSelectionInRange();
+    forgetWhatIsGone();
   });
 }
 
@@ -251,8 +251,20 @@ double clsMultiTracePainter::activeTraceMaximumValue() {
   return currentMinMax(traces_.slot(selectedTraceIndex_)).maximum;
 }
 
+void clsMultiTracePainter::activeTraceMaximumValue(double value) {
+  TraceSlot& slot = traces_.slot(selectedTraceIndex_);
+  (void)currentMinMax(slot);
+  slot.minMax.maximum = value;
+}
+
 double clsMultiTracePainter::activeTraceMaximumIndex() {
   return currentMinMax(traces_.slot(selectedTraceIndex_)).maximumIndex;
+}
+
+void clsMultiTracePainter::activeTraceMaximumIndex(double index) {
+  TraceSlot& slot = traces_.slot(selectedTraceIndex_);
+  (void)currentMinMax(slot);
+  slot.minMax.maximumIndex = index;
 }
 
 // New values arrive by trace(); the offset is added to them once, however often the panel asks before it

@@ -86,7 +86,7 @@ class clsMultiTracePainter : public TraceObject {
   // Trace ids, the least recently used first; the same ids may be given another order.
   [[nodiscard]] const std::vector<std::int16_t>& leastRecentlyUsed() const { return traces_.usageOrder(); }
   void leastRecentlyUsed(std::vector<std::int16_t> order);
-  // Points of the last paint, for whoever lays something over the graph.
+  // Points of the last paint, for whoever lays something over the graph. Raises "Subscript out of range".
   [[nodiscard]] const TracePoints& points(std::int16_t index) const { return traces_.slot(index).points; }
 
   [[nodiscard]] std::int16_t numberOfTraces() const override { return traces_.count(); }
@@ -105,9 +105,12 @@ class clsMultiTracePainter : public TraceObject {
   Property<Variant> offset;
   Property<bool> useOffset;
 
-  // Largest value of the selected trace and its point; 0 when it has none.
+  // Largest value of the selected trace and its point; 0 when it has none. What is written holds until the
+  // trace's values or size change.
   [[nodiscard]] double activeTraceMaximumValue();
+  void activeTraceMaximumValue(double value);
   [[nodiscard]] double activeTraceMaximumIndex();
+  void activeTraceMaximumIndex(double index);
 
   // --- Value axis. With auto scale off it runs from gridScaleTop, the level at its top, down by
   // `verticalResolution` a division; a top that was never set is null and counts as 0. verticalResolution and
@@ -203,6 +206,7 @@ class clsMultiTracePainter : public TraceObject {
   Property<std::int16_t> numberOfBands;
 
   // --- Painting, in the order in which the trace manager calls it
+  [[nodiscard]] DrawingSurface* drawingArea() const { return surface_; }
   void drawingArea(DrawingSurface* surface) override { surface_ = surface; }
   void processData() override;
   [[nodiscard]] float scaleLeft() const override { return panel_.left; }
@@ -236,6 +240,7 @@ class clsMultiTracePainter : public TraceObject {
   }
   void markerCollection(MarkerCollection markers) { markerCollection() = std::move(markers); }
   [[nodiscard]] MarkerCollection& traceMarkerCollection() { return markerCollection(); }
+  void traceMarkerCollection(MarkerCollection markers) { markerCollection(std::move(markers)); }
   // Reported, and raises "Subscript out of range", for a trace that does not exist.
   [[nodiscard]] MarkerCollection& traceMarkerCollections(std::int16_t traceIndex) override;
   void traceMarkerCollections(std::int16_t traceIndex, MarkerCollection markers);
@@ -289,7 +294,7 @@ class clsMultiTracePainter : public TraceObject {
  private:
   [[nodiscard]] const TraceSlot& selectedSlot() const { return traces_.slot(selectedTraceIndex_); }
   std::int16_t refillTraceId(std::int16_t traceId, const TraceFill& fill);
-  void keepSelectionInRange() noexcept;
+  void forgetWhatIsGone() noexcept;  // after traces were removed: their markers, a selection past the last
   [[nodiscard]] TraceSlot& slotForValues();
   void storeValues(TraceSlot& slot, const Variant& values);
   void valuesChanged(TraceSlot& slot);
@@ -315,10 +320,11 @@ class clsMultiTracePainter : public TraceObject {
   enum class Readout : std::uint8_t { WithDelta, Full, LevelOnly };
   void markerToExtreme(double MinMax::*index);
   void drawMarkersOf(DcHandle dc, std::size_t trace);
-  // False where the marker's point does not exist or is a gap.
+  // False where the marker has no point to stand on: a gap, or beyond the trace.
   bool placeMarker(std::size_t trace, clsMarker& marker);
   [[nodiscard]] double pointSpacing() const;  // in x units; 0 below two points
-  void refreshValueX(clsMarker& marker) const;
+  [[nodiscard]] static std::int32_t shownPoint(const TraceSlot& slot, const clsMarker& marker) noexcept;
+  void refreshValueX(const TraceSlot& slot, clsMarker& marker) const;
   void refreshValues(const TraceSlot& slot, clsMarker& marker) const;
   void writeReadout(DcHandle dc);
   void composeReadout(Readout readout);

@@ -66,19 +66,23 @@ void clsMultiTracePainter::findNearestPoint(float x, float y, clsMarker& marker,
     const TraceSlot& slot = traces_.slot(traceIndex.value_or(selectedTraceIndex_));
     if (slot.size == 0) return;
     std::int16_t best = kFarthestPx;
+    std::int32_t nearest = -1;  // the marker moves once every distance is known: one may overflow
     for (const TracePoints::Stretch& stretch : slot.points.stretches()) {
       std::int32_t index = stretch.first;
       for (const Point& point : slot.points.points(stretch)) {
         const std::int16_t away = distance(point, x, y);
         if (away < best) {
           best = away;
-          marker.positionX = point.x;
-          marker.positionY = point.y;
-          marker.point = index;
+          nearest = index;
         }
         ++index;
       }
     }
+    if (nearest == -1) return;
+    const Point& at = *slot.points.find(nearest);
+    marker.positionX = at.x;
+    marker.positionY = at.y;
+    marker.point = nearest;
   });
 }
 
@@ -157,13 +161,14 @@ void clsMultiTracePainter::drawMarkersOf(DcHandle dc, std::size_t trace) {
 
 bool clsMultiTracePainter::placeMarker(std::size_t trace, clsMarker& marker) {
   const auto traces = traces_.traces();
-  const Point* const at = traces[trace].points.find(marker.point);
+  const std::int32_t point = shownPoint(traces[trace], marker);
+  const Point* const at = traces[trace].points.find(point);
   if (at == nullptr) return false;
   marker.positionX = at->x;
   marker.positionY = at->y;
   // A marker with two ends spans to the neighbouring trace, where that has the point.
   const std::size_t other = trace + 1 < traces.size() ? trace + 1 : trace == 0 ? 0 : trace - 1;
-  const Point* const second = traces[other].points.find(marker.point);
+  const Point* const second = traces[other].points.find(point);
   marker.positionY2 = second == nullptr ? at->y : second->y;
   return true;
 }
@@ -172,15 +177,23 @@ double clsMultiTracePainter::pointSpacing() const {
   return numberOfMeasurements() > 1 ? (xStop_ - xStart_) / (numberOfMeasurements() - 1.0) : 0;
 }
 
-void clsMultiTracePainter::refreshValueX(clsMarker& marker) const {
-  marker.valueX = xStart_ + marker.point * pointSpacing();
+// A trace's size may count points behind the last one that was drawn: live traces count one too many, and
+// recordings end in a gap. A marker that has been moved there stays on the last one and reads it.
+std::int32_t clsMultiTracePainter::shownPoint(const TraceSlot& slot, const clsMarker& marker) noexcept {
+  const std::int32_t last = slot.points.last();
+  return last >= 0 && marker.point > last && marker.point <= slot.size ? last : marker.point;
+}
+
+void clsMultiTracePainter::refreshValueX(const TraceSlot& slot, clsMarker& marker) const {
+  marker.valueX = xStart_ + shownPoint(slot, marker) * pointSpacing();
 }
 
 // A marker beyond the trace keeps the level that it read last.
 void clsMultiTracePainter::refreshValues(const TraceSlot& slot, clsMarker& marker) const {
-  refreshValueX(marker);
-  if (marker.point >= 0 && static_cast<std::size_t>(marker.point) < slot.valueCount()) {
-    marker.valueY = slot.valueAt(static_cast<std::size_t>(marker.point));
+  refreshValueX(slot, marker);
+  const std::int32_t point = shownPoint(slot, marker);
+  if (point >= 0 && static_cast<std::size_t>(point) < slot.valueCount()) {
+    marker.valueY = slot.valueAt(static_cast<std::size_t>(point));
   }
 }
 
@@ -196,7 +209,9 @@ void clsMultiTracePainter::updateActiveMarker() {
 
 void clsMultiTracePainter::updateMarkerValueX() {
   guard("updateMarkerValueX() ...", [this] {
-    if (activeMarker_ != nullptr) refreshValueX(*activeMarker_);
+    if (activeMarker_ == nullptr) return;
+    const std::int16_t trace = traces_.findMarker(activeMarker_.get());
+    if (trace != -1) refreshValueX(traces_.slot(trace), *activeMarker_);
   });
 }
 

@@ -43,6 +43,10 @@ class TracePoints {
   }
   // Null where the trace has no such point or a gap.
   [[nodiscard]] const Point* find(std::int32_t index) const noexcept;
+  // Index of the last point there is; -1 without any.
+  [[nodiscard]] std::int32_t last() const noexcept {
+    return stretches_.empty() ? -1 : stretches_.back().first + stretches_.back().count - 1;
+  }
 
  private:
   void begin(std::size_t count);

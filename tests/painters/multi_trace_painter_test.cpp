@@ -116,6 +116,11 @@ TEST_F(MultiTracePainterTest, RemovingATraceTakesItsMarkersAndItsPlaceInTheUsage
 
   painter.removeATrace(1);
   EXPECT_EQ(messages(), Messages{"removeATrace() ... can't find trace\r"});
+
+  painter.activeMarker(kept);
+  painter.numberOfTraces(1);
+  EXPECT_EQ(painter.activeMarker(), nullptr);
+  EXPECT_EQ(painter.selectedTraceIndex(), 0);
 }
 
 TEST_F(MultiTracePainterTest, BadIndicesAreReportedAndChangeNothing) {
@@ -377,6 +382,13 @@ TEST_F(MultiTracePainterTest, TheRangeOfTheDataCanTakeThePlaceOfTheAxis) {
   EXPECT_EQ(lines(), (Lines{{{15, 24}, {25, 64}, {35, 44}}}));
   EXPECT_EQ(painter.activeTraceMaximumValue(), -30);
   EXPECT_EQ(painter.activeTraceMaximumIndex(), 0);
+
+  painter.activeTraceMaximumValue(5);
+  painter.activeTraceMaximumIndex(2);
+  EXPECT_EQ(painter.activeTraceMaximumValue(), 5);
+  EXPECT_EQ(painter.activeTraceMaximumIndex(), 2);
+  give({-30, -20});
+  EXPECT_EQ(painter.activeTraceMaximumValue(), -20);
 }
 
 TEST_F(MultiTracePainterTest, XLabelsFollowTheirStyle) {

@@ -16,6 +16,14 @@ class PainterMarkersTest : public testing::PainterTest {
     painter.updateMarkerDisplay(dc, {});
     return gdi.texts().empty() ? "" : gdi.texts().back().text;
   }
+  // Ids of the markers that are drawn.
+  [[nodiscard]] std::vector<std::string> drawnIds() {
+    gdi.clear();
+    painter.drawMarkers(dc);
+    std::vector<std::string> ids;
+    for (const TextValue& text : gdi.texts()) ids.push_back(text.text);
+    return ids;
+  }
   // A panel with room for a read-out: plot (15, 44) of 580 x 40, frequencies 100 to 109 MHz.
   void widen() {
     painter.scaleWidth(600);
@@ -53,7 +61,10 @@ TEST_F(PainterMarkersTest, TheNearestPointIsTheOneWithTheSmallestSumOfDifference
   }
   painter.findNearestPoint(15, 10100, marker);  // nothing within 10000
   EXPECT_EQ(marker.point, 2);
-  painter.findNearestPoint(15, 40000, marker);
+  give({0, -82000});  // 32800 pixels apart: near the first point, the way to the second overflows
+  paint();
+  painter.findNearestPoint(15, 24, marker);
+  EXPECT_EQ(marker.point, 2);
   EXPECT_EQ(messages(), Messages{"findNearestPoint() ...\rOverflow"});
 }
 
@@ -107,18 +118,42 @@ TEST_F(PainterMarkersTest, MarkersAreDrawnOnTheirPointsInTheTraceColour) {
   addMarker("2", 2);  // a gap
   addMarker("3", 9);  // no such point
   paint();
-  gdi.clear();
 
-  painter.drawMarkers(dc);
-
-  std::vector<std::string> ids;
-  for (const TextValue& text : gdi.texts()) ids.push_back(text.text);
-  EXPECT_EQ(ids, std::vector<std::string>{"1"});
+  EXPECT_EQ(drawnIds(), std::vector<std::string>{"1"});
   EXPECT_EQ(painter.findMarker("1")->positionX, 25);
   EXPECT_EQ(painter.findMarker("1")->positionY, 44);
   const auto created = gdi.callsOf("createPen");
   ASSERT_EQ(created.size(), 1U);
   EXPECT_EQ(created[0].pen, (testing::PenValue{PenStyle::Solid, 1, kGreen}));
+}
+
+TEST_F(PainterMarkersTest, AMarkerOnACountedPointThatIsNotDrawnStaysOnTheLastOneThatIs) {
+  widen();
+  give({0, -25, -50, kGap});
+  painter.traceSize(4);  // the number of points: one more than the highest index
+  const MarkerPointer marker = addMarker("1", 4);
+  painter.activeMarker(marker);
+  for (const std::int32_t point : {3, 4}) {
+    marker->point = point;
+    show();
+    EXPECT_EQ(drawnIds(), std::vector<std::string>{"1"});
+    EXPECT_EQ(marker->positionY, 64);  // -50 in the middle of 44..84
+    EXPECT_EQ(readout(), "1  102 MHz  -50 dBm");
+    EXPECT_EQ(marker->point, point);
+  }
+  EXPECT_EQ(painter.traceSize(), 4);
+
+  marker->point = 5;
+  show();
+  EXPECT_EQ(drawnIds(), std::vector<std::string>{});
+}
+
+TEST_F(PainterMarkersTest, AMarkerInAGapReadsNoLevel) {
+  widen();
+  give({-10, kGap, -30});
+  painter.activeMarker(addMarker("1", 1));
+  show();
+  EXPECT_EQ(readout(), "1  101 MHz  ---");
 }
 
 TEST_F(PainterMarkersTest, TheActiveMarkerReadsItsFrequencyAndLevel) {
