@@ -48,6 +48,7 @@ class SpectrumView::Implementation : public PanelControl {
   std::int32_t vfpSet(std::int32_t hardwareId, std::int16_t parameterType, std::int16_t index,
                       const Variant& value);
   void addMarker();
+  void moveMarker(void (clsTraceManager::*move)());
   [[nodiscard]] clsBaseVFP& base() noexcept { return base_; }
   [[nodiscard]] const FrequencyPlan& plan() const noexcept { return plan_; }
 
@@ -220,7 +221,7 @@ std::size_t SpectrumView::Implementation::readSweep(std::int32_t index) {
 void SpectrumView::Implementation::showSweep(clsMultiTracePainter& painter, std::span<const float> levels) {
   painter.numberOfMeasurements(static_cast<std::int32_t>(levels.size()));
   painter.dataChanged(true);
-  painter.span(plan_.spanHz());
+  painter.span(plan_.stopHz() - plan_.startHz());  // less than the span where a limit cuts it off
   painter.trace(levels);
   painter.traceSize(static_cast<std::int32_t>(levels.size()));
   painter.offset(0);
@@ -285,7 +286,6 @@ void SpectrumView::Implementation::updateXAxisLabels() {
   guard("SpectrumView::updateXAxisLabels()...", [this] {
     clsMultiTracePainter* const painter = findPainter();
     if (painter == nullptr) return;
-    painter->span(plan_.spanHz());
     painter->xStart(plan_.startHz());
     painter->xStop(plan_.stopHz());
     painter->updateXAxisLabels();
@@ -302,8 +302,15 @@ void SpectrumView::Implementation::adjustResolution() {
 void SpectrumView::Implementation::addMarker() {
   guard("SpectrumView::addMarker() ... ", [this] {
     const TraceObject* const active = base_.traceManager().activeTrace();
-    if (active != nullptr) base_.traceManager().addMarker(active->selectedTraceIndex());
+    if (active != nullptr && active->numberOfTraces() > 0)
+      base_.traceManager().addMarker(active->selectedTraceIndex());
   });
+}
+
+// Without a marker there is nothing to move and nothing wrong.
+void SpectrumView::Implementation::moveMarker(void (clsTraceManager::*move)()) {
+  const TraceObject* const active = base_.traceManager().activeTrace();
+  if (active != nullptr && active->activeMarker() != nullptr) (base_.traceManager().*move)();
 }
 
 // --- The panel from outside
@@ -344,8 +351,8 @@ void SpectrumView::KeyDown(std::int16_t keyCode, std::int16_t /*shift*/) {
 }
 
 void SpectrumView::addMarker() { implementation_->addMarker(); }
-void SpectrumView::markerToMax() { base().traceManager().markerToMax(); }
-void SpectrumView::markerToMin() { base().traceManager().markerToMin(); }
+void SpectrumView::markerToMax() { implementation_->moveMarker(&clsTraceManager::markerToMax); }
+void SpectrumView::markerToMin() { implementation_->moveMarker(&clsTraceManager::markerToMin); }
 clsBaseVFP& SpectrumView::base() { return implementation_->base(); }
 PanelControl& SpectrumView::control() { return *implementation_; }
 const FrequencyPlan& SpectrumView::frequencyPlan() const { return implementation_->plan(); }

@@ -39,7 +39,7 @@ class SpectrumView {
   void MouseUp(std::int16_t button, std::int16_t shift, float xTwips, float yTwips);
   void KeyDown(std::int16_t keyCode, std::int16_t shift);
 
-  // Marker commands.
+  // Marker commands. Without a trace there is nothing to mark, without a marker nothing to move: no report.
   void addMarker();
   void markerToMax();
   void markerToMin();

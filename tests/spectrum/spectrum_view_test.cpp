@@ -128,6 +128,19 @@ TEST_F(SpectrumViewTest, FrequencyAxisShowsStartStopAndWidthOfADivision) {
   panel->Paint();
   EXPECT_TRUE(shows("90 MHz"));
   EXPECT_FALSE(shows("88 MHz"));
+  EXPECT_EQ(panel->vfpSet(0, 13, 0, 100.001e6), 0);
+  EXPECT_EQ(panel->vfpSet(0, 14, 0, 4e6), 0);  // narrow enough for a third decimal
+  panel->Paint();
+  EXPECT_TRUE(shows("98.001 MHz"));
+}
+
+TEST_F(SpectrumViewTest, ASweepKeepsTheAxisThatALimitCutOff) {
+  EXPECT_EQ(panel->vfpSet(0, 13, 0, 5.998e9), 0);  // 10 MHz round it would end at 6003 MHz
+  publish({-30, -50, -40});
+  gdi.clear();
+  publish({-30, -50, -40});
+  EXPECT_TRUE(shows("5993 MHz"));
+  EXPECT_TRUE(shows("6000 MHz"));
 }
 
 TEST_F(SpectrumViewTest, LevelAxisRunsDownFromTheReference) {
@@ -187,6 +200,34 @@ TEST_F(SpectrumViewTest, MarkerGoesToTheLargestValueAndArrowsWalkIt) {
   EXPECT_EQ(marker()->point, 1);
   panel->KeyDown(65, 0);
   EXPECT_EQ(marker()->point, 1);
+}
+
+TEST_F(SpectrumViewTest, MarkerCommandsWithNothingToMarkOrMoveDoNothing) {
+  const auto pressAll = [this] {
+    panel->markerToMax();
+    panel->markerToMin();
+    panel->KeyDown(39, 0);
+  };
+  panel->addMarker();
+  pressAll();
+  panel->vfpOp(0, 10, 10);  // a trace object that has no trace yet
+  panel->addMarker();
+  EXPECT_EQ(panel->base().traceManager().activeTrace()->activeMarker(), nullptr);
+  publish({-30, -50, -40});
+  pressAll();
+  EXPECT_EQ(messages(), Messages{});
+}
+
+TEST_F(SpectrumViewTest, AMarkerMovedPastTheLastPointStaysInSight) {
+  publish({-30, -50, -20, -40});
+  panel->addMarker();
+  panel->markerToMax();
+  panel->KeyDown(39, 0);
+  panel->KeyDown(39, 0);
+  gdi.clear();
+  panel->KeyDown(39, 0);
+  EXPECT_EQ(panel->base().traceManager().activeTrace()->activeMarker()->point, 4);
+  EXPECT_TRUE(shows("1"));
 }
 
 TEST_F(SpectrumViewTest, ChangedConfigurationNamesWhatItCannotSetUp) {
