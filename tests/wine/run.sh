@@ -82,9 +82,21 @@ imports_and_exports() {
   done
 }
 
+# Names, numbers and places of all members, in both widths, as somebody has read and published them.
+type_libraries() {
+  local width
+  for width in 64 32; do
+    timeout 60 wine "$root/build/win64/tests/wine/describe_library.exe" \
+      "$(windows_path "$root/build/win$width/frontpanels.ocx")" | tr -d '\r' >"$out/library$width.txt"
+    diff "$here/frontpanels_library.txt" "$out/library$width.txt"
+    judge $? "the type library of the $width-bit library is the published one"
+  done
+}
+
 imports_and_exports
 timeout 180 wine wineboot -i >/dev/null 2>&1
 unit_tests
+type_libraries
 timeout 300 "$here/compare_scenes.sh" >"$out/scenes.txt" 2>&1
 judge $? "the real and the raster graphics interface draw the same: $(tail -n 1 "$out/scenes.txt")"
 
