@@ -328,6 +328,7 @@ void paintsAllOfItself(HWND window) {
   hosted.verb(OLEIVERB_INPLACEACTIVATE);
   const int contextBefore = call(*hosted.members.get(), L"ViewHDC").number();
   publish(carrier());
+  pumpMessages();  // the form paints its background first
   const HWND view = hosted.window();
   const HDC dc = GetDC(view);
   RECT all{};
