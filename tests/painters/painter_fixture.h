@@ -43,7 +43,7 @@ class PainterTest : public ReportingTest {
   // The points of each line drawn by the last paints.
   [[nodiscard]] std::vector<std::vector<Point>> lines() const {
     std::vector<std::vector<Point>> points;
-    for (const PolylineValue& line : gdi.polylines()) points.push_back(line.points);
+    for (const Call& line : gdi.polylines()) points.push_back(line.points);
     return points;
   }
   MarkerPointer addMarker(const char* id, std::int32_t point, std::int16_t traceId = 0) {

@@ -10,7 +10,6 @@ namespace frontpanels {
 namespace {
 
 using testing::RecordingGdi;
-using testing::TextValue;
 
 // Panel (0, 0) to (300, 140), plot (50, 20) to (250, 100). A letter is 8 x 12 pixels.
 class PlotLabelsTest : public testing::ReportingTest {
@@ -19,9 +18,9 @@ class PlotLabelsTest : public testing::ReportingTest {
   void draw() { labels.draw(gdi, gdi.viewDc(), fonts, panel, plot); }
   [[nodiscard]] std::vector<std::string> drawn() const {
     std::vector<std::string> lines;
-    for (const TextValue& text : gdi.texts()) {
-      lines.push_back(text.font.face + " " + text.text + " " + std::to_string(text.topLeft.x) + "," +
-                      std::to_string(text.topLeft.y));
+    for (const testing::Call& text : gdi.texts()) {
+      lines.push_back(text.font.face + " " + text.text + " " + std::to_string(text.points[0].x) + "," +
+                      std::to_string(text.points[0].y));
     }
     return lines;
   }
@@ -34,15 +33,12 @@ class PlotLabelsTest : public testing::ReportingTest {
 };
 
 TEST_F(PlotLabelsTest, EveryLabelHasItsPlace) {
+  const std::vector<std::pair<LabelPlace, const char*>> given = {
+      {LabelPlace::Left, "l"},    {LabelPlace::Right, "rr"},        {LabelPlace::XAxis, "xxx"},
+      {LabelPlace::YUnit, "dBm"}, {LabelPlace::Top, "t"},           {LabelPlace::TopCenter, "tc"},
+      {LabelPlace::Bottom, "b"},  {LabelPlace::BottomCenter, "bcd"}};
+  for (const auto& [place, text] : given) labels.text(place, text);
   labels.yAxisTexts() = {"0", "-50", "-100"};
-  labels.text(LabelPlace::Left, "l");
-  labels.text(LabelPlace::Right, "rr");
-  labels.text(LabelPlace::XAxis, "xxx");
-  labels.text(LabelPlace::YUnit, "dBm");
-  labels.text(LabelPlace::Top, "t");
-  labels.text(LabelPlace::TopCenter, "tc");
-  labels.text(LabelPlace::Bottom, "b");
-  labels.text(LabelPlace::BottomCenter, "bcd");
 
   draw();
 
@@ -56,8 +52,8 @@ TEST_F(PlotLabelsTest, EveryLabelHasItsPlace) {
                                                "corner t 50,2", "corner tc 142,2",
                                                "corner b 50,116",  // below the axis row: 103 + 12 + 1
                                                "corner bcd 138,116"}));
-  EXPECT_EQ(gdi.texts().front().mode, BackgroundMode::Transparent);
-  EXPECT_EQ(gdi.texts().front().color, gdi.sysColor(SystemColor::ButtonText));
+  EXPECT_EQ(gdi.texts().front().backgroundMode, BackgroundMode::Transparent);
+  EXPECT_EQ(gdi.texts().front().textColor, rgb(18, 18, 18));  // the system's button text
 }
 
 TEST_F(PlotLabelsTest, LeavesOutWhatWouldOverlapAnEarlierLabelOrLeaveThePanel) {
@@ -74,16 +70,10 @@ TEST_F(PlotLabelsTest, LeavesOutWhatWouldOverlapAnEarlierLabelOrLeaveThePanel) {
 
   EXPECT_EQ(drawn(), (std::vector<std::string>{"axis -50 22,94", "axis 0123456789 50,103",
                                                "axis 0123456789 170,103", "corner 0123456789012 50,2"}));
-}
-
-TEST_F(PlotLabelsTest, LabelsThatTouchAllStand) {
-  labels.text(LabelPlace::Left, "0123456789");   // 50..130
-  labels.text(LabelPlace::Right, "0123456789");  // 170..250
-  labels.text(LabelPlace::XAxis, "01234");       // 130..170
-
+  gdi.clear();
+  labels.text(LabelPlace::XAxis, "01234");  // 130..170 touches both
   draw();
-
-  EXPECT_EQ(drawn().size(), 3U);
+  EXPECT_EQ(drawn().size(), 5U);
 }
 
 TEST_F(PlotLabelsTest, ValueLabelsAreThinnedWhereLinesAreCloserThanText) {
@@ -100,41 +90,26 @@ TEST_F(PlotLabelsTest, ValueLabelsAreThinnedWhereLinesAreCloserThanText) {
                                                "axis 8 38,94"}));
 }
 
-TEST_F(PlotLabelsTest, TextsAreMeasuredAgainOnlyAfterAChange) {
+TEST_F(PlotLabelsTest, TextsAreMeasuredAgainOnlyAfterAChangeOrAFailure) {
   labels.text(LabelPlace::Left, "98 MHz");
+  gdi.failAlways("textExtent");
+  draw();
+  EXPECT_EQ(drawn().size(), 0U);
+  gdi.failNothing();
   draw();
   gdi.clear();
 
   labels.text(LabelPlace::Left, "98 MHz");
   draw();
-  EXPECT_EQ(gdi.callsOf("textExtent").size(), 0U);
+  EXPECT_EQ(gdi.succeeded("textExtent").size(), 0U);
   EXPECT_EQ(drawn(), std::vector<std::string>{"axis 98 MHz 50,103"});
-
   plot.left = 60;
+  labels.text(LabelPlace::Left, "99 MHz!");
+  labels.text(LabelPlace::Top, "012345678");  // 60..132
   draw();
-  EXPECT_EQ(drawn().back(), "axis 98 MHz 60,103");
-  labels.text(LabelPlace::Left, "99 MHz");
-  draw();
-  EXPECT_EQ(drawn().back(), "axis 99 MHz 60,103");
-}
-
-TEST_F(PlotLabelsTest, ATextThatCouldNotBeMeasuredIsTriedAgain) {
-  labels.text(LabelPlace::Left, "98 MHz");
-  gdi.failAlways("textExtent");
-  draw();
-  EXPECT_EQ(drawn().size(), 0U);
-
-  gdi.failNothing();
-  draw();
-  EXPECT_EQ(drawn(), std::vector<std::string>{"axis 98 MHz 50,103"});
-}
-
-TEST_F(PlotLabelsTest, AReadoutFindsRoomBesideTheTopLabels) {
-  labels.text(LabelPlace::Top, "0123456789");  // 50..130
-  draw();
-
-  EXPECT_EQ(labels.roomFor(LabelPlace::Readout, {120, 12}), (Rect{130, 2, 250, 14}));
-  EXPECT_EQ(labels.roomFor(LabelPlace::Readout, {121, 12}), std::nullopt);
+  EXPECT_EQ(drawn()[1], "axis 99 MHz! 60,103");
+  EXPECT_EQ(labels.roomFor(LabelPlace::Readout, {118, 12}), (Rect{132, 2, 250, 14}));
+  EXPECT_EQ(labels.roomFor(LabelPlace::Readout, {119, 12}), std::nullopt);
 }
 
 }  // namespace

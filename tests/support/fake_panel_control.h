@@ -46,7 +46,6 @@ class FakePanelControl : public PanelControl {
   std::int32_t hostStatus = 0;
 
   std::vector<std::string> calls;
-  std::vector<std::string> captions;
   float widthMark = 0;
   float heightMark = 0;
 
@@ -61,10 +60,7 @@ class FakePanelControl : public PanelControl {
     calls.emplace_back(visible ? "ViewVisible on" : "ViewVisible off");
   }
   void ViewRefresh() override { calls.emplace_back("ViewRefresh"); }
-  void Caption(std::string_view text) override {
-    captions.emplace_back(text);
-    calls.push_back("Caption " + captions.back());
-  }
+  void Caption(std::string_view text) override { calls.push_back("Caption " + std::string(text)); }
   std::int32_t frontPanelOp(std::int32_t hwId, std::int32_t vfpId, std::int16_t operation,
                             const Variant&) override {
     calls.push_back("frontPanelOp " + std::to_string(hwId) + " " + std::to_string(vfpId) + " " +
