@@ -144,6 +144,7 @@ void ControlCore::extent(SIZEL himetric) {
 }
 
 void ControlCore::adoptSize(Size sizePx) {
+  window_.resizeMemory(sizePx);  // for the time after the window
   if (sizePx.width <= 0 || sizePx.height <= 0 || pixelsOf(extent_) == sizePx) return;
   extent_ = himetricOf(sizePx);
   dirty_ = true;

@@ -108,9 +108,7 @@ void MemoryPicture::release() noexcept {
 // --- The window
 
 PanelWindow::PanelWindow(WindowOwner& owner, ScreenMetrics metrics, Size initialSizePx)
-    : owner_(owner), metrics_(metrics) {
-  memory_.create(initialSizePx);
-}
+    : owner_(owner), metrics_(metrics), memorySizePx_(initialSizePx) {}
 
 PanelWindow::~PanelWindow() { destroy(); }
 
@@ -121,6 +119,7 @@ void PanelWindow::create(HWND parent, const RECT& place) {
                             moduleHandle(), this);
   if (window_ == nullptr) throw ComFailure(HRESULT_FROM_WIN32(GetLastError()));
   windowDC_ = GetDC(window_);
+  memory_.release();
   if (events_ != nullptr) events_->resized();
   if (visible_) ShowWindow(window_, SW_SHOWNA);
 }
@@ -144,8 +143,8 @@ void PanelWindow::place(const RECT& rect, const RECT* clip) {
 }
 
 void PanelWindow::resizeMemory(Size sizePx) {
-  if (sizePx.width <= 0 || sizePx.height <= 0 || sizePx == memory_.sizePx()) return;
-  memory_.create(sizePx);
+  if (sizePx.width <= 0 || sizePx.height <= 0 || sizePx == memorySizePx_) return;
+  memorySizePx_ = sizePx;
   if (window_ == nullptr && events_ != nullptr) events_->resized();
 }
 
@@ -158,12 +157,16 @@ void PanelWindow::render(MemoryPicture& picture) {
 }
 
 DcHandle PanelWindow::hdc() {
-  const HDC current = rendering_ != nullptr ? rendering_ : window_ != nullptr ? windowDC_ : memory_.dc();
+  HDC current = rendering_ != nullptr ? rendering_ : windowDC_;
+  if (current == nullptr) {
+    if (memory_.sizePx() != memorySizePx_) memory_.create(memorySizePx_);
+    current = memory_.dc();
+  }
   return {reinterpret_cast<std::uintptr_t>(current)};
 }
 
 Size PanelWindow::clientSizePx() {
-  if (window_ == nullptr) return memory_.sizePx();
+  if (window_ == nullptr) return memorySizePx_;
   RECT client{};
   GetClientRect(window_, &client);
   return {std::max<std::int32_t>(client.right, 1), std::max<std::int32_t>(client.bottom, 1)};

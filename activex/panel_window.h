@@ -60,7 +60,7 @@ class PanelWindow final : public GraphView {
   [[nodiscard]] HWND window() const noexcept { return window_; }
   // Moves the window and clips it where the container shows only a part.
   void place(const RECT& rect, const RECT* clip);
-  // Gives a view without window its size.
+  // The size of the view while it has no window.
   void resizeMemory(Size sizePx);
   // Composes the picture anew into memory of the view's size.
   void render(MemoryPicture& picture);
@@ -91,7 +91,8 @@ class PanelWindow final : public GraphView {
   PanelEvents* events_ = nullptr;
   HWND window_ = nullptr;
   HDC windowDC_ = nullptr;
-  MemoryPicture memory_;
+  Size memorySizePx_;
+  MemoryPicture memory_;     // made when it is drawn on, so a panel that is always in a window has none
   HDC rendering_ = nullptr;  // stands in for the view while a picture is made
   MousePointer pointer_ = MousePointer::Default;
   bool visible_ = true;

@@ -216,7 +216,9 @@ void activatesStepByStep(HWND window) {
   hosted.verb(OLEIVERB_SHOW);
   expect((GetWindowLongW(view, GWL_STYLE) & WS_VISIBLE) != 0, "and shows it again");
 
-  container.told.clear();
+  SIZEL stale{1000, 1000};
+  hosted.object->SetExtent(DVASPECT_CONTENT, &stale);
+  hosted.inPlace->SetObjectRects(&container.place, &container.place);
   hosted.verb(OLEIVERB_UIACTIVATE);
   container.told.clear();
   hosted.inPlace->InPlaceDeactivate();
@@ -224,6 +226,8 @@ void activatesStepByStep(HWND window) {
   expect(container.told == left, "leaves the frame first and the place last");
   hosted.inPlace->InPlaceDeactivate();
   expect(container.count("OnInPlaceDeactivate") == 1, "once");
+  expect(call(*hosted.members.get(), L"ViewScaleWidth").number() == 400 * 15,
+         "keeps its size without a window");
   expect(container.count("OnPosRectChange") == 0, "never asks for another place by itself");
 }
 
