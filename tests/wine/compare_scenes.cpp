@@ -17,24 +17,14 @@ namespace {
 
 constexpr std::size_t kScenePixels = static_cast<std::size_t>(kSceneSizePx.width) * kSceneSizePx.height;
 
-class Recorded {
- public:
-  explicit Recorded(const std::string& path) : file_(path, std::ios::binary) {}
-  std::uint32_t word() {
-    std::uint32_t value = 0;
-    file_.read(reinterpret_cast<char*>(&value), sizeof(value));
-    return value;
-  }
-  bool scene(std::vector<std::uint32_t>& pixels) {
-    pixels.resize(kScenePixels);
-    return static_cast<bool>(
-        file_.read(reinterpret_cast<char*>(pixels.data()), static_cast<std::streamsize>(4 * kScenePixels)));
-  }
-  bool atEnd() { return file_.peek() == std::ifstream::traits_type::eof(); }
-
- private:
-  std::ifstream file_;
-};
+// The system colours and, scene by scene, the pixels.
+std::vector<std::uint32_t> recordedWords(const std::string& path) {
+  std::ifstream file(path, std::ios::binary);
+  std::vector<std::uint32_t> words;
+  for (std::uint32_t word = 0; file.read(reinterpret_cast<char*>(&word), sizeof(word));)
+    words.push_back(word);
+  return words;
+}
 
 std::uint32_t colorBits(std::uint32_t pixel) { return pixel & 0xFFFFFF; }
 
@@ -65,37 +55,39 @@ bool sameWithinOnePixel(const Rect& a, const Rect& b) {
          std::abs(a.bottom - b.bottom) <= 1 && !a.empty();
 }
 
-bool agree(const Scene& scene, const PixelView& ours, const PixelView& theirs) {
+std::string printed(const Rect& r) {
+  return "[" + std::to_string(r.left) + ", " + std::to_string(r.top) + ", " + std::to_string(r.right) + ", " +
+         std::to_string(r.bottom) + ")";
+}
+
+// In words, where the two differ; empty where they do not.
+std::string difference(const Scene& scene, const PixelView& ours, const PixelView& theirs) {
   if (scene.text) {
     const Rect a = inkBox(ours);
     const Rect b = inkBox(theirs);
-    if (sameWithinOnePixel(a, b)) return true;
-    std::printf("%s: ink in [%d, %d, %d, %d), in memory in [%d, %d, %d, %d)\n", scene.name.c_str(), b.left,
-                b.top, b.right, b.bottom, a.left, a.top, a.right, a.bottom);
-    return false;
+    return sameWithinOnePixel(a, b) ? "" : "ink in " + printed(b) + ", in memory in " + printed(a);
   }
   const int differing = differingPixels(ours, theirs);
-  if (differing > 0) std::printf("%s: %d pixels differ\n", scene.name.c_str(), differing);
-  return differing == 0;
+  return differing == 0 ? "" : std::to_string(differing) + " pixels differ";
 }
 
 int compare(const std::string& path, std::uint32_t rounds, const std::string& pictures) {
-  Recorded recorded(path);
-  RasterGdi gdi;
-  for (const SystemColor color : kSceneSystemColors) gdi.setSysColor(color, Color{recorded.word()});
-  int disagreements = 0;
-  std::vector<std::uint32_t> pixels;
+  const std::vector<std::uint32_t> words = recordedWords(path);
   const std::vector<Scene> scenes = gdiScenes(rounds);
+  if (words.size() != std::size(kSceneSystemColors) + scenes.size() * kScenePixels)
+    return std::fprintf(stderr, "\"%s\" does not hold these scenes.\n", path.c_str()), 2;
+  RasterGdi gdi;
+  const std::uint32_t* at = words.data();
+  for (const SystemColor color : kSceneSystemColors) gdi.setSysColor(color, Color{*at++});
+  int disagreements = 0;
   for (const Scene& scene : scenes) {
-    if (!recorded.scene(pixels)) {
-      std::fprintf(stderr, "\"%s\" ends before the scene \"%s\".\n", path.c_str(), scene.name.c_str());
-      return 2;
-    }
-    const PixelView theirs{pixels.data(), kSceneSizePx.width, kSceneSizePx};
+    const PixelView theirs{at, kSceneSizePx.width, kSceneSizePx};
+    at += kScenePixels;
     const DcHandle screen = gdi.createScreen(kSceneSizePx);
     scene.draw(gdi, screen, scene.seed);
-    if (!agree(scene, gdi.pixels(screen), theirs)) {
+    if (const std::string what = difference(scene, gdi.pixels(screen), theirs); !what.empty()) {
       ++disagreements;
+      std::printf("%s: %s\n", scene.name.c_str(), what.c_str());
       std::string error;
       if (!pictures.empty() &&
           (!writePng(pictures + "/" + scene.name + " memory.png", gdi.pixels(screen), error) ||
@@ -106,7 +98,7 @@ int compare(const std::string& path, std::uint32_t rounds, const std::string& pi
     gdi.deleteDC(screen);
   }
   std::printf("%zu scenes compared, %d differ\n", scenes.size(), disagreements);
-  return disagreements == 0 && recorded.atEnd() ? 0 : 1;
+  return disagreements == 0 ? 0 : 1;
 }
 
 }  // namespace

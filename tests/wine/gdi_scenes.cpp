@@ -98,7 +98,7 @@ void edges(Gdi& gdi, DcHandle dc, std::uint32_t) {
   }
 }
 
-// A star of lines of every slope, drawn outwards and inwards.
+// A star of lines of every slope, drawn outwards and inwards; lines of one and of no pixel.
 void star(Gdi& gdi, DcHandle dc, std::uint32_t) {
   const SelectedPen pen(gdi, dc, PenStyle::Solid, 1, kWhite);
   for (std::int32_t i = -24; i <= 24; ++i) {
@@ -108,38 +108,48 @@ void star(Gdi& gdi, DcHandle dc, std::uint32_t) {
     line(gdi, dc, {16, 50 + i}, {40, 50});
   }
   for (std::int32_t i = 0; i < 12; ++i) line(gdi, dc, {80, 4 + 9 * i}, {80 + 6 * i, 4 + 9 * i + i});
-  line(gdi, dc, {100, 100}, {100, 100});
-  line(gdi, dc, {102, 100}, {103, 100});
-  line(gdi, dc, {106, 100}, {105, 100});
+  for (std::int32_t i = -1; i <= 1; ++i) line(gdi, dc, {104 + 4 * i, 100}, {104 + 5 * i, 100});
 }
 
-void randomLines(Gdi& gdi, DcHandle dc, std::uint32_t seed) {
-  Dice dice(seed);
-  for (int i = 0; i < 40; ++i) {
-    const SelectedPen pen(gdi, dc, PenStyle::Solid, 1, dice.color());
-    line(gdi, dc, dice.inside(), dice.inside());
-  }
-}
+struct Strokes {
+  const char* name;
+  std::array<std::int32_t, 3> reachesPx;  // how far outside the picture they may begin and end, in turn
+  std::array<std::int32_t, 3> widthsPx{1, 1, 1};
+  bool dashed = false;
+  bool clipped = false;
+  DrawMode mode = DrawMode::CopyPen;
+};
 
-void linesFromOutside(Gdi& gdi, DcHandle dc, std::uint32_t seed) {
-  Dice dice(seed);
-  for (int i = 0; i < 60; ++i) {
-    const SelectedPen pen(gdi, dc, PenStyle::Solid, 1, dice.color());
-    const std::int32_t reach = i % 3 == 0 ? 40 : i % 3 == 1 ? 2000 : 40000;
-    line(gdi, dc, dice.around(reach), i % 2 == 0 ? dice.inside() : dice.around(reach));
-  }
-}
+constexpr Strokes kStrokes[] = {{"lines", {0, 0, 0}},
+                                {"lines from outside", {40, 2000, 40000}},
+                                {"clipped lines", {8, 20, 40}, {1, 1, 1}, false, true},
+                                {"dashes", {0, 30, 30}, {1, 1, 2}, true},
+                                {"wide lines", {0, 30, 40}, {2, 3, 4}},
+                                {"not-xor", {0, 20, 20}, {3, 1, 1}, false, false, DrawMode::NotXorPen}};
 
-void clippedPolylines(Gdi& gdi, DcHandle dc, std::uint32_t seed) {
+void strokes(Gdi& gdi, DcHandle dc, const Strokes& kind, std::uint32_t seed) {
   Dice dice(seed);
-  for (int i = 0; i < 6; ++i) {
-    clipTo(gdi, dc, dice.rect(20));
-    const SelectedPen pen(gdi, dc, PenStyle::Solid, 1, dice.color());
-    std::array<Point, 30> points;
-    for (Point& point : points) point = dice.around(i * 8);
-    gdi.polyline(dc, points);
+  fill(gdi, dc, {20, 10, 140, 100}, kBlue);
+  gdi.setBkColor(dc, kGreen);
+  gdi.setRop2(dc, kind.mode);
+  for (std::uint32_t i = 0; i < 30; ++i) {
+    if (kind.clipped && i % 6 == 0) clipTo(gdi, dc, dice.rect(20));
+    gdi.setBkMode(dc, i % 2 == 0 ? BackgroundMode::Opaque : BackgroundMode::Transparent);
+    const auto style = static_cast<PenStyle>(kind.dashed ? 1 + i % 4 : 0);
+    const SelectedPen pen(gdi, dc, style, kind.widthsPx[i % 3], dice.color());
+    const std::int32_t reach = kind.reachesPx[(i + seed) % 3];
+    const std::array<Point, 4> points{dice.around(reach), dice.inside(), dice.around(reach),
+                                      dice.around(reach)};
+    if (i % 4 < 2) {
+      gdi.polyline(dc, points);
+    } else {
+      line(gdi, dc, points[0], points[1]);
+      gdi.lineTo(dc, points[2]);
+    }
   }
   gdi.selectClipRgn(dc, {});
+  fill(gdi, dc, {70, 50, 90, 60}, kGreen);  // not affected by the mode
+  gdi.drawEdge(dc, {30, 70, 60, 90}, kEdgeRaised, kAllSides);
 }
 
 // A trace as a panel draws it: x advances slowly, y jumps.
@@ -152,50 +162,6 @@ void traces(Gdi& gdi, DcHandle dc, std::uint32_t seed) {
       points[static_cast<std::size_t>(i)] = {i * kSceneSizePx.width / count, dice.roll(0, 40) + count / 8};
     }
     gdi.polyline(dc, std::span(points).first(static_cast<std::size_t>(count)));
-  }
-}
-
-void notXor(Gdi& gdi, DcHandle dc, std::uint32_t seed) {
-  Dice dice(seed);
-  fill(gdi, dc, {20, 10, 140, 100}, kBlue);
-  const DrawMode before = gdi.setRop2(dc, DrawMode::NotXorPen);
-  for (int i = 0; i < 30; ++i) {
-    const SelectedPen pen(gdi, dc, PenStyle::Solid, i % 3 == 0 ? 3 : 1, dice.color());
-    const std::array<Point, 4> points{dice.around(20), dice.inside(), dice.inside(), dice.around(20)};
-    gdi.polyline(dc, points);
-  }
-  fill(gdi, dc, {70, 50, 90, 60}, kGreen);  // not affected by the mode
-  gdi.drawEdge(dc, {30, 70, 60, 90}, kEdgeRaised, kAllSides);
-  gdi.setRop2(dc, before);
-}
-
-void dashes(Gdi& gdi, DcHandle dc, std::uint32_t seed) {
-  Dice dice(seed);
-  gdi.setBkColor(dc, kBlue);
-  for (std::int32_t i = 0; i < 24; ++i) {
-    gdi.setBkMode(dc, i % 2 == 0 ? BackgroundMode::Opaque : BackgroundMode::Transparent);
-    const SelectedPen pen(gdi, dc, static_cast<PenStyle>(1 + i % 4), i < 20 ? 1 : 2, dice.color());
-    const std::array<Point, 4> points{dice.around(30), dice.inside(), dice.inside(), dice.around(30)};
-    if (i < 8) {
-      gdi.polyline(dc, points);
-    } else {
-      line(gdi, dc, points[0], points[1]);
-      gdi.lineTo(dc, points[2]);
-    }
-  }
-}
-
-void wideLines(Gdi& gdi, DcHandle dc, std::uint32_t seed) {
-  Dice dice(seed);
-  for (std::int32_t i = 0; i < 30; ++i) {
-    const SelectedPen pen(gdi, dc, PenStyle::Solid, 2 + i % 3, dice.color());
-    if (i % 2 == 0) {
-      line(gdi, dc, dice.around(30), dice.inside());
-    } else {
-      const std::array<Point, 5> points{dice.inside(), dice.inside(), dice.around(40), dice.inside(),
-                                        dice.inside()};
-      gdi.polyline(dc, points);
-    }
   }
 }
 
@@ -255,27 +221,20 @@ void labels(Gdi& gdi, DcHandle dc, std::uint32_t seed) {
 }  // namespace
 
 std::vector<Scene> gdiScenes(std::uint32_t rounds) {
-  std::vector<Scene> scenes{{"stock and system fills", false, stockAndSystemFills},
-                            {"edges", false, edges},
-                            {"star", false, star},
-                            {"markers", false, markers}};
-  static const std::array<Scene, 10> repeated{{{"fills", false, fills},
-                                               {"hatches", false, hatches},
-                                               {"lines", false, randomLines},
-                                               {"lines from outside", false, linesFromOutside},
-                                               {"clipped polylines", false, clippedPolylines},
-                                               {"traces", false, traces},
-                                               {"not-xor", false, notXor},
-                                               {"dashes", false, dashes},
-                                               {"wide lines", false, wideLines},
-                                               {"blits", false, blits}}};
+  std::vector<Scene> scenes{{"stock and system fills", stockAndSystemFills},
+                            {"edges", edges},
+                            {"star", star},
+                            {"markers", markers}};
   for (std::uint32_t seed = 0; seed < rounds; ++seed) {
-    for (Scene scene : repeated) {
-      scene.seed = seed;
-      scenes.push_back(scene);
+    for (const Scene& scene :
+         {Scene{"fills", fills}, Scene{"hatches", hatches}, Scene{"traces", traces}, Scene{"blits", blits}})
+      scenes.push_back({scene.name, scene.draw, seed});
+    for (const Strokes& kind : kStrokes) {
+      scenes.push_back(
+          {kind.name, [&kind](Gdi& gdi, DcHandle dc, std::uint32_t s) { strokes(gdi, dc, kind, s); }, seed});
     }
   }
-  for (std::uint32_t seed = 0; seed < 16; ++seed) scenes.push_back({"label", true, labels, seed});
+  for (std::uint32_t seed = 0; seed < 16; ++seed) scenes.push_back({"label", labels, seed, true});
   for (Scene& scene : scenes) scene.name.append(" ").append(std::to_string(scene.seed));
   return scenes;
 }

@@ -3,6 +3,7 @@
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <string>
 #include <vector>
 
@@ -14,9 +15,9 @@ inline constexpr Size kSceneSizePx{160, 120};
 
 struct Scene {
   std::string name;
-  bool text = false;  // compared by the position of the ink, not pixel by pixel
-  void (*draw)(Gdi& gdi, DcHandle dc, std::uint32_t seed) = nullptr;
+  std::function<void(Gdi& gdi, DcHandle dc, std::uint32_t seed)> draw;
   std::uint32_t seed = 0;
+  bool text = false;  // compared by the position of the ink, not pixel by pixel
 };
 
 // `rounds` is how many times the scenes made of random shapes are drawn, each time with other shapes.

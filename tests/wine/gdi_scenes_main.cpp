@@ -12,48 +12,44 @@
 namespace frontpanels::testing {
 namespace {
 
-struct Canvas {
-  HDC dc = CreateCompatibleDC(nullptr);
-  HBITMAP bitmap = nullptr;
-  HGDIOBJ before = nullptr;
-  void* pixels = nullptr;
-
-  Canvas() {
-    BITMAPINFO info{};
-    info.bmiHeader.biSize = sizeof(info.bmiHeader);
-    info.bmiHeader.biWidth = kSceneSizePx.width;
-    info.bmiHeader.biHeight = -kSceneSizePx.height;  // rows from the top
-    info.bmiHeader.biPlanes = 1;
-    info.bmiHeader.biBitCount = 32;
-    bitmap = CreateDIBSection(dc, &info, DIB_RGB_COLORS, &pixels, nullptr, 0);
-    before = SelectObject(dc, bitmap);
-  }
-  ~Canvas() {
-    SelectObject(dc, before);
-    DeleteObject(bitmap);
-    DeleteDC(dc);
-  }
-  Canvas(const Canvas&) = delete;
-  Canvas& operator=(const Canvas&) = delete;
-};
-
 constexpr std::size_t kSceneBytes = std::size_t{4} * kSceneSizePx.width * kSceneSizePx.height;
 
 bool writeScenes(std::FILE* file, std::uint32_t rounds) {
+  BITMAPINFO info{};
+  info.bmiHeader = {sizeof(info.bmiHeader),
+                    kSceneSizePx.width,
+                    -kSceneSizePx.height,  // rows from the top
+                    1,
+                    32,
+                    BI_RGB,
+                    0,
+                    0,
+                    0,
+                    0,
+                    0};
+  void* pixels = nullptr;
+  const HDC dc = CreateCompatibleDC(nullptr);
+  const HBITMAP bitmap = CreateDIBSection(dc, &info, DIB_RGB_COLORS, &pixels, nullptr, 0);
+  if (bitmap == nullptr) return false;
+  const HGDIOBJ before = SelectObject(dc, bitmap);
   Win32Gdi gdi;
+  bool written = true;
   for (const SystemColor color : kSceneSystemColors) {
     const Color value = gdi.sysColor(color);
-    if (std::fwrite(&value.bgr, sizeof(value.bgr), 1, file) != 1) return false;
+    written = written && std::fwrite(&value.bgr, sizeof(value.bgr), 1, file) == 1;
   }
   for (const Scene& scene : gdiScenes(rounds)) {
-    const Canvas canvas;
-    if (canvas.pixels == nullptr) return false;
-    std::memset(canvas.pixels, 0, kSceneBytes);
-    scene.draw(gdi, DcHandle{reinterpret_cast<std::uintptr_t>(canvas.dc)}, scene.seed);
+    std::memset(pixels, 0, kSceneBytes);
+    SaveDC(dc);  // every scene begins with the state of a new device context
+    scene.draw(gdi, DcHandle{reinterpret_cast<std::uintptr_t>(dc)}, scene.seed);
+    RestoreDC(dc, -1);
     GdiFlush();
-    if (std::fwrite(canvas.pixels, 1, kSceneBytes, file) != kSceneBytes) return false;
+    written = written && std::fwrite(pixels, 1, kSceneBytes, file) == kSceneBytes;
   }
-  return true;
+  SelectObject(dc, before);
+  DeleteObject(bitmap);
+  DeleteDC(dc);
+  return written;
 }
 
 }  // namespace
