@@ -81,6 +81,7 @@ TEST_F(SpectrumViewTest, PublishedSweepIsDrawnAndCopiedInOneTransferWhileTheView
 
 TEST_F(SpectrumViewTest, ASweepShowsItsOwnPointsOfWhichMoreThan513AreAnErrorThatKeepsThePicture) {
   publish(std::vector<float>(513, -50.0F));
+  ASSERT_EQ(traceLines().size(), 1U);
   EXPECT_EQ(traceLines()[0].points.size(), 513U);
   gdi.clear();
   publish({-30, -35, std::numeric_limits<float>::quiet_NaN(), -40, -45, -50});
