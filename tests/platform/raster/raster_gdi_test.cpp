@@ -71,6 +71,9 @@ TEST_F(RasterGdiTest, ClippingCutsPixelsAwayAndMovesNone) {
   clipTo({3, 1, 7, 3});
   draw({{0, 0}, {9, 3}});  // unclipped: runs of 2, 3, 3 and 1
   draw({{7, 1}, {6, 1}});  // starts on the right border, which is outside
+  draw({{3, 0}, {7, 0}});  // one row above, one below, one column to the left
+  draw({{3, 3}, {7, 3}});
+  draw({{2, 1}, {2, 3}});
   EXPECT_EQ(picture(),
             "..........\n"
             "...##.....\n"
