@@ -111,6 +111,14 @@ void clsTraceManager::setForm(TraceForm* form) {
   form_ = form;
   pixelSurface_.reset();
   if (form_ != nullptr) pixelSurface_.emplace(*form_, metrics_);
+  PixelSurface* const surface = form_ != nullptr ? &*pixelSurface_ : nullptr;
+  if (horizontalBar_) horizontalBar_->DrawingSurface(surface);
+  for (const auto& bar : verticalBars_) bar->DrawingSurface(surface);
+}
+
+TraceForm& clsTraceManager::requireForm() const {
+  if (form_ == nullptr) raiseObjectVariableNotSet();
+  return *form_;
 }
 
 void clsTraceManager::drawingArea(float leftTwips, float topTwips, float widthTwips, float heightTwips) {
@@ -120,11 +128,11 @@ void clsTraceManager::drawingArea(float leftTwips, float topTwips, float widthTw
 
 void clsTraceManager::setShadowDC() {
   guard("clsTraceManager::setShadowDC failed ...", [this] {
-    if (form_ == nullptr) raiseObjectVariableNotSet();
+    TraceForm& form = requireForm();
     if (insideSetShadowDC_)
       errorHandler().Assert("clsTraceManager::setShadowDC function entered twice without an exit");
     const EntryFlag inside(insideSetShadowDC_);
-    const DcHandle viewDC = form_->ViewHDC();  // may come back here: what that made is released next
+    const DcHandle viewDC = form.ViewHDC();  // may come back here: what that made is released next
     surface_.release();
     if (!surface_.createDC(viewDC))
       errorHandler().Assert("clsTraceManager::setShadowDC CreateCompatibleDC failed");
@@ -159,19 +167,28 @@ std::int32_t clsTraceManager::addTrace(std::int32_t /*result*/) { return 0; }
 
 void clsTraceManager::addTraceObject(TracePointer traceObject, std::int16_t resultType) {
   guard("addTraceObject() failed ...", [&] {
-    if (!traceObject || form_ == nullptr) raiseObjectVariableNotSet();
+    if (!traceObject) raiseObjectVariableNotSet();
+    TraceForm& form = requireForm();
     traceObject->resultType(resultType);
     traces_.add(traceObject, keyOf(resultType));
     numberOfTraces_ += 1.0F;
     activeTrace_ = std::move(traceObject);
-    form_->changedTraceConfiguration(TraceState::Added, activeTrace_.get(), resultType);
+    form.changedTraceConfiguration(TraceState::Added, activeTrace_.get(), resultType);
     if (numberOfTraces_ == 2.0F) createHorizontalBar();
   });
 }
 
 void clsTraceManager::createHorizontalBar() {
+  requireForm();
   horizontalBar_ = std::make_unique<clsHorzSplitterBar>(gdi_, windowing_);
   horizontalBar_->DrawingSurface(&*pixelSurface_);
+}
+
+// Told as an addition although a trace goes: the panel sets its display up anew on it.
+void clsTraceManager::clearActiveTrace(std::int16_t resultType) {
+  TraceForm& form = requireForm();
+  activeTrace_.reset();
+  form.changedTraceConfiguration(TraceState::Added, nullptr, resultType);
 }
 
 void clsTraceManager::ListTraceTypes(const ResultRecord& result, float& count) {
@@ -181,11 +198,7 @@ void clsTraceManager::ListTraceTypes(const ResultRecord& result, float& count) {
       case ListedAs::Ignored:
         return;
       case ListedAs::ClearsActive:
-        if (form_ == nullptr) raiseObjectVariableNotSet();
-        activeTrace_.reset();
-        // Told as an addition although a trace goes: the panel sets its display up anew on it.
-        form_->changedTraceConfiguration(TraceState::Added, nullptr, resultType);
-        return;
+        return clearActiveTrace(resultType);
       case ListedAs::Counted:
         break;
     }
@@ -218,18 +231,20 @@ void clsTraceManager::removeTrace(const ResultRecord& result) {
 
 bool clsTraceManager::removeTraceObject(std::int16_t resultType) {
   return guarded("removeTraceObject() failed ...", false, [&] {
-    if (form_ == nullptr) raiseObjectVariableNotSet();
+    TraceForm& form = requireForm();
     const std::string key = keyOf(resultType);
     if (!traces_.contains(key)) {
-      form_->changedTraceConfiguration(TraceState::Removed, activeTrace_.get(), resultType);
+      form.changedTraceConfiguration(TraceState::Removed, activeTrace_.get(), resultType);
       errorHandler().Assert("clsTraceManager::removeTraceObject() received unknown result type");
       return false;
     }
+    const TracePointer removed = traces_.item(key);
     traces_.remove(key);
     numberOfTraces_ -= 1.0F;
-    if (activeTrace_ && activeTrace_->resultType() == resultType)
+    if (numberOfTraces_ < 2.0F) horizontalBar_.reset();  // its band would take presses meant for the trace
+    if (activeTrace_ && activeTrace_->resultType() == removed->resultType())
       activeTrace_ = numberOfTraces_ <= 0.0F ? nullptr : traces_.item(std::size_t{1});
-    form_->changedTraceConfiguration(TraceState::Removed, activeTrace_.get(), resultType);
+    form.changedTraceConfiguration(TraceState::Removed, activeTrace_.get(), resultType);
     return true;
   });
 }
@@ -264,7 +279,7 @@ void clsTraceManager::paintTraces(bool /*forcePaint*/) {
 }
 
 void clsTraceManager::paintPanels() {
-  if (!(numberOfTraces_ >= 1.0F)) return;
+  if (!(numberOfTraces_ == 1.0F || numberOfTraces_ >= 2.0F)) return;
   std::int16_t smallPanel = 0;
   for (const TracePointer& traceObject : traces_) {
     if (traceObject->typeName() == kEmptyEntry) continue;
@@ -317,15 +332,20 @@ void clsTraceManager::placeVerticalBar(std::int16_t index, const PanelArea& pane
 }
 
 void clsTraceManager::showMarkerFrameColor() {
-  if (form_->typeName() == kPhonePanel || (activeTrace_ && paintsLines(*activeTrace_)))
-    form_->setMarkerFrameColor(requireActive().activeTraceColor());
+  if (!activeTrace_) return;
+  if (form_->typeName() == kPhonePanel || paintsLines(*activeTrace_))
+    form_->setMarkerFrameColor(activeTrace_->activeTraceColor());
 }
 
 void clsTraceManager::paintSplitters() {
   if (!(numberOfTraces_ > 2.0F)) return;
   if (horizontalBar_) horizontalBar_->SplitterBarTop(smallRowHeight(area_.height) + area_.top);
-  const auto shown = std::min(verticalBars_.size(), static_cast<std::size_t>(numberOfTraces_) - 1);
-  for (std::size_t index = 0; index < shown; ++index) verticalBars_[index]->Paint(surface_.dc());
+  float panelsToItsLeft = 1;
+  for (const auto& bar : verticalBars_) {
+    if (panelsToItsLeft > numberOfTraces_ - 1.0F) return;  // of a row that was longer
+    bar->Paint(surface_.dc());
+    panelsToItsLeft += 1.0F;
+  }
 }
 
 void clsTraceManager::copyToScreen() {
@@ -371,8 +391,9 @@ void clsTraceManager::activateTraceAt(SurfacePoint at) {
     const PanelArea panel{traceObject->scaleLeft(), traceObject->scaleTop(), traceObject->scaleWidth(),
                           traceObject->scaleHeight()};
     if (!panel.contains(at.x, at.y)) continue;
+    TraceForm& form = requireForm();
     activeTrace_ = traceObject;
-    form_->changedTraceConfiguration(TraceState::Added, activeTrace_.get(), activeTrace_->resultType());
+    form.changedTraceConfiguration(TraceState::Added, activeTrace_.get(), activeTrace_->resultType());
     paintTraces(true);
     return;
   }
@@ -453,7 +474,7 @@ std::int32_t clsTraceManager::moveMarker(std::int32_t step) {
     if (!activeTrace_ || activeTrace_->markerCollection().empty()) return kNoMarkerToMove;
     const MarkerPointer marker = activeTrace_->activeMarker();
     if (!marker) raiseObjectVariableNotSet();
-    const std::int32_t point = marker->point + step;
+    const std::int32_t point = toInt32(static_cast<double>(marker->point) + step);
     if (step < 0 ? point >= 0 : point <= activeTrace_->traceSize()) marker->point = point;
     paintTraces(true);
     return kMarkerMoved;
@@ -513,6 +534,7 @@ void clsTraceManager::newMarkerAt(SurfacePoint at) {
 }
 
 void clsTraceManager::newDeltaMarkerAt(SurfacePoint at) {
+  TraceForm& form = requireForm();
   TraceObject& traceObject = requireActive();
   const MarkerPointer partner = traceObject.activeMarker();
   if (!partner) raiseObjectVariableNotSet();
@@ -524,7 +546,7 @@ void clsTraceManager::newDeltaMarkerAt(SurfacePoint at) {
   traceObject.markerCollection().add(marker, marker->id);
   partner->deltaPartner = marker->id;
   traceObject.mouseActiveMarker(marker);
-  form_->deltaMarkerButtonEnabled(false);
+  form.deltaMarkerButtonEnabled(false);
   paintTraces(true);
 }
 

@@ -10,6 +10,7 @@
 #include <span>
 #include <string>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 #include "framework/splitters/horz_splitter_bar.h"
@@ -74,7 +75,10 @@ class clsTraceManager {
   bool removeTraceObject(std::int16_t resultType);
   void RemoveTraceTypes(std::span<const std::int16_t> resultTypes);
   [[nodiscard]] TraceObject* activeTrace() const noexcept { return activeTrace_.get(); }
+  void activeTrace(TracePointer traceObject) noexcept { activeTrace_ = std::move(traceObject); }
+  // Chooses the layout: exactly 1, exactly 2, or more. Any other count paints no trace.
   [[nodiscard]] float numberOfTraces() const noexcept { return numberOfTraces_; }
+  void numberOfTraces(float count) noexcept { numberOfTraces_ = count; }
   [[nodiscard]] const Collection<TracePointer>& Traces() const noexcept { return traces_; }
 
   // Composes the whole graph and copies it to the screen in one transfer. Everything is composed anew each
@@ -127,10 +131,12 @@ class clsTraceManager {
     float y;
   };
 
+  TraceForm& requireForm() const;
   [[nodiscard]] TraceObject& requireActive() const;
   [[nodiscard]] bool isActive(const TraceObject& traceObject) const;
   [[nodiscard]] SurfacePoint toSurface(float xTwips, float yTwips) const;
   void createHorizontalBar();
+  void clearActiveTrace(std::int16_t resultType);
   [[nodiscard]] bool pressOnSplitter(std::int16_t button, std::int16_t shift, float xTwips, float yTwips);
   void measureLabelFonts();
   void paintPanels();

@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <limits>
+
 #include "tests/support/fake_surface.h"
 #include "tests/support/fake_trace_object.h"
 #include "tests/support/recording_gdi.h"
@@ -236,6 +238,30 @@ TEST_F(TraceManagerTest, TracesShareTheSurfaceWithTheActiveOneBelowAndSplittersA
   const DcHandle shadow = manager->shadowDC();
   EXPECT_EQ(gdi.edges(), (std::vector<EdgeValue>{{shadow, {200, 0, 202, 80}, kEdgeSunken, kAllSides},
                                                  {shadow, {400, 0, 402, 80}, kEdgeSunken, kAllSides}}));
+
+  log.clear();
+  for (const float count : {-1.0F, 1.5F, std::numeric_limits<float>::quiet_NaN()}) {
+    manager->numberOfTraces(count);
+    manager->paintTraces(true);
+  }
+  EXPECT_TRUE(log.empty());  // no such layout
+  EXPECT_TRUE(messages().empty());
+}
+
+TEST_F(TraceManagerTest, WithoutItsFormInputIsReportedAndPaintingDoesNothing) {
+  const auto trace = add(1);
+  add(2);
+  add(3);
+  manager->paintTraces(true);
+  manager->setForm(nullptr);
+  log.clear();
+  manager->paintTraces(true);
+  press(1, 20);  // in the first small panel
+  move(1, 70);   // over the band of the bar
+  EXPECT_TRUE(log.empty());
+  EXPECT_NE(manager->activeTrace(), trace.get());
+  const std::string notSet = "\rObject variable or With block variable not set";
+  EXPECT_EQ(messages(), (Messages{"MouseDown() failed ..." + notSet, "MouseMove() failed ..." + notSet}));
 }
 
 TEST_F(TraceManagerTest, LineTracesAloneColourTheFrameAndTakeKeys) {
@@ -251,6 +277,10 @@ TEST_F(TraceManagerTest, LineTracesAloneColourTheFrameAndTakeKeys) {
   add(2);
   manager->KeyPress(39);
   EXPECT_EQ(log, Log{"2 KeyPress 39"});
+  manager->removeTraceObject(2);
+  manager->removeTraceObject(1);
+  manager->paintTraces(true);  // no trace, no colour, and no complaint
+  EXPECT_TRUE(messages().empty());
 }
 
 TEST_F(TraceManagerTest, NewMarkersAreNumberedAfterTheHighestAndComeFirst) {
@@ -317,6 +347,11 @@ TEST_F(TraceManagerTest, PressInsideAnotherPanelActivatesItButNotOnItsEdgeNorInT
   EXPECT_EQ(manager->activeTrace(), third.get());
   press(80, 59);
   EXPECT_NE(manager->activeTrace(), third.get());
+
+  manager->removeTraceObject(3);
+  manager->removeTraceObject(2);
+  press(80, 60);  // one trace fills the graph: there is nothing to divide
+  EXPECT_EQ(windowing.captures.size(), 1U);
 }
 
 TEST_F(TraceManagerTest, ArrowsMoveTheActiveMarkerWithinTheTrace) {
@@ -348,6 +383,9 @@ TEST_F(TraceManagerTest, NearestTraceIsTheFirstOfTheNearestAndAMarkerIsHitAtItsG
   EXPECT_EQ(manager->findNearestMarker(106, 45, 0), nullptr);
   EXPECT_EQ(manager->findNearestMarker(100, 63, 0), nullptr);
   EXPECT_EQ(manager->findNearestMarker(100, 60, 1), nullptr);
+  trace->subTraces[1] = {{100, 50}};
+  EXPECT_EQ(manager->findNearestTrace(100, 50), 0);  // a glyph wins over the trace that runs across it
+  EXPECT_EQ(manager->findNearestTrace(100, 45), 1);  // above the glyph and its margin
   press(103, 55);
   EXPECT_EQ(trace->mouseActiveMarker(), trace->markerCollection().item("1"));
 }

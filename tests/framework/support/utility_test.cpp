@@ -47,7 +47,7 @@ TEST_F(UtilityTest, OneTwoFiveRoundsAwayFromZero) {
 TEST_F(UtilityTest, OneTwoFiveAnswersTheSmallestStepWhenItsArithmeticFails) {
   EXPECT_EQ(OneTwoFive(1.7e308), 0.0001);  // 2E+308 is no double
   EXPECT_EQ(OneTwoFive(-kInfinity), 0.0001);
-  EXPECT_EQ(OneTwoFive(5e-324), 0.0001);  // 1E-323 has no reciprocal
+  EXPECT_EQ(OneTwoFive(5e-324), 0.0001);  // 1E-324 is no double
   EXPECT_EQ(messages(), (Messages{"OneTwoFive(1.7E+308) ... \rOverflow", "OneTwoFive(-1.#INF) ... \rOverflow",
                                   "OneTwoFive(4.94065645841247E-324) ... \rOverflow"}));
 }
