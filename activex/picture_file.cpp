@@ -3,6 +3,7 @@
 #include <wincodec.h>
 
 #include "activex/barrier.h"
+#include "platform/runtime_error.h"
 #include "platform/win32/com_pointer.h"
 
 namespace frontpanels::activex {
@@ -14,7 +15,7 @@ void encode(const std::wstring& path, const MemoryPicture& picture) {
                          reinterpret_cast<void**>(factory.receive())));
   ComPointer<IWICStream> stream;
   check(factory->CreateStream(stream.receive()));
-  check(stream->InitializeFromFilename(path.c_str(), GENERIC_WRITE));
+  if (FAILED(stream->InitializeFromFilename(path.c_str(), GENERIC_WRITE))) raisePathFileAccessError();
   ComPointer<IWICBitmapEncoder> encoder;
   check(factory->CreateEncoder(GUID_ContainerFormatPng, nullptr, encoder.receive()));
   check(encoder->Initialize(stream.get(), WICBitmapEncoderNoCache));
@@ -52,9 +53,8 @@ void writePng(const std::wstring& path, const MemoryPicture& picture) {
     throw;
   }
   if (MoveFileExW(aside.c_str(), path.c_str(), MOVEFILE_REPLACE_EXISTING)) return;
-  const HRESULT failure = HRESULT_FROM_WIN32(GetLastError());
   DeleteFileW(aside.c_str());
-  throw ComFailure(failure);
+  raisePathFileAccessError();
 }
 
 }  // namespace frontpanels::activex

@@ -44,7 +44,8 @@ Sub Errors()
   Check "and explains itself", Err.Description, "Subscript out of range"
   Err.Clear
   panel.SavePicture "Z:\no such folder\x.png"
-  Check "a picture nowhere is an error", Err.Number <> 0, True
+  Check "a picture nowhere is an error", Err.Number, 75
+  Check "that says why", Err.Description, "Path/File access error"
   Err.Clear
 End Sub
 
