@@ -1,0 +1,344 @@
+#include "platform/result_reader.h"
+
+#include <gtest/gtest.h>
+
+#include <array>
+#include <cmath>
+#include <functional>
+#include <limits>
+
+#include "platform/result_writer.h"
+#include "platform/runtime_error.h"
+
+namespace frontpanels {
+namespace {
+
+using Bytes = std::vector<std::uint8_t>;
+using R = ResultReader;
+using W = ResultWriter;
+
+constexpr std::int32_t kLargest = std::numeric_limits<std::int32_t>::max();
+constexpr std::int32_t kSmallest = std::numeric_limits<std::int32_t>::min();
+constexpr const char* kOutOfRange = "Subscript out of range";
+constexpr const char* kInvalidCall = "Invalid procedure call or argument";
+
+std::string errorOf(const std::function<void()>& call) {
+  try {
+    call();
+    return {};
+  } catch (const RuntimeError& error) {
+    return error.description();
+  }
+}
+
+using Cursor = std::pair<std::int32_t, std::int32_t>;  // next byte, bytes left
+
+// A field as it stands in the buffer, what is read from it, and the call that writes it, if only one does.
+struct Field {
+  const char* name;
+  Bytes bytes;
+  Variant value;
+  std::function<Variant(R&)> read;
+  std::function<void(W&)> write = nullptr;
+};
+
+// The values that a span of three takes, and what stood in it behind them.
+template <class T>
+Variant intoThree(R& reader, std::size_t (R::*read)(std::span<T>)) {
+  std::array<T, 3> values{T{9}, T{9}, T{9}};
+  const std::size_t count = (reader.*read)(values);
+  EXPECT_EQ(values.back(), T{9});
+  return std::vector<T>(values.begin(), values.begin() + static_cast<std::ptrdiff_t>(count));
+}
+
+const std::array<float, 2> kSingles{-80, 0.5F};
+const std::array<double, 1> kDoubles{-80};
+const Field kFields[] = {
+    {"type id", {4, 3, 2, 0x81}, -2130574588, [](R& r) { return r.GetMeasurementTypeId(); }},
+    {"int32",
+     {4, 3, 2, 0x81},
+     -2130574588,
+     [](R& r) { return r.GetMeasurementInt32(); },
+     [](W& w) { w.Int32(-2130574588); }},
+    {"int16",
+     {2, 0x81},
+     std::int16_t{-32510},
+     [](R& r) { return r.GetMeasurementInt16(); },
+     [](W& w) { w.Int16(-32510); }},
+    {"int8",
+     {0x81},
+     -127,
+     [](R& r) { return std::int32_t{r.GetMeasurementInt8()}; },
+     [](W& w) { w.Int8(-127); }},
+    {"uint8",
+     {0x81},
+     std::uint8_t{129},
+     [](R& r) { return r.GetMeasurementUInt8(); },
+     [](W& w) { w.UInt8(129); }},
+    {"single",
+     {0, 0, 0xA0, 0xC2},
+     -80.0F,
+     [](R& r) { return r.GetMeasurementFloat32(); },
+     [](W& w) { w.Float32(-80); }},
+    {"double",
+     {0, 0, 0, 0, 0, 0, 0x54, 0xC0},
+     -80.0,
+     [](R& r) { return r.GetMeasurementFloat64(); },
+     [](W& w) { w.Float64(-80); }},
+    {"text",
+     {3, 0, 'd', 0xC2, 0xB5},
+     "dµ",
+     [](R& r) { return r.GetMeasurementString(); },
+     [](W& w) { w.Text("dµ"); }},
+    {"skipped", {7, 7, 7}, "skipped", [](R& r) { return r.SkipMeasurementData(3), Variant("skipped"); }},
+    {"singles",
+     {2, 0, 0, 0, 0xA0, 0xC2, 0, 0, 0, 0x3F},
+     Variant::Singles{-80, 0.5F},
+     [](R& r) { return r.GetFloat32Array(); },
+     [](W& w) { w.Float32Array(kSingles); }},
+    {"singles into a span",
+     {2, 0, 0, 0, 0xA0, 0xC2, 0, 0, 0, 0x3F},
+     Variant::Singles{-80, 0.5F},
+     [](R& r) { return intoThree<float>(r, &R::GetFloat32Array); }},
+    {"doubles",
+     {1, 0, 0, 0, 0, 0, 0, 0, 0x54, 0xC0},
+     Variant::Doubles{-80},
+     [](R& r) { return r.GetFloat64Array(); },
+     [](W& w) { w.Float64Array(kDoubles); }},
+    {"doubles into a span",
+     {1, 0, 0, 0, 0, 0, 0, 0, 0x54, 0xC0},
+     Variant::Doubles{-80},
+     [](R& r) { return intoThree<double>(r, &R::GetFloat64Array); }},
+    {"no singles",
+     {0, 0},
+     Variant::Singles{},
+     [](R& r) { return r.GetFloat32Array(std::span<float>()), Variant(Variant::Singles{}); }},
+    {"array of int16",
+     {2, 2, 0, 1, 0, 0xFF, 0xFF},
+     Variant::Int16s{1, -1},
+     [](R& r) { return r.GetMeasurementArray(); },
+     [](W& w) {
+       w.Array(Variant::Int16s{1, -1});
+     }},
+    {"array of int32",
+     {3, 1, 0, 4, 3, 2, 1},
+     Variant::Int32s{0x01020304},
+     [](R& r) { return r.GetMeasurementArray(); },
+     [](W& w) { w.Array(Variant::Int32s{0x01020304}); }},
+    {"array of singles",
+     {4, 1, 0, 0, 0, 0xA0, 0xC2},
+     Variant::Singles{-80},
+     [](R& r) { return r.GetMeasurementArray(); },
+     [](W& w) { w.Array(Variant::Singles{-80}); }},
+    {"array of doubles",
+     {5, 1, 0, 0, 0, 0, 0, 0, 0, 0x54, 0xC0},
+     Variant::Doubles{-80},
+     [](R& r) { return r.GetMeasurementArray(); },
+     [](W& w) { w.Array(Variant::Doubles{-80}); }},
+    {"array of bytes",
+     {17, 2, 0, 1, 255},
+     Variant::Bytes{1, 255},
+     [](R& r) { return r.GetMeasurementArray(); },
+     [](W& w) {
+       w.Array(Variant::Bytes{1, 255});
+     }},
+};
+
+TEST(ResultReader, ReadsAFieldUpToTheLastByteAndNoneThatIsCutShortByCountOrBuffer) {
+  for (const Field& field : kFields) {
+    const auto size = static_cast<std::int32_t>(field.bytes.size());
+    Bytes buffer{0xEE};
+    buffer.insert(buffer.end(), field.bytes.begin(), field.bytes.end());
+    for (std::int32_t left = 0; left <= size; ++left) {
+      for (const bool bufferEnds : {false, true}) {
+        const Bytes given(buffer.begin(),
+                          buffer.begin() + 1 + (bufferEnds ? left : size));  // no byte to spare
+        Cursor cursor{1, left};
+        R reader(given, cursor.first, cursor.second);
+        if (left < size) {
+          EXPECT_EQ(errorOf([&] { field.read(reader); }), kOutOfRange) << field.name << " of " << left;
+          EXPECT_EQ(cursor, Cursor(1, left)) << field.name;
+        } else {
+          EXPECT_EQ(field.read(reader), field.value) << field.name;
+          EXPECT_EQ(cursor, Cursor(1 + size, 0)) << field.name;
+        }
+      }
+    }
+  }
+}
+
+TEST(ResultReader, RefusesWhatTheBufferLiesAboutAndLeavesTheCursor) {
+  const struct {
+    const char* what;
+    Bytes bytes;
+    std::function<void(R&)> read;
+    const char* error;
+  } rows[] = {
+      {"length below 0", {0xFF, 0xFF, 'a'}, [](R& r) { r.GetMeasurementString(); }, kOutOfRange},
+      {"largest length", {0xFF, 0x7F, 'a'}, [](R& r) { r.GetMeasurementString(); }, kOutOfRange},
+      {"count below 0", {0, 0x80, 0, 0}, [](R& r) { r.GetFloat32Array(); }, kOutOfRange},
+      {"largest count", {0xFF, 0x7F, 0, 0}, [](R& r) { r.GetFloat64Array(); }, kOutOfRange},
+      {"count below 0 behind a code", {2, 0xFF, 0xFF}, [](R& r) { r.GetMeasurementArray(); }, kOutOfRange},
+      {"unknown code", {6, 0, 0}, [](R& r) { r.GetMeasurementArray(); }, "Type mismatch"},
+      {"step back", {0, 0}, [](R& r) { r.SkipMeasurementData(-1); }, kOutOfRange},
+      {"step too far", {0, 0}, [](R& r) { r.SkipMeasurementData(kLargest); }, kOutOfRange},
+      {"four values for three places",
+       {4, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0},
+       [](R& r) { intoThree<float>(r, &R::GetFloat32Array); },
+       kOutOfRange},
+  };
+  for (const auto& row : rows) {
+    Cursor cursor{0, static_cast<std::int32_t>(row.bytes.size())};
+    const Cursor before = cursor;
+    R reader(row.bytes, cursor.first, cursor.second);
+    EXPECT_EQ(errorOf([&] { row.read(reader); }), row.error) << row.what;
+    EXPECT_EQ(cursor, before) << row.what;
+  }
+}
+
+TEST(ResultReader, RefusesACursorAndACountThatNameNoStretchOfTheBuffer) {
+  const Bytes buffer(4);
+  for (const Cursor& wrong : {Cursor(-1, 2), Cursor(5, 0), Cursor(4, 1), Cursor(0, 5), Cursor(0, -1),
+                              Cursor(kLargest, kLargest), Cursor(kSmallest, 4), Cursor(5, kSmallest)}) {
+    Cursor cursor = wrong;
+    EXPECT_EQ(errorOf([&] { R(buffer, cursor.first, cursor.second); }), kOutOfRange) << wrong.first;
+    cursor = {0, 4};
+    R reader(buffer, cursor.first, cursor.second);
+    cursor = wrong;  // by the caller, between two reads
+    EXPECT_EQ(errorOf([&] { reader.GetMeasurementUInt8(); }), kOutOfRange) << wrong.first;
+    EXPECT_EQ(cursor, wrong);
+  }
+  for (Cursor right : {Cursor(0, 0), Cursor(4, 0), Cursor(3, 1), Cursor(0, 4)})
+    EXPECT_EQ(errorOf([&] { R(buffer, right.first, right.second); }), "") << right.first;
+}
+
+TEST(ResultReader, CopiesAnArrayOfExactlyTheAskedElementType) {
+  std::vector<float> singles{9};
+  std::vector<double> doubles{9};
+  EXPECT_FALSE(CopyVariantToArray(Variant::Doubles{1, 2}, singles));
+  EXPECT_FALSE(CopyVariantToArray(Variant(1.0F), singles));
+  EXPECT_FALSE(CopyVariantToArray(Variant::Singles{1, 2}, doubles));
+  EXPECT_EQ(singles, std::vector<float>{9});
+  EXPECT_EQ(doubles, std::vector<double>{9});
+  EXPECT_TRUE(CopyVariantToArray(Variant::Singles{1, 2}, singles));
+  EXPECT_TRUE(CopyVariantToArray(Variant::Doubles{3}, doubles));
+  EXPECT_EQ(singles, (std::vector<float>{1, 2}));
+  EXPECT_EQ(doubles, std::vector<double>{3});
+}
+
+// The example of docs/result-buffer.md.
+const Bytes kExample{0x07, 0, 0,    0,                                          // hardware id 7
+                     0x64, 0, 0,    0,                                          // measurement id 100
+                     0x01, 0, 0,    0,                                          // sub-measurement id 1
+                     0x19, 0, 0,    0,                                          // result type 25
+                     0x0E, 0,                                                   // 14 bytes of data
+                     0x03, 0, 0,    0,    0xA0, 0xC2,                           // three levels: -80 dBm,
+                     0,    0, 0xC0, 0x7F, 0,    0,    0x2A, 0xC2,               // missing, -42.5 dBm
+                     0,    0, 0,    0,    0,    0,    0,    0,    0, 0, 0, 0};  // the three ends
+
+// A buffer opened as far as one of its levels: 0 nothing, 1 hardware id, 2 measurement, 3 sub-measurement,
+// 4 record.
+W openedTo(int level) {
+  const std::function<void(W&)> steps[] = {
+      [](W& w) { w.HardwareId(7); }, [](W& w) { w.BeginMeasurement(100); },
+      [](W& w) { w.BeginSubMeasurement(1); }, [](W& w) { w.BeginRecord(25); }};
+  W writer;
+  for (int i = 0; i < level; ++i) steps[i](writer);
+  return writer;
+}
+
+Bytes closedFrom(W writer, int level) {
+  const std::function<void(W&)> steps[] = {[](W& w) { w.HardwareId(7); }, [](W& w) { w.EndMeasurement(); },
+                                           [](W& w) { w.EndSubMeasurement(); }, [](W& w) { w.EndRecord(); }};
+  if (level == 0) writer.HardwareId(7);
+  for (int i = level; i > 1; --i) steps[i - 1](writer);
+  return writer.Bytes();
+}
+
+TEST(ResultWriter, WritesTheDocumentedExampleByteForByteAndTheReaderReadsItBack) {
+  W writer = openedTo(4);
+  writer.Float32Array(std::array{-80.0F, NotANumber(), -42.5F});
+  EXPECT_EQ(closedFrom(writer, 4), kExample);
+
+  Cursor cursor{0, 44};
+  R reader(kExample, cursor.first, cursor.second);
+  EXPECT_EQ(reader.GetHardwareId(), 7);
+  EXPECT_EQ(reader.GetMeasurementId(), 100);
+  EXPECT_EQ(reader.GetSubMeasurementId(), 1);
+  EXPECT_EQ(reader.PeekMeasurementTypeId(), 25);
+  EXPECT_EQ(reader.GetMeasurementTypeId(), 25);
+  EXPECT_EQ(reader.GetMeasurementInt16(), 14);
+  const std::vector<float> levels = reader.GetFloat32Array();
+  ASSERT_EQ(levels.size(), 3U);
+  EXPECT_EQ(levels[0], -80);
+  EXPECT_TRUE(std::isnan(levels[1]));
+  EXPECT_EQ(levels[2], -42.5);
+  EXPECT_EQ(reader.GetMeasurementTypeId() | reader.GetSubMeasurementId() | reader.GetMeasurementId(), 0);
+  EXPECT_EQ(cursor, Cursor(44, 0));
+  EXPECT_EQ(errorOf([&] { static_cast<void>(reader.PeekMeasurementTypeId()); }), kOutOfRange);
+}
+
+TEST(ResultWriter, WritesEveryFieldAsItIsRead) {
+  for (const Field& field : kFields) {
+    if (!field.write) continue;
+    W writer = openedTo(4);
+    field.write(writer);
+    const Bytes bytes = closedFrom(writer, 4);
+    EXPECT_EQ(bytes[16], field.bytes.size()) << field.name;  // behind four ids: the low byte of the length
+    EXPECT_EQ(Bytes(bytes.begin() + 18, bytes.end() - 12), field.bytes) << field.name;
+  }
+}
+
+TEST(ResultWriter, RefusesWhatIsOutOfOrderOrDoesNotFitAndGoesOnAsIfItHadNotBeenAsked) {
+  const std::vector<float> singles(8192);
+  const std::string text(32766, 'a');
+  const struct {
+    const char* what;
+    int level;
+    std::function<void(W&)> call;
+    const char* error;
+  } rows[] = {
+      {"a second hardware id", 1, [](W& w) { w.HardwareId(7); }, kInvalidCall},
+      {"a measurement within a measurement", 2, [](W& w) { w.BeginMeasurement(1); }, kInvalidCall},
+      {"a record without a sub-measurement", 2, [](W& w) { w.BeginRecord(1); }, kInvalidCall},
+      {"a record within a record", 4, [](W& w) { w.BeginRecord(1); }, kInvalidCall},
+      {"measurement 0", 1, [](W& w) { w.BeginMeasurement(0); }, kInvalidCall},
+      {"sub-measurement 0", 2, [](W& w) { w.BeginSubMeasurement(0); }, kInvalidCall},
+      {"result type 0", 3, [](W& w) { w.BeginRecord(0); }, kInvalidCall},
+      {"an array outside a record", 3, [](W& w) { w.Array(Variant::Bytes{1}); }, kInvalidCall},
+      {"the end of no record", 3, [](W& w) { w.EndRecord(); }, kInvalidCall},
+      {"the end of no sub-measurement", 4, [](W& w) { w.EndSubMeasurement(); }, kInvalidCall},
+      {"an open measurement", 2, [](W& w) { static_cast<void>(w.Bytes()); }, kInvalidCall},
+      {"an empty buffer", 0, [](W& w) { static_cast<void>(w.Bytes()); }, kInvalidCall},
+      {"no array", 4, [](W& w) { w.Array(Variant(1.0)); }, "Type mismatch"},
+      {"an array of variants", 4, [](W& w) { w.Array(Variant::Variants{}); }, "Type mismatch"},
+      {"too many values", 4, [&](W& w) { w.Float32Array(singles); }, "Overflow"},
+      {"too long a text", 4, [&](W& w) { w.Text(text); }, "Overflow"},
+  };
+  for (const auto& row : rows) {
+    W writer = openedTo(row.level);
+    EXPECT_EQ(errorOf([&] { row.call(writer); }), row.error) << row.what;
+    EXPECT_EQ(closedFrom(writer, row.level), closedFrom(openedTo(row.level), row.level)) << row.what;
+  }
+}
+
+TEST(ResultWriter, FillsARecordUpToItsLargestLengthAndGoesOnBehindIt) {
+  W writer = openedTo(4);
+  writer.Text(std::string(32764, 'a'));
+  writer.UInt8(1);
+  EXPECT_EQ(errorOf([&] { writer.UInt8(1); }), "Overflow");
+  const Bytes first = closedFrom(writer, 4);
+  ASSERT_EQ(first.size(), 12U + 6 + 32767 + 12);
+  EXPECT_EQ(first[16], 0xFF);
+  EXPECT_EQ(first[17], 0x7F);
+  writer.EndRecord();
+  writer.BeginRecord(-1);
+  EXPECT_EQ(closedFrom(writer, 4).size(), first.size() + 6);
+  writer.Clear();
+  writer.HardwareId(0);
+  EXPECT_EQ(writer.Bytes(), Bytes(8));
+  EXPECT_EQ(writer.Bytes(), Bytes(8));
+}
+
+}  // namespace
+}  // namespace frontpanels
