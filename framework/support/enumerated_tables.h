@@ -1,0 +1,69 @@
+// The library-wide tables of enumerated host parameters: one type, an ordered list of values with their
+// labels. A host that knows more values than the library adds them.
+#pragma once
+
+#include <cstdint>
+#include <map>
+#include <span>
+#include <string>
+#include <vector>
+
+namespace frontpanels {
+
+// Parameter types that are enumerated, by the host's number. The code formats have one of their own: hosts
+// send them under 500, which as a type means the averaging.
+inline constexpr std::int32_t FREQ_FILTER = 17;
+inline constexpr std::int32_t kCodeFormatEnumeration = 231;
+inline constexpr std::int32_t kResultTypeEnumeration = 310;
+inline constexpr std::int32_t kChannelizationEnumeration = 333;
+inline constexpr std::int32_t kAverageTypeEnumeration = 500;
+inline constexpr std::int32_t kPowerDisplayEnumeration = 728;
+inline constexpr std::int32_t kSortModeEnumeration = 729;
+inline constexpr std::int32_t kSortOrderEnumeration = 730;
+inline constexpr std::int32_t kBarLabelEnumeration = 731;
+inline constexpr std::int32_t kBarChartStyleEnumeration = 775;
+inline constexpr std::int32_t PARM_AVERAGE_AS_LOG_POWER = 3900;
+
+// Values with a meaning of their own.
+inline constexpr std::int16_t kAveragingOff = 32;
+inline constexpr std::int16_t kNarrowbandFilter = 1;
+// The code format whose unit is a third of an IS-95B chip.
+inline constexpr std::int16_t kTripleRateCodeFormat = 2;
+
+struct EnumeratedValue {
+  std::int16_t value = 0;
+  std::string label;
+  friend bool operator==(const EnumeratedValue&, const EnumeratedValue&) = default;
+};
+
+class EnumeratedTables {
+ public:
+  // Holds what the library knows by itself.
+  EnumeratedTables();
+
+  // A type's values in order; none for a type that is not known. Good until the type is next written.
+  [[nodiscard]] std::span<const EnumeratedValue> values(std::int32_t parameterType) const;
+  // The label of a value, or the value in decimal where it has none.
+  [[nodiscard]] std::string label(std::int32_t parameterType, std::int16_t value) const;
+
+  // Appends a value, or gives a listed one another label.
+  void add(std::int32_t parameterType, const EnumeratedValue& value);
+  // Puts a list in place of a type's values. Of a value that comes twice the place is the first, the label
+  // the last.
+  void replace(std::int32_t parameterType, std::span<const EnumeratedValue> values);
+
+ private:
+  std::map<std::int32_t, std::vector<EnumeratedValue>> tables_;
+};
+
+// The instance that every part of the library reads.
+[[nodiscard]] EnumeratedTables& enumeratedTables();
+
+[[nodiscard]] inline std::span<const EnumeratedValue> enumeratedValues(std::int32_t parameterType) {
+  return enumeratedTables().values(parameterType);
+}
+[[nodiscard]] inline std::string enumeratedLabel(std::int32_t parameterType, std::int16_t value) {
+  return enumeratedTables().label(parameterType, value);
+}
+
+}  // namespace frontpanels

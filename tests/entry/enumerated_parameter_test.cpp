@@ -1,0 +1,175 @@
+#include "entry/enumerated_parameter.h"
+
+#include <map>
+#include <vector>
+
+#include "framework/support/enumerated_tables.h"
+#include "platform/runtime_error.h"
+#include "tests/support/reporting_fixture.h"
+
+namespace frontpanels {
+namespace {
+
+using Messages = std::vector<std::string>;
+
+class ListedRecords : public HostRecordSet {
+ public:
+  explicit ListedRecords(std::vector<std::map<std::string, Variant, std::less<>>> records)
+      : records_(std::move(records)) {}
+
+  [[nodiscard]] std::size_t count() const override { return records_.size(); }
+  [[nodiscard]] Variant field(std::size_t record, std::string_view name) const override {
+    const auto found = records_.at(record).find(name);
+    if (found == records_.at(record).end()) raiseInvalidProcedureCall();
+    return found->second;
+  }
+
+ private:
+  std::vector<std::map<std::string, Variant, std::less<>>> records_;
+};
+
+// The averaging is the type at hand: Off 32, Linear 0, Exponential 1, Max Hold 2, Min Hold 3.
+class EnumeratedParameterTest : public testing::ReportingTest {
+ protected:
+  EnumeratedParameterTest() {
+    list.Click = [this] { parameter.Click(); };
+  }
+  void bind() {
+    parameter.ComboBox(&list);
+    parameter.parameterType(500);
+  }
+  [[nodiscard]] std::vector<std::int32_t> data() const {
+    std::vector<std::int32_t> values;
+    for (std::int32_t index = 0; index < list.ListCount(); ++index) values.push_back(list.item(index).data);
+    return values;
+  }
+
+  ItemList list{ControlKind::ComboBox, "AverageTypeCombo"};
+  Control label{ControlKind::Label, "AverageTypeLabel"};
+  clsEnumeratedParameter parameter;
+};
+
+using Data = std::vector<std::int32_t>;
+
+TEST_F(EnumeratedParameterTest, FillsTheListInTableOrderWhicheverComesFirst) {
+  parameter.parameterType(500);
+  parameter.value(1);
+  parameter.ComboBox(&list);
+  EXPECT_EQ(data(), (Data{32, 0, 1, 2, 3}));
+  EXPECT_EQ(list.item(2), (ItemList::Item{"Exponential", 1}));
+  EXPECT_EQ(list.ListIndex(), 2);
+
+  parameter.parameterType(17);
+  EXPECT_EQ(data(), (Data{0, 1}));
+  EXPECT_EQ(list.ListIndex(), 1);
+
+  parameter.parameterType(0);
+  EXPECT_EQ(data(), Data{});
+  EXPECT_EQ(list.ListIndex(), -1);
+  EXPECT_EQ(messages(), Messages{});
+}
+
+TEST_F(EnumeratedParameterTest, ValueAndSelectionFollowEachOther) {
+  bind();
+  parameter.value(3);
+  EXPECT_EQ(list.ListIndex(), 4);
+  EXPECT_FALSE(parameter.newValue());  // the program's doing, though the list clicks
+
+  list.userChoice(0);
+  EXPECT_EQ(parameter.value(), 32);
+  EXPECT_TRUE(parameter.newValue());
+  EXPECT_TRUE(parameter.newValue());  // reading does not clear it
+
+  list.userChoice(0);
+  EXPECT_FALSE(parameter.newValue());
+
+  parameter.value(9);
+  EXPECT_EQ(messages(), (Messages{"clsEnumeratedParameter::value() ... could not find value (9) for "
+                                  "ParameterType 500\r"}));
+  EXPECT_EQ(list.ListIndex(), 0);
+  EXPECT_EQ(parameter.value(), 9);
+
+  list.AddItem("out of 16 bits", 40000);
+  clearMessages();
+  list.userChoice(5);
+  EXPECT_EQ(messages(), Messages{"clsEnumeratedParameter::Change()...\rOverflow"});
+  EXPECT_EQ(parameter.value(), 9);
+
+  list.AddItem("twice", 2);  // of two items with one value the last is selected
+  parameter.value(2);
+  EXPECT_EQ(list.ListIndex(), 6);
+}
+
+TEST_F(EnumeratedParameterTest, ASubsetHoldsWhatIsAddedToIt) {
+  parameter.subset(true);
+  bind();
+  EXPECT_EQ(data(), Data{});
+  parameter.Add(32);
+  parameter.Add(7);
+  parameter.Add(32);
+  EXPECT_EQ(data(), (Data{32, 7}));
+  EXPECT_EQ(list.item(1).text, "7");
+
+  parameter.Limits(ListedRecords({{{"[Order]", 0}, {"[Minimum]", 0}, {"[Maximum]", "1"}},
+                                  {{"[Order]", 1}, {"[Minimum]", 6}, {"[Maximum]", 8}},
+                                  {{"[Order]", 2}, {"[Minimum]", 20}, {"[Maximum]", 19}},
+                                  {{"[Order]", 3}, {"[Minimum]", "low"}, {"[Maximum]", 40}}}));
+  EXPECT_EQ(data(), (Data{32, 7, 0, 1, 6, 8}));
+  EXPECT_EQ(list.ListIndex(), -1);
+  parameter.Update();  // the value is 0
+  EXPECT_EQ(list.ListIndex(), 2);
+
+  parameter.Remove(32);
+  parameter.Remove(99);
+  EXPECT_EQ(data(), (Data{7, 0, 1, 6, 8}));
+  EXPECT_EQ(list.ListIndex(), 1);
+  parameter.Update();
+  EXPECT_EQ(messages(), Messages{});
+
+  parameter.Limits(ListedRecords({{{"[Minimum]", -32768}, {"[Maximum]", 32767}}}));
+  EXPECT_EQ(list.ListCount(), 65536);
+}
+
+TEST_F(EnumeratedParameterTest, BadLimitsAndAMissingListAreReportedAndChangeNothing) {
+  bind();
+  parameter.Limits(ListedRecords({{{"[Minimum]", 10}, {"[Maximum]", 12}}, {{"[Minimum]", 10}}}));
+  parameter.Limits(ListedRecords({{{"[Minimum]", 10}, {"[Maximum]", 40000}}}));
+  EXPECT_EQ(data(), (Data{32, 0, 1, 2, 3}));
+
+  parameter.ComboBox(nullptr);
+  parameter.Add(5);
+  parameter.Remove(5);
+  parameter.Update();
+  parameter.Click();
+  parameter.value(2);  // kept for the list to come
+  EXPECT_EQ(
+      messages(),
+      (Messages{"clsEnumeratedParameter::Limits()...\rInvalid procedure call or argument",
+                "clsEnumeratedParameter::Limits()...\rOverflow",
+                "clsEnumeratedParameter::Add()...\rObject variable or With block variable not set",
+                "clsEnumeratedParameter::Remove()...\rObject variable or With block variable not set"}));
+  parameter.ComboBox(&list);
+  EXPECT_EQ(list.ListIndex(), 3);
+}
+
+TEST_F(EnumeratedParameterTest, AnotherKindOfListIsReportedAndWorks) {
+  ItemList simple(ControlKind::ComboBox, "SimpleCombo", ListStyle::SimpleCombo);
+  parameter.parameterType(500);
+  parameter.ComboBox(&simple);
+  EXPECT_EQ(messages(), Messages{"clsEnumeratedParameter::ComboBox() expects a drop down list\r"});
+  EXPECT_EQ(simple.ListCount(), 5);
+}
+
+TEST_F(EnumeratedParameterTest, EnabledAndVisibleReachListAndLabel) {
+  parameter.Label(&label);
+  EXPECT_FALSE(parameter.Enabled());
+  parameter.ComboBox(&list);
+  EXPECT_TRUE(parameter.Enabled());
+  parameter.Enabled(false);
+  parameter.Visible(false);
+  EXPECT_FALSE(parameter.Enabled() || list.Enabled() || label.Enabled());
+  EXPECT_FALSE(parameter.Visible() || list.Visible() || label.Visible());
+}
+
+}  // namespace
+}  // namespace frontpanels
