@@ -141,8 +141,9 @@ TEST(ResultReader, RefusesWhatTheBufferLiesAboutAndLeavesTheCursor) {
 
 TEST(ResultReader, RefusesACursorAndACountThatNameNoStretchOfTheBuffer) {
   const Bytes buffer(4);
-  for (const Cursor& wrong : {Cursor(-1, 2), Cursor(5, 0), Cursor(4, 1), Cursor(0, 5), Cursor(0, -1),
-                              Cursor(kLargest, kLargest), Cursor(kSmallest, 4), Cursor(5, kSmallest)}) {
+  for (const Cursor& wrong :
+       {Cursor(-1, 2), Cursor(5, 0), Cursor(4, 1), Cursor(0, 5), Cursor(0, -1), Cursor(3, -1),
+        Cursor(kLargest, kLargest), Cursor(kSmallest, 4), Cursor(5, kSmallest)}) {
     Cursor cursor = wrong;
     EXPECT_EQ(errorOf([&] { R(buffer, cursor.first, cursor.second); }), kOutOfRange) << wrong.first;
     cursor = {0, 4};
