@@ -1,0 +1,166 @@
+// Writes what each fuzz target starts from into a folder a target: result buffers as hosts send them, and the
+// same with something wrong.
+#include <algorithm>
+#include <array>
+#include <cstdio>
+#include <filesystem>
+#include <fstream>
+#include <string>
+#include <vector>
+
+#include "platform/result_reader.h"
+#include "platform/result_writer.h"
+
+namespace frontpanels::fuzz {
+namespace {
+
+using Bytes = std::vector<std::uint8_t>;
+
+struct Seed {
+  std::string name;
+  Bytes bytes;
+};
+using Seeds = std::vector<Seed>;
+
+constexpr std::int32_t kHardwareId = 7;
+constexpr std::int32_t kMeasurementId = 100;
+constexpr std::int32_t kSweep = 25;
+constexpr std::int32_t kOther = 50;
+constexpr std::size_t kLengthAt = 16;  // of the first record: behind four ids
+constexpr std::size_t kCountAt = 18;   // of its array
+
+void append(Bytes& bytes, const Bytes& more) { bytes.insert(bytes.end(), more.begin(), more.end()); }
+
+// --- Result buffers
+
+void sweepRecord(ResultWriter& writer, std::size_t points) {
+  std::vector<float> levels(points, -80);
+  if (points > 2) levels[1] = NotANumber();
+  writer.BeginRecord(kSweep);
+  writer.Float32Array(levels);
+  writer.EndRecord();
+}
+
+void mixedRecord(ResultWriter& writer) {
+  writer.BeginRecord(kOther);
+  writer.Int8(-1);
+  writer.UInt8(2);
+  writer.Int16(-3);
+  writer.Int32(4);
+  writer.Float32(0.5F);
+  writer.Float64(0.25);
+  writer.Text("dBµV");
+  writer.Float64Array(std::array{1.0, 2.0});
+  writer.Array(Variant::Bytes{1, 2, 3});
+  writer.Array(Variant::Int16s{1, -1});
+  writer.Array(Variant::Int32s{});
+  writer.Array(Variant::Singles{1.5F});
+  writer.Array(Variant::Doubles{1.5});
+  writer.EndRecord();
+}
+
+// Measurements of sub-measurements of records, as many on each level.
+template <class Record>
+Bytes buffer(int measurements, int subMeasurements, int records, Record record) {
+  ResultWriter writer;
+  writer.HardwareId(kHardwareId);
+  for (int m = 0; m < measurements; ++m) {
+    writer.BeginMeasurement(kMeasurementId + m);
+    for (int s = 1; s <= subMeasurements; ++s) {
+      writer.BeginSubMeasurement(s);
+      for (int r = 0; r < records; ++r) record(writer);
+      writer.EndSubMeasurement();
+    }
+    writer.EndMeasurement();
+  }
+  return writer.Bytes();
+}
+
+Seeds wholeBuffers() {
+  const auto sweep = [](std::size_t points) {
+    return [points](ResultWriter& writer) { sweepRecord(writer, points); };
+  };
+  const auto both = [](ResultWriter& writer) {
+    mixedRecord(writer);
+    sweepRecord(writer, 3);
+  };
+  return {{"empty", buffer(0, 0, 0, mixedRecord)},
+          {"empty_measurement", buffer(2, 0, 0, mixedRecord)},
+          {"empty_sub_measurement", buffer(1, 2, 0, mixedRecord)},
+          {"three_levels", buffer(1, 1, 1, sweep(3))},
+          {"no_level", buffer(1, 1, 1, sweep(0))},
+          {"whole_sweep", buffer(1, 1, 1, sweep(513))},
+          {"one_level_too_many", buffer(1, 1, 1, sweep(514))},
+          {"mixed", buffer(1, 1, 1, mixedRecord)},
+          {"several_records", buffer(1, 1, 3, both)},
+          {"nested", buffer(2, 2, 2, both)}};
+}
+
+Bytes patched(Bytes bytes, std::size_t at, int value) {
+  bytes[at] = static_cast<std::uint8_t>(value);
+  bytes[at + 1] = static_cast<std::uint8_t>(value >> 8);
+  return bytes;
+}
+
+Seeds damagedBuffers() {
+  const Bytes whole = buffer(1, 1, 2, [](ResultWriter& writer) { sweepRecord(writer, 3); });
+  Seeds seeds;
+  for (const std::size_t size : {0, 3, 4, 8, 12, 15, 16, 17, 18, 19, 20, 23, 31, 32, 35, 36})
+    seeds.push_back({"cut_at_" + std::to_string(size), Bytes(whole.begin(), whole.begin() + size)});
+  for (const int length : {-32768, -1, 0, 1, 13, 15, 30, 32767})
+    seeds.push_back({"length_" + std::to_string(length), patched(whole, kLengthAt, length)});
+  for (const int count : {-32768, -1, 0, 2, 4, 7, 32767})
+    seeds.push_back({"count_" + std::to_string(count), patched(whole, kCountAt, count)});
+  return seeds;
+}
+
+Seeds buffers() {
+  Seeds seeds = wholeBuffers();
+  std::ranges::move(damagedBuffers(), std::back_inserter(seeds));
+  return seeds;
+}
+
+// --- Targets
+
+// Reads by their places in the table of result_reader_fuzz.cpp.
+Seeds resultReaderSeeds() {
+  const Bytes ids{0, 1, 2, 4, 3, 8};  // down to a record's length
+  const Bytes inARecord[] = {
+      {14, 4, 3, 2, 1}, {16, 3, 2, 1}, {9, 10, 8, 7, 6, 5, 11, 15, 18, 18, 18, 18, 18}, {12, 13, 17}};
+  Seeds seeds;
+  for (std::size_t i = 0; i < std::size(inARecord); ++i) {
+    Bytes script = ids;
+    append(script, inARecord[i]);
+    for (const Seed& seed : buffers()) {
+      Bytes input{static_cast<std::uint8_t>(script.size())};
+      append(input, script);
+      input.push_back(0);  // the cursor at the buffer's begin
+      append(input, seed.bytes);
+      seeds.push_back({seed.name + "_" + std::to_string(i), input});
+    }
+  }
+  return seeds;
+}
+
+bool write(const std::filesystem::path& folder, const Seeds& seeds) {
+  std::filesystem::create_directories(folder);
+  return std::ranges::all_of(seeds, [&folder](const Seed& seed) {
+    std::ofstream file(folder / seed.name, std::ios::binary);
+    file.write(reinterpret_cast<const char*>(seed.bytes.data()),
+               static_cast<std::streamsize>(seed.bytes.size()));
+    return file.good();
+  });
+}
+
+}  // namespace
+}  // namespace frontpanels::fuzz
+
+int main(int argc, char** argv) {
+  using namespace frontpanels::fuzz;
+  if (argc != 2) {
+    std::fprintf(stderr, "usage: make_seeds FOLDER\n");
+    return 2;
+  }
+  const std::filesystem::path corpus(argv[1]);
+  return write(corpus / "result_reader_fuzz", resultReaderSeeds()) ? 0 : 1;
+}
