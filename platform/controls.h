@@ -6,6 +6,7 @@
 
 #include <cstdint>
 #include <functional>
+#include <memory>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -33,6 +34,14 @@ struct ControlPlace {
   friend bool operator==(const ControlPlace&, const ControlPlace&) = default;
 };
 
+// Whether the keyboard focus may rest on a kind, whether it shows a caption, and whether others lie in it.
+struct ControlFacets {
+  bool takesFocus = false;
+  bool hasCaption = false;
+  bool contains = false;
+};
+[[nodiscard]] ControlFacets facetsOf(ControlKind kind) noexcept;
+
 // Which part of a model has changed; its window reads the new state from the model.
 enum class ControlChange : std::uint8_t {
   Caption,
@@ -59,7 +68,22 @@ class ControlPeer {
   virtual void beep() = 0;
 };
 
-// What all kinds have. The owner (a panel's set of controls) keeps models and peers alive together.
+class Control;
+
+// What a control asks of the set that it belongs to.
+class ControlScope {
+ public:
+  virtual ~ControlScope() = default;
+
+  [[nodiscard]] virtual Control* focused() const noexcept = 0;
+  // Moves the keyboard focus where there is no window to do it.
+  virtual void moveFocus(Control& to) = 0;
+  // Moves the focus on from a control that had it and was disabled or hidden.
+  virtual void leave(Control& unusable) = 0;
+};
+
+// What all kinds have. The owner (a panel's set of controls) keeps models and peers alive together, and for
+// as long as one of their events lasts.
 class Control {
  public:
   Control(ControlKind kind, std::string name) : kind_(kind), name_(std::move(name)) {}
@@ -73,9 +97,9 @@ class Control {
   [[nodiscard]] const std::string& Caption() const noexcept { return caption_; }
   void Caption(std::string caption) { set(caption_, std::move(caption), ControlChange::Caption); }
   [[nodiscard]] bool Enabled() const noexcept { return enabled_; }
-  void Enabled(bool enabled) { set(enabled_, enabled, ControlChange::Enabled); }
+  void Enabled(bool enabled) { setUsability(enabled_, enabled, ControlChange::Enabled); }
   [[nodiscard]] bool Visible() const noexcept { return visible_; }
-  void Visible(bool visible) { set(visible_, visible, ControlChange::Visible); }
+  void Visible(bool visible) { setUsability(visible_, visible, ControlChange::Visible); }
   [[nodiscard]] bool Bold() const noexcept { return bold_; }
   void Bold(bool bold) { set(bold_, bold, ControlChange::Font); }
   [[nodiscard]] bool Italic() const noexcept { return italic_; }
@@ -83,14 +107,22 @@ class Control {
   [[nodiscard]] const ControlPlace& place() const noexcept { return place_; }
   void Move(const ControlPlace& place) { set(place_, place, ControlChange::Place); }
 
+  // The frame or picture that it lies in, null on the panel itself.
+  [[nodiscard]] Control* parent() const noexcept { return parent_; }
+  // Whether a user can reach it: it and all that it lies in are visible, and enabled.
+  [[nodiscard]] bool reallyVisible() const noexcept;
+  [[nodiscard]] bool reallyEnabled() const noexcept;
+  [[nodiscard]] bool usable() const noexcept { return reallyVisible() && reallyEnabled(); }
+
   [[nodiscard]] bool hasFocus() const noexcept { return focused_; }
-  // Asks for the keyboard focus: the window's, or without one the model takes it at once.
-  void SetFocus() {
-    if (peer_ != nullptr)
-      peer_->takeFocus();
-    else
-      focusChanged(true);
-  }
+  // Asks for the keyboard focus: the window's, or without one the model takes it at once. Nothing where a
+  // user could not have it.
+  void SetFocus();
+
+  // What a user does. Nothing happens to a control that is not usable; the focus is moved by the caller.
+  virtual void userClick();
+  // One key that types `code`: raises KeyDown and KeyPress, and has its effect unless it was consumed.
+  void userKey(std::int16_t code);
 
   // Events. A key press may be consumed by setting its character to 0.
   std::function<void()> GotFocus;
@@ -98,6 +130,12 @@ class Control {
   std::function<void(std::int16_t& character)> KeyPress;
   std::function<void(std::int16_t keyCode, std::int16_t shift)> KeyDown;
   std::function<void()> Click;
+
+  // The set's side.
+  void belongTo(ControlScope* scope, Control* parent) noexcept {
+    scope_ = scope;
+    parent_ = parent;
+  }
 
   // The window's side: raise what the user did.
   void peer(ControlPeer* peer) noexcept { peer_ = peer; }
@@ -121,8 +159,12 @@ class Control {
   static void raise(const std::function<void()>& event) {
     if (event) event();
   }
+  // What a typed character does that nobody has consumed.
+  virtual void applyKey(std::int16_t /*character*/) {}
 
  private:
+  void setUsability(bool& field, bool value, ControlChange change);
+
   ControlKind kind_;
   std::string name_;
   std::string caption_;
@@ -133,6 +175,24 @@ class Control {
   bool focused_ = false;
   ControlPlace place_;
   ControlPeer* peer_ = nullptr;
+  ControlScope* scope_ = nullptr;
+  Control* parent_ = nullptr;
+};
+
+class Label final : public Control {
+ public:
+  explicit Label(std::string name) : Control(ControlKind::Label, std::move(name)) {}
+};
+
+class Frame final : public Control {
+ public:
+  explicit Frame(std::string name) : Control(ControlKind::Frame, std::move(name)) {}
+};
+
+// An area of its own, which cuts off what lies in it.
+class Picture final : public Control {
+ public:
+  explicit Picture(std::string name) : Control(ControlKind::Picture, std::move(name)) {}
 };
 
 // An edit field of one line, UTF-8.
@@ -141,26 +201,26 @@ class TextBox : public Control {
   explicit TextBox(std::string name) : Control(ControlKind::TextBox, std::move(name)) {}
 
   [[nodiscard]] const std::string& Text() const noexcept { return text_; }
-  // Set by the program; raises Change when it differs.
-  void Text(std::string text) {
-    if (text == text_) return;
-    text_ = std::move(text);
-    tell(ControlChange::Text);
-    raise(Change);
+  // Set by the program; raises Change when it differs. The caret stands behind the text.
+  void Text(std::string text);
+  // Selects the whole text, as on entering a field: what is typed next replaces it.
+  void selectAll() {
+    allSelected_ = true;
+    tell(ControlChange::Selection);
   }
-  // Selects the whole text, as on entering a field.
-  void selectAll() { tell(ControlChange::Selection); }
+  [[nodiscard]] bool allSelected() const noexcept { return allSelected_; }
   // What the user made of the text, key by key or by pasting.
-  void userText(std::string text) {
-    if (text == text_) return;
-    text_ = std::move(text);
-    raise(Change);
-  }
+  void userText(std::string text);
 
   std::function<void()> Change;
 
+ protected:
+  // Without a window to edit in: the caret stands behind the text, or all of it is selected.
+  void applyKey(std::int16_t character) override;
+
  private:
   std::string text_;
+  bool allSelected_ = false;
 };
 
 class SpinButton : public Control {
@@ -170,10 +230,67 @@ class SpinButton : public Control {
   std::function<void()> SpinUp;
   std::function<void()> SpinDown;
 
-  // One click of the user on an arrow; nothing while the button is disabled.
+  // The text box whose value it steps.
+  [[nodiscard]] TextBox* buddy() const noexcept { return buddy_; }
+  void buddy(TextBox* box) noexcept { buddy_ = box; }
+
+  // One click of the user on an arrow; nothing while the button cannot be reached.
   void press(bool up) {
-    if (Enabled()) raise(up ? SpinUp : SpinDown);
+    if (usable()) raise(up ? SpinUp : SpinDown);
   }
+
+ private:
+  TextBox* buddy_ = nullptr;
+};
+
+class CheckBox final : public Control {
+ public:
+  explicit CheckBox(std::string name) : Control(ControlKind::CheckBox, std::move(name)) {}
+
+  // 0 or 1; any other value raises "Invalid procedure call or argument". A change raises Click, the program's
+  // as well as the user's.
+  [[nodiscard]] std::int16_t Value() const noexcept { return value_; }
+  void Value(std::int16_t value);
+  void userClick() override;
+
+ protected:
+  void applyKey(std::int16_t character) override;
+
+ private:
+  std::int16_t value_ = 0;
+};
+
+// One of those in the same frame, of which at most one is chosen.
+class OptionButton final : public Control {
+ public:
+  explicit OptionButton(std::string name) : Control(ControlKind::OptionButton, std::move(name)) {}
+
+  // Choosing one gives up the choice of the others and raises Click of the chosen one alone.
+  [[nodiscard]] bool Value() const noexcept { return chosen_; }
+  void Value(bool chosen);
+  void userClick() override;
+
+  // All options of its frame, in the order of the table.
+  using Group = std::vector<OptionButton*>;
+  void group(std::shared_ptr<const Group> group) noexcept { group_ = std::move(group); }
+  [[nodiscard]] const Group* group() const noexcept { return group_.get(); }
+
+ protected:
+  void applyKey(std::int16_t character) override;
+
+ private:
+  void show(bool chosen);
+
+  std::shared_ptr<const Group> group_;
+  bool chosen_ = false;
+};
+
+class PushButton final : public Control {
+ public:
+  explicit PushButton(std::string name) : Control(ControlKind::PushButton, std::move(name)) {}
+
+ protected:
+  void applyKey(std::int16_t character) override;
 };
 
 enum class ListStyle : std::uint8_t { DropDownCombo, SimpleCombo, DropDownList };
@@ -199,11 +316,15 @@ class ItemList : public Control {
   void AddItem(std::string text, std::int32_t data, std::int32_t index);
   void RemoveItem(std::int32_t index);
   void Clear();
+  // The selected item's text, empty while there is none.
+  [[nodiscard]] std::string Text() const { return listIndex_ < 0 ? std::string() : item(listIndex_).text; }
   // -1 while nothing is selected. Setting another index raises Click, as the program's choice is one.
   [[nodiscard]] std::int32_t ListIndex() const noexcept { return listIndex_; }
   void ListIndex(std::int32_t index);
   // The user's choice of an item, also of the one that is chosen already: raises Click.
   void userChoice(std::int32_t index);
+  // Chooses what is chosen already.
+  void userClick() override;
 
  private:
   ListStyle style_;
