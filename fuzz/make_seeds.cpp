@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <array>
 #include <cstdio>
+#include <cstring>
 #include <filesystem>
 #include <fstream>
 #include <string>
@@ -142,6 +143,91 @@ Seeds resultReaderSeeds() {
   return seeds;
 }
 
+// Calls by their places in the table of entry_points_fuzz.cpp, values by theirs in fuzz_variant.cpp.
+enum class Call : std::uint8_t { vfpOp, vfpSet, Publish, Resize, Paint, MouseDown, MouseMove, MouseUp };
+enum class Kind : std::uint8_t { Empty = 0, Boolean = 2, Int16 = 4, Double = 8, Text = 9, Singles = 17 };
+constexpr std::uint8_t kKeyDown = 11;
+constexpr std::uint8_t kAddMarker = 12;
+constexpr std::uint8_t kMarkerToMax = 13;
+constexpr std::uint8_t kMarkerToMin = 14;
+constexpr std::uint8_t kShown = 16;
+constexpr std::uint8_t kKinds = 20;
+
+constexpr std::int16_t kParameterCodes[] = {11,  13,  14,  15,  18,  43,  44,  45,  312, 314, 315, 322,
+                                            700, 701, 702, 703, 704, 705, 706, 714, 716, 717, 719, 722,
+                                            726, 727, 735, 736, 737, 740, 741, 742, 743, 744, 799, 810};
+
+template <class T>
+Bytes raw(T value) {
+  Bytes bytes(sizeof(T));
+  std::memcpy(bytes.data(), &value, sizeof(T));
+  return bytes;
+}
+
+template <class... Parts>
+Bytes joined(const Parts&... parts) {
+  Bytes bytes;
+  (append(bytes, raw(parts)), ...);
+  return bytes;
+}
+
+Bytes operation(std::int16_t code, const Bytes& parameter) {
+  Bytes bytes = joined(Call::vfpOp, kHardwareId, code);
+  append(bytes, parameter);
+  return bytes;
+}
+
+Bytes parameter(std::int16_t code, const Bytes& value) {
+  Bytes bytes = joined(Call::vfpSet, kHardwareId, code, std::int16_t{0});
+  append(bytes, value);
+  return bytes;
+}
+
+Bytes mouse(Call event, std::int16_t xTwips, std::int16_t yTwips) {
+  return joined(event, std::int8_t{1}, std::int8_t{0}, xTwips, yTwips);
+}
+
+// A panel with a trace and levels in it.
+Bytes running() {
+  Bytes bytes = joined(kShown, std::uint8_t{1});
+  append(bytes, operation(10, joined(Kind::Int16, std::int16_t{10})));
+  append(bytes, operation(12, joined(Kind::Empty)));
+  append(bytes, joined(Call::Publish, Kind::Singles, std::uint8_t{16}));
+  for (int i = 0; i < 16; ++i) append(bytes, raw(static_cast<float>(-100 + 7 * (i % 5))));
+  return bytes;
+}
+
+Bytes session(std::initializer_list<Bytes> calls) {
+  Bytes bytes = running();
+  for (const Bytes& call : calls) append(bytes, call);
+  append(bytes, joined(Call::Paint));
+  return bytes;
+}
+
+Seeds entryPointSeeds() {
+  const Bytes one = joined(Kind::Int16, std::int16_t{1});
+  Seeds seeds{
+      {"markers", session({joined(kAddMarker), joined(kMarkerToMax), joined(kAddMarker), joined(kMarkerToMin),
+                           joined(kKeyDown, std::int16_t{39}, std::int8_t{0})})},
+      {"drag", session({joined(kAddMarker), mouse(Call::MouseDown, 1800, 1300),
+                        mouse(Call::MouseMove, 900, 1300), mouse(Call::MouseUp, 900, 1300)})},
+      {"two_traces", session({running(), joined(Call::Resize, std::int16_t{320}, std::int16_t{200})})}};
+  for (std::int16_t code = 0; code <= 22; ++code)
+    seeds.push_back({"operation_" + std::to_string(code), session({operation(code, one)})});
+  for (const std::int16_t code : kParameterCodes) {
+    const std::string name = "parameter_" + std::to_string(code);
+    seeds.push_back({name + "_number", session({parameter(code, joined(Kind::Double, 2.5))})});
+    seeds.push_back({name + "_text", session({parameter(code, joined(Kind::Text, std::uint8_t{2}, '1', '2')),
+                                              parameter(code, joined(Kind::Boolean, std::uint8_t{1}))})});
+  }
+  for (std::uint8_t kind = 0; kind < kKinds; ++kind) {
+    Bytes value{kind};
+    append(value, joined(std::uint8_t{2}, 1.5, 2.5));
+    seeds.push_back({"value_" + std::to_string(kind), session({parameter(717, value)})});
+  }
+  return seeds;
+}
+
 bool write(const std::filesystem::path& folder, const Seeds& seeds) {
   std::filesystem::create_directories(folder);
   return std::ranges::all_of(seeds, [&folder](const Seed& seed) {
@@ -162,5 +248,7 @@ int main(int argc, char** argv) {
     return 2;
   }
   const std::filesystem::path corpus(argv[1]);
-  return write(corpus / "result_reader_fuzz", resultReaderSeeds()) ? 0 : 1;
+  const bool written = write(corpus / "result_reader_fuzz", resultReaderSeeds()) &&
+                       write(corpus / "entry_points_fuzz", entryPointSeeds());
+  return written ? 0 : 1;
 }

@@ -1,0 +1,43 @@
+#include "fuzz/panel_under_test.h"
+
+#include <algorithm>
+
+#include "framework/support/error_handler.h"
+#include "fuzz/fuzz_input.h"
+
+namespace frontpanels::fuzz {
+namespace {
+
+// One for all inputs: looking for fonts takes longer than anything that a panel does.
+RasterGdi& gdi() {
+  static RasterGdi drawing;
+  return drawing;
+}
+
+DcHandle screen() {
+  static const DcHandle dc = gdi().createScreen(PanelUnderTest::kViewPx);
+  return dc;
+}
+
+std::size_t objects() { return gdi().liveObjects() + gdi().liveDcs(); }
+
+}  // namespace
+
+PanelUnderTest::PanelUnderTest() : view(screen(), kViewPx), objectsBefore_(objects()) {
+  messageLog().clear();
+  panel_ = std::make_unique<SpectrumView>(PanelEnvironment{gdi(), windowing, view, hub, ScreenMetrics{}, ""},
+                                          owner, owner);
+  panel_->Form_Resize();
+}
+
+PanelUnderTest::~PanelUnderTest() {
+  panel_.reset();
+  require(objects() == objectsBefore_, "a panel deletes what it has created");
+  // By this text `guard` reports what is no run-time error.
+  const auto& messages = messageLog().messages();
+  require(std::none_of(messages.begin(), messages.end(),
+                       [](const std::string& text) { return text.ends_with("Internal error"); }),
+          "every failure is one that the run-time knows");
+}
+
+}  // namespace frontpanels::fuzz
