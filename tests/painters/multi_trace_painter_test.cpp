@@ -11,44 +11,45 @@ namespace {
 using testing::kGap;
 using testing::kGreen;
 using testing::kRed;
-using Lines = std::vector<std::vector<Point>>;
-using Messages = std::vector<std::string>;
+using Singles = Variant::Singles;
+using Doubles = Variant::Doubles;
+constexpr float kInfinite = std::numeric_limits<float>::infinity();
 
 class MultiTracePainterTest : public testing::PainterTest {
  protected:
-  // Trace ids in slot order, and the PN of each.
-  [[nodiscard]] std::vector<std::int16_t> pns() const {
-    std::vector<std::int16_t> all;
-    for (std::int16_t i = 0; i < painter.numberOfTraces(); ++i) all.push_back(painter.pnOffset(i));
-    return all;
+  // The PN of each slot / the trace ids, the least recently used first.
+  [[nodiscard]] std::string slots() const {
+    std::string text;
+    for (std::int16_t i = 0; i < painter.numberOfTraces(); ++i)
+      text += std::to_string(painter.pnOffset(i)) + " ";
+    text += "/";
+    for (const std::int16_t id : painter.leastRecentlyUsed()) text += " " + std::to_string(id);
+    return text;
   }
 };
 
 TEST_F(MultiTracePainterTest, ATraceIsAppendedUntilThePainterIsFullThenTheLeastRecentlyUsedGoes) {
   for (std::int16_t pn = 1; pn <= 5; ++pn) EXPECT_EQ(painter.addATrace(0, pn, pn * 0.5, 10), pn - 1);
   EXPECT_EQ(painter.addATrace(0, 1, 3, 8), 0);  // is there and refilled in its slot
-  EXPECT_EQ(painter.numberOfTraces(), 5);
   EXPECT_EQ(painter.traceValue(0), 3);
   EXPECT_EQ(painter.traceSize(), 8);
   EXPECT_EQ(painter.traceOrientation(0), TraceOrientation::FromLeft);
-  EXPECT_EQ(painter.leastRecentlyUsed(), (std::vector<std::int16_t>{0, 1, 2, 3, 4}));
+  EXPECT_EQ(slots(), "1 2 3 4 5 / 0 1 2 3 4");
 
   EXPECT_EQ(painter.addATrace(0, 6, 9.5, 20, std::int16_t{77}), 0);
-
-  EXPECT_EQ(pns(), (std::vector<std::int16_t>{6, 2, 3, 4, 5}));
   EXPECT_EQ(painter.traceValue(0), 9.5);
   EXPECT_EQ(painter.traceOrientation(0), TraceOrientation::Replaced);
   EXPECT_EQ(painter.addATrace(0, 7, 0, 20), 1);  // keeps the slot's trace id
-  EXPECT_EQ(painter.leastRecentlyUsed(), (std::vector<std::int16_t>{2, 3, 4, 77, 1}));
+  EXPECT_EQ(slots(), "6 7 3 4 5 / 2 3 4 77 1");
 }
 
 TEST_F(MultiTracePainterTest, SomePnsGoUnderAnotherByTheMode) {
   // Mode, PN and the PN it is looked up under.
-  const std::vector<std::array<std::int16_t, 3>> cases = {
+  const std::vector<std::array<std::int16_t, 3>> rows = {
       {0, 106, 106}, {0, 107, 106}, {0, 111, 106}, {1, 106, 107}, {1, 107, 107}, {1, 111, 107},
       {0, 25, 25},   {0, 214, 25},  {1, 25, 214},  {1, 214, 214}, {2, 26, 26},
   };
-  for (const auto& [mode, pn, lookedUp] : cases) {
+  for (const auto& [mode, pn, lookedUp] : rows) {
     clsMultiTracePainter fresh(gdi);
     fresh.addNewTraceAtEnd(999, 0, 1);
     fresh.addNewTraceAtEnd(lookedUp, 0, 1);
@@ -59,58 +60,60 @@ TEST_F(MultiTracePainterTest, SomePnsGoUnderAnotherByTheMode) {
   EXPECT_EQ(painter.numberOfTraces(), 0);
 }
 
-TEST_F(MultiTracePainterTest, ATraceIdRefillsItsSlotsAndSelectsAnOnlyTrace) {
+TEST_F(MultiTracePainterTest, ATraceIdRefillsItsSlots) {
   painter.addNewTraceAtEnd(1, 0, 5, std::int16_t{40});
   painter.addNewTraceAtEnd(2, 0, 5, std::int16_t{50});
   painter.addNewTraceAtEnd(3, 0, 5, std::int16_t{40});
-
   painter.addATrace(7, 106, 2.5, 6, std::int16_t{40});  // the alias rule is for look-ups by PN
-
-  EXPECT_EQ(pns(), (std::vector<std::int16_t>{106, 2, 106}));
+  EXPECT_EQ(slots(), "106 2 106 / 40 50 40");
   EXPECT_EQ(painter.findATrace(106), 2);  // the last one that has it
   EXPECT_EQ(painter.findATrace(9), -1);
 }
 
 TEST_F(MultiTracePainterTest, RemovingATraceTakesItsMarkersAndItsPlaceInTheUsageOrder) {
-  painter.addATrace(0, 1, 0, 5);
-  painter.addATrace(0, 2, 0, 5);
-  painter.addATrace(0, 3, 0, 5);
+  for (std::int16_t pn = 1; pn <= 3; ++pn) painter.addATrace(0, pn, 0, 5);
   const MarkerPointer gone = addMarker("1", 0, 1);
   const MarkerPointer kept = addMarker("2", 0, 2);
   painter.activeMarker(gone);
   painter.selectedTraceIndex(2);
 
   painter.removeATrace(1);
-
-  EXPECT_EQ(pns(), (std::vector<std::int16_t>{1, 3}));
-  EXPECT_EQ(painter.leastRecentlyUsed(), (std::vector<std::int16_t>{0, 2}));
+  EXPECT_EQ(slots(), "1 3 / 0 2");
   EXPECT_EQ(painter.activeMarker(), nullptr);
   EXPECT_EQ(painter.selectedTraceIndex(), 1);
   EXPECT_EQ(painter.findTraceByMarker(kept), 1);
   EXPECT_EQ(kept->traceId, 1);
 
-  painter.removeATrace(1);
-  EXPECT_EQ(messages(), Messages{"removeATrace() ... can't find trace\r"});
-
   painter.activeMarker(kept);
+  painter.removeATrace(1);
+  EXPECT_EQ(said(), "removeATrace() ... can't find trace\r");
   painter.numberOfTraces(1);
   EXPECT_EQ(painter.activeMarker(), nullptr);
   EXPECT_EQ(painter.selectedTraceIndex(), 0);
 }
 
-TEST_F(MultiTracePainterTest, BadIndicesAreReportedAndChangeNothing) {
+TEST_F(MultiTracePainterTest, BadInputIsReportedAndChangesNothing) {
   EXPECT_EQ(painter.addNewTraceAtIndex(0, 1, 1, 1), -1);
   EXPECT_EQ(painter.addNewTraceAtExistingPN(1, 1, 1), -1);
   painter.selectedTraceIndex(3);
   painter.trace(Variant(5.0));
-
   EXPECT_EQ(painter.numberOfTraces(), 1);  // a place for the values, which were none
   EXPECT_EQ(painter.selectedTraceIndex(), 0);
   EXPECT_TRUE(painter.trace().isNull());
-  EXPECT_EQ(messages(), (Messages{"addNewTraceAtIndex()...\rSubscript out of range",
-                                  "addNewTraceAtExistingPN()...\rSubscript out of range",
-                                  "clsMultiTracePainter::selectedTraceIndex() ...\rSubscript out of range",
-                                  "clsMultiTracePainter::trace() ...\rType mismatch"}));
+  EXPECT_EQ(said(),
+            "addNewTraceAtIndex()...\rSubscript out of range\n"
+            "addNewTraceAtExistingPN()...\rSubscript out of range\n"
+            "clsMultiTracePainter::selectedTraceIndex() ...\rSubscript out of range\n"
+            "clsMultiTracePainter::trace() ...\rType mismatch");
+
+  painter.gridScaleTop(-20);
+  painter.gridScaleTop(std::numeric_limits<double>::infinity());
+  painter.verticalResolution(0);
+  painter.numberOfVerticalDivisions(1001);
+  EXPECT_EQ(painter.gridScaleTop(), -20);
+  EXPECT_EQ(painter.verticalResolution(), 10);
+  EXPECT_EQ(painter.numberOfVerticalDivisions(), 0);
+  EXPECT_EQ(messages().size(), 3U);
 }
 
 TEST_F(MultiTracePainterTest, TheOffsetIsAddedOnceToThePointsOfEveryTraceWhenTheFirstHasNewValues) {
@@ -120,128 +123,86 @@ TEST_F(MultiTracePainterTest, TheOffsetIsAddedOnceToThePointsOfEveryTraceWhenThe
   painter.trace(1, Variant(Variant::Int16s{4, 5, 6}));
   painter.useOffset(true);
   painter.processData();  // trace 0 is null
-  painter.trace(0, Variant(Variant::Singles{1, 2, 3}));
+  painter.trace(0, Variant(Singles{1, 2, 3}));
   painter.useOffset(false);
   painter.processData();
-  EXPECT_EQ(painter.trace(), Variant(Variant::Singles{1, 2, 3}));
+  EXPECT_EQ(painter.trace(), Variant(Singles{1, 2, 3}));
 
   painter.useOffset(true);
   painter.processData();
   painter.processData();
-  EXPECT_EQ(painter.trace(), Variant(Variant::Singles{1.5F, 2.5F}));  // size + 1 elements
+  EXPECT_EQ(painter.trace(), Variant(Singles{1.5F, 2.5F}));  // size + 1 elements
   painter.selectedTraceIndex(1);
-  EXPECT_EQ(painter.trace(), Variant(Variant::Doubles{4.5, 5.5, 6.5}));
+  EXPECT_EQ(painter.trace(), Variant(Doubles{4.5, 5.5, 6.5}));
 }
 
 TEST_F(MultiTracePainterTest, PointsFollowTheAxisFromTheLeftEdgeWithinThePlot) {
-  give({0, -100, -50, -25});
-
-  paint();
-
   // x = 15 + 10 i; y = 24 + 40 - (value + 100) * 0.4
-  EXPECT_EQ(lines(), (Lines{{{15, 24}, {25, 64}, {35, 44}, {45, 34}}}));
+  EXPECT_EQ(painted({0, -100, -50, -25}), "15,24 25,64 35,44 45,34");
   EXPECT_EQ(gdi.polylines()[0].pen, (testing::PenValue{PenStyle::Solid, 1, kGreen}));
   EXPECT_EQ(gdi.polylines()[0].clip, (Rect{15, 24, 95, 65}));
   EXPECT_FALSE(painter.dataChanged());
   EXPECT_EQ(gdi.liveObjects(), 0);
-
-  gdi.clear();
   painter.numberOfMeasurements(2);  // too few for a step: that of the paint before is kept
-  give({0, -50});
-  paint();
-  EXPECT_EQ(lines(), (Lines{{{15, 24}, {25, 44}}}));
-}
+  EXPECT_EQ(painted({0, -50}), "15,24 25,44");
 
-TEST_F(MultiTracePainterTest, PositionsAreRoundedHalfToEven) {
+  painter.numberOfMeasurements(10);
   painter.gridScaleLeft(4.5F);
   painter.gridScaleRight(15.5F);
-  give({-98.75F, -96.25F, 0});
-
-  paint();
-
-  // x = 14.5, 24.5, 34.5; y = 64 - 0.5 and 64 - 1.5
-  EXPECT_EQ(lines(), (Lines{{{14, 64}, {24, 62}, {34, 24}}}));
+  // Halves go to even: x = 14.5, 24.5, 34.5; y = 64 - 0.5 and 64 - 1.5
+  EXPECT_EQ(painted({-98.75F, -96.25F, 0}), "14,64 24,62 34,24");
 }
 
 TEST_F(MultiTracePainterTest, AStripChartGrowsFromTheRightEdge) {
   painter.numberOfMeasurements(12);  // 8 pixels a step
-  give({0, 0, 0, 0, 0, 0, 0, 0, 0, 0, -100});
+  give({0, 0, -100});
   painter.traceOrientation(0, TraceOrientation::FromRight);
-
-  paint();
-
-  EXPECT_EQ(lines()[0].front(), (Point{15, 24}));
-  EXPECT_EQ(lines()[0].back(), (Point{95, 64}));
-
-  gdi.clear();
+  EXPECT_EQ(painted(), "79,24 87,24 95,64");
   painter.traceOrientation(0, TraceOrientation::Replaced);
-  painter.traceSize(2);
-  paint();
-  EXPECT_EQ(lines(), (Lines{{{15, 24}, {23, 24}, {31, 24}}}));  // from the left
+  EXPECT_EQ(painted(), "15,24 23,24 31,64");  // from the left
 }
 
 TEST_F(MultiTracePainterTest, ATraceReadsNoFurtherThanItsValuesAndGapsBreakTheLine) {
   give({0, -50, -100});
   painter.traceSize(500);
-  paint();
+  EXPECT_EQ(painted(), "15,24 25,44 35,64");
   painter.traceSize(1);
-  paint();
+  EXPECT_EQ(painted(), "15,24 25,44");
   painter.traceSize(-1);
-  paint();
-  EXPECT_EQ(lines(), (Lines{{{15, 24}, {25, 44}, {35, 64}}, {{15, 24}, {25, 44}}}));
-
-  gdi.clear();
-  const float infinite = std::numeric_limits<float>::infinity();
-  give({kGap, 0, 0, infinite, -50, -infinite, -100, -100, kGap});
-  paint();
+  EXPECT_EQ(painted(), "");
   // A value alone between gaps is a mark of one pixel.
-  EXPECT_EQ(lines(), (Lines{{{25, 24}, {35, 24}}, {{55, 44}, {56, 44}}, {{75, 64}, {85, 64}}}));
-  EXPECT_EQ(messages(), Messages{});
+  EXPECT_EQ(painted({kGap, 0, 0, kInfinite, -50, -kInfinite, -100, -100, kGap}),
+            "25,24 35,24 | 55,44 56,44 | 75,64 85,64");
+  EXPECT_EQ(said(), "");
 }
 
-TEST_F(MultiTracePainterTest, AValueFarOutsideOverflowsAndTheNextPaintTriesAgain) {
+TEST_F(MultiTracePainterTest, WhatCannotBeDrawnIsReportedAndTheNextPaintTriesAgain) {
   // 0.4 pixels a unit: y = 24 - 0.4 v. 5368709000 gives -2147483576, which fits; 5368709200 gives
   // -2147483656.
-  painter.trace(Variant(Variant::Doubles{0, 5368709000.0}));
   painter.traceSize(1);
-  paint();
-  EXPECT_EQ(lines().size(), 1U);
-  EXPECT_EQ(messages(), Messages{});
-
-  painter.trace(Variant(Variant::Doubles{0, 5368709200.0}));
-  paint();
-  EXPECT_EQ(lines().size(), 1U);
-  EXPECT_EQ(messages(), Messages{"clsMultiTracePainter::Paint() ...\rOverflow"});
+  painter.trace(Variant(Doubles{0, 5368709000.0}));
+  EXPECT_EQ(painted(), "15,24 25,-2147483576");
+  painter.trace(Variant(Doubles{0, 5368709200.0}));
+  EXPECT_EQ(painted(), "");
   EXPECT_EQ(gdi.liveObjects(), 0);
+  EXPECT_EQ(said(), "clsMultiTracePainter::Paint() ...\rOverflow");
 
-  painter.trace(Variant(Variant::Doubles{0, 1}));
-  paint();
-  EXPECT_EQ(lines().size(), 2U);
-}
+  EXPECT_NE(painted(Singles(3001, -50.0F)), "");
+  EXPECT_EQ(gdi.polylines().at(0).points.size(), 3001U);
+  EXPECT_EQ(painted(Singles(3002, -50.0F)), "");
+  EXPECT_EQ(said(), "clsMultiTracePainter::Paint() ...\rSubscript out of range");
 
-TEST_F(MultiTracePainterTest, ATraceHasAtMost3001PointsAndOtherArraysAreReportedAndDrawn) {
-  give(Variant::Singles(3001, -50.0F));
-  paint();
-  ASSERT_EQ(lines().size(), 1U);
-  EXPECT_EQ(lines()[0].size(), 3001U);
-  give(Variant::Singles(3002, -50.0F));
-  paint();
   painter.trace(Variant(Variant::Variants{Variant(std::int16_t{0}), Variant("-50"), Variant(-100.0)}));
   painter.traceSize(2);
-  paint();
-
-  EXPECT_EQ(lines().back(), (std::vector<Point>{{15, 24}, {25, 44}, {35, 64}}));
-  EXPECT_EQ(messages(),
-            (Messages{"clsMultiTracePainter::Paint() ...\rSubscript out of range",
-                      "clsMultiTracePainter::Paint() ... unrecognized array type.  Will be handled as "
-                      "Variant (SLOW!)\r"}));
+  EXPECT_EQ(painted(), "15,24 25,44 35,64");
+  EXPECT_EQ(
+      said(),
+      "clsMultiTracePainter::Paint() ... unrecognized array type.  Will be handled as Variant (SLOW!)\r");
 }
 
 TEST_F(MultiTracePainterTest, TheRangeOfTheDataCanTakeThePlaceOfTheAxisAndNeedsAnExtent) {
   painter.calcMinMax(true);
-  give({-30, -70, -50});
-  paint();
-  EXPECT_EQ(lines(), (Lines{{{15, 24}, {25, 64}, {35, 44}}}));
+  EXPECT_EQ(painted({-30, -70, -50}), "15,24 25,64 35,44");
   EXPECT_EQ(painter.activeTraceMaximumValue(), -30);
   EXPECT_EQ(painter.activeTraceMaximumIndex(), 0);
   painter.activeTraceMaximumValue(5);
@@ -251,30 +212,25 @@ TEST_F(MultiTracePainterTest, TheRangeOfTheDataCanTakeThePlaceOfTheAxisAndNeedsA
   give({-30, -20});  // new values are searched anew
   EXPECT_EQ(painter.activeTraceMaximumValue(), -20);
 
-  gdi.clear();
-  give({-50, -50});  // the largest value equals the smallest
-  paint();
+  EXPECT_EQ(painted({-50, -50}), "");  // the largest value equals the smallest
   painter.calcMinMax(false);
   painter.scaleWidth(20);  // no width left between the insets
-  paint();
+  EXPECT_EQ(painted(), "");
   painter.scaleWidth(100);
   painter.scaleHeight(9.5F);  // half a pixel less than the insets
-  paint();
-  EXPECT_EQ(lines(), Lines{});
+  EXPECT_EQ(painted(), "");
   EXPECT_TRUE(painter.dataChanged());
-
   painter.scaleHeight(10);  // a flat plot still shows its line
-  paint();
-  EXPECT_EQ(lines(), (Lines{{{15, 24}, {25, 24}}}));
+  EXPECT_EQ(painted(), "15,24 25,24");
 }
 
 TEST_F(MultiTracePainterTest, EachTraceHasItsColourAndTheSelectedOneGivesItsOwn) {
-  for (std::int16_t i = 0; i < 9; ++i) painter.addNewTraceAtEnd(i, 0, 1);
-  for (std::int16_t i = 0; i < 9; ++i) painter.trace(i, Variant(Variant::Singles{0, 0}));
+  for (std::int16_t i = 0; i < 9; ++i) {
+    painter.addNewTraceAtEnd(i, 0, 1);
+    painter.trace(i, Variant(Singles{0, 0}));
+  }
   painter.selectedTraceIndex(1);
-
   paint();
-
   std::vector<Color> colors;
   for (const testing::Call& line : gdi.polylines()) colors.push_back(line.pen.color);
   EXPECT_EQ(colors, (std::vector<Color>{kGreen, kRed, rgb(0, 0, 255), rgb(255, 255, 0), rgb(255, 255, 255),
@@ -283,23 +239,10 @@ TEST_F(MultiTracePainterTest, EachTraceHasItsColourAndTheSelectedOneGivesItsOwn)
 }
 
 TEST_F(MultiTracePainterTest, TheAxisRunsDownFromItsTopByDivisions) {
-  painter.numberOfVerticalDivisions(5);
   painter.gridScaleTop(-20);
-  painter.setDbPerDivision(8);  // -20 .. -60: 1 pixel a unit
-  painter.setGridDrawColor(kRed);
-  give({-20, -60, -30});
-
-  paint();
-
-  EXPECT_EQ(lines().back(), (std::vector<Point>{{15, 24}, {25, 64}, {35, 34}}));
-  EXPECT_EQ(painter.verticalResolution(), 8);
-  painter.gridScaleTop(std::numeric_limits<double>::infinity());
-  painter.verticalResolution(0);
-  painter.numberOfVerticalDivisions(1001);
-  EXPECT_EQ(painter.gridScaleTop(), -20);
-  EXPECT_EQ(painter.verticalResolution(), 8);
-  EXPECT_EQ(painter.numberOfVerticalDivisions(), 5);
-  EXPECT_EQ(messages().size(), 3U);
+  painter.setDbPerDivision(8);
+  painter.numberOfVerticalDivisions(5);  // -20 .. -60: 1 pixel a unit; grid lines 8 pixels apart
+  EXPECT_TRUE(painted({-20, -60, -30}).ends_with(" | 15,56 95,56 | 15,64 95,64 | 15,24 25,64 35,34"));
 }
 
 TEST_F(MultiTracePainterTest, AutoScaleFitsAllTracesAndWritesTheAxis) {
@@ -307,12 +250,11 @@ TEST_F(MultiTracePainterTest, AutoScaleFitsAllTracesAndWritesTheAxis) {
   painter.setAutoScale(true);
   painter.addATrace(0, 1, 0, 2);
   painter.addATrace(0, 2, 0, 2);
-  painter.trace(0, Variant(Variant::Singles{-14, -3, kGap}));
-  painter.trace(1, Variant(Variant::Doubles{-1e30 * 1e300, 3, -2}));
+  painter.trace(0, Variant(Singles{-14, -3, kGap}));
+  painter.trace(1, Variant(Doubles{-1e30 * 1e300, 3, -2}));
   EXPECT_EQ(painter.gridScaleTop(), std::nullopt);
 
   paint();
-
   // 17 / 0.85 = 20, 2 a division; (3 - 14 + 20) / 2 = 4.5 is 2.25 tenths of 20: 4.
   EXPECT_EQ(painter.gridScaleTop(), 4);
   EXPECT_EQ(painter.verticalResolution(), 2);
@@ -321,10 +263,10 @@ TEST_F(MultiTracePainterTest, AutoScaleFitsAllTracesAndWritesTheAxis) {
   EXPECT_EQ(painter.points(0).find(0)->y, 60);  // 24 + 18 * 2 pixels
 
   // Largest 3.5 of 4..-16 lies within a fifth of the top, smallest -14 of the bottom: the axis stays.
-  painter.trace(0, Variant(Variant::Singles{-14, 3.5F, kGap}));
+  painter.trace(0, Variant(Singles{-14, 3.5F, kGap}));
   paint();
   EXPECT_EQ(painter.gridScaleTop(), 4);
-  EXPECT_EQ(messages(), Messages{});
+  EXPECT_EQ(said(), "");
 }
 
 TEST_F(MultiTracePainterTest, LabelsFollowTheirStyleAndDivisions) {
@@ -332,21 +274,19 @@ TEST_F(MultiTracePainterTest, LabelsFollowTheirStyleAndDivisions) {
   painter.xAxisFormatter().frequencySuffix();
   painter.xStart(88e6);
   painter.xStop(108e6);
-  struct Row {
+  const struct {
     std::int16_t style;
     double spanHz;
     std::int16_t divisions;
-    std::vector<std::string> leftCentreRight;
-  };
-  const std::vector<Row> rows = {
-      {1, 20e6, 10, {"88 MHz", "2 MHz/div", "108 MHz"}}, {2, 20e6, 10, {"", "98 MHz", "2 MHz/div"}},
-      {4, 20e6, 10, {"", "98 MHz", "2 MHz/div"}},        {3, 10e6, 10, {"", "98 MHz", ""}},
-      {1, 10e6, 0, {"93 MHz", "", "103 MHz"}},           {0, 10e6, 0, {"", "", ""}}};
-  for (const Row& row : rows) {
+    std::string leftCentreRight;
+  } rows[] = {{1, 20e6, 10, "88 MHz|2 MHz/div|108 MHz"}, {2, 20e6, 10, "|98 MHz|2 MHz/div"},
+              {4, 20e6, 10, "|98 MHz|2 MHz/div"},        {3, 10e6, 10, "|98 MHz|"},
+              {1, 10e6, 0, "93 MHz||103 MHz"},           {0, 10e6, 0, "||"}};
+  for (const auto& row : rows) {
     painter.xAxisStyle(row.style);
     painter.span(row.spanHz);
     painter.numberOfHorizontalDivisions(row.divisions);
-    EXPECT_EQ((std::vector{painter.leftLabel(), painter.xAxisLabel(), painter.rightLabel()}),
+    EXPECT_EQ(painter.leftLabel() + "|" + painter.xAxisLabel() + "|" + painter.rightLabel(),
               row.leftCentreRight);
   }
 
@@ -361,26 +301,29 @@ TEST_F(MultiTracePainterTest, LabelsFollowTheirStyleAndDivisions) {
   EXPECT_EQ(painter.yAxisLabels(), (std::vector<std::string>{"0.005", "0", "-0.005"}));
 }
 
-TEST_F(MultiTracePainterTest, TheGridDrawsBothOuterEdges) {
+TEST_F(MultiTracePainterTest, TheGridDrawsBothOuterEdgesAndNeedsTheSurfaceThatItIsToStyle) {
   painter.numberOfVerticalDivisions(3);
   painter.numberOfHorizontalDivisions(2);
   painter.setGridLineDrawingStyle(PenStyle::Dot);
   painter.setGridDrawColor(kRed);
+  // y = 24 + 40 i / 3 (37.33, 50.67); x = 15 + 80 j / 2
+  EXPECT_EQ(
+      painted(),
+      "15,24 95,24 | 15,37 95,37 | 15,51 95,51 | 15,64 95,64 | 15,24 15,64 | 55,24 55,64 | 95,24 95,64");
+  EXPECT_EQ(gdi.polylines().front().pen, (testing::PenValue{PenStyle::Dot, 1, kRed}));
+
+  painter.numberOfVerticalDivisions(0);
+  painter.numberOfHorizontalDivisions(0);
+  painter.multiBand(true);
+  painter.numberOfBands(4);
+  EXPECT_EQ(painted(), "35,24 35,64 | 55,24 55,64 | 75,24 75,64");
+  painter.setGridDrawStyle(PenStyle::Dash);
+  EXPECT_EQ(painted({0, 0}), "15,24 25,24");
+  EXPECT_EQ(said(), "clsMultiTracePainter::DrawGrid()...\rObject variable or With block variable not set");
+
   testing::FakeTraceForm form;
   painter.drawingArea(&form);
-  painter.setGridDrawStyle(PenStyle::Dash);
-
-  paint();
-
-  // y = 24 + 40 i / 3 (37.33, 50.67); x = 15 + 80 j / 2
-  EXPECT_EQ(lines(), (Lines{{{15, 24}, {95, 24}},
-                            {{15, 37}, {95, 37}},
-                            {{15, 51}, {95, 51}},
-                            {{15, 64}, {95, 64}},
-                            {{15, 24}, {15, 64}},
-                            {{55, 24}, {55, 64}},
-                            {{95, 24}, {95, 64}}}));
-  EXPECT_EQ(gdi.polylines().front().pen, (testing::PenValue{PenStyle::Dot, 1, kRed}));
+  EXPECT_TRUE(painted().starts_with("35,24 35,64 | "));
   EXPECT_EQ(form.drawStyle, PenStyle::Dash);
 }
 
@@ -391,20 +334,7 @@ TEST_F(MultiTracePainterTest, PaintsDirectlyOnTheSurfaceOfItsHost) {
   form.scaleLeft = 100;
   give({0, -100});
   painter.Paint();  // plot (105, 4) of 780 x 590; 97.5 a step
-  EXPECT_EQ(lines(), (Lines{{{105, 4}, {202, 594}}}));
-}
-
-TEST_F(MultiTracePainterTest, BandsAreDividedByLinesAndAGridWithoutTheSurfaceItIsToStyleIsReported) {
-  painter.multiBand(true);
-  painter.numberOfBands(4);
-  paint();
-  EXPECT_EQ(lines(), (Lines{{{35, 24}, {35, 64}}, {{55, 24}, {55, 64}}, {{75, 24}, {75, 64}}}));
-  painter.setGridDrawStyle(PenStyle::Dash);
-  give({0, 0});
-  paint();
-  EXPECT_EQ(messages(),
-            Messages{"clsMultiTracePainter::DrawGrid()...\rObject variable or With block variable not set"});
-  EXPECT_EQ(lines().back(), (std::vector<Point>{{15, 24}, {25, 24}}));
+  EXPECT_EQ(drawn(), "105,4 202,594");
 }
 
 TEST_F(MultiTracePainterTest, TheClipIsRoundedHalfToEvenAndUndone) {
@@ -413,14 +343,9 @@ TEST_F(MultiTracePainterTest, TheClipIsRoundedHalfToEvenAndUndone) {
   give({0, 0});
   paint();
   EXPECT_EQ(gdi.clip(dc), (Rect{0, 2, 100, 50}));  // the plot's clip is gone again
-
   painter.destroyClippingRegion(dc);
   EXPECT_EQ(gdi.clip(dc), std::nullopt);
   EXPECT_EQ(gdi.liveObjects(), 0);
-
-  gdi.failAlways("createRectRgn");
-  painter.createClippingRegion(0, 0, 10, 10, dc);
-  EXPECT_EQ(gdi.clip(dc), std::nullopt);
 }
 
 TEST_F(MultiTracePainterTest, WhicheverCallFailsNothingLeaksAndTheNextPaintIsWhole) {
@@ -428,8 +353,7 @@ TEST_F(MultiTracePainterTest, WhicheverCallFailsNothingLeaksAndTheNextPaintIsWho
   painter.numberOfHorizontalDivisions(2);
   painter.topLabel("top");
   give({0, -50, kGap, -100});
-  addMarker("1", 1);
-  painter.activeMarker(painter.findMarker("1"));
+  painter.activeMarker(addMarker("1", 1));
   const LabelFonts fonts{gdi.createFont({"axis"}), gdi.createFont({"corner"})};
   const int before = gdi.liveObjects();
   const auto wholePaint = [&] {
@@ -446,7 +370,6 @@ TEST_F(MultiTracePainterTest, WhicheverCallFailsNothingLeaksAndTheNextPaintIsWho
   const std::vector<std::string> whole = wholePaint();
   const std::vector<int> failing = gdi.callsThatMayFail();
   ASSERT_GT(failing.size(), 40U);
-
   for (const int n : failing) {
     gdi.failNthCall(n);
     wholePaint();
@@ -455,17 +378,15 @@ TEST_F(MultiTracePainterTest, WhicheverCallFailsNothingLeaksAndTheNextPaintIsWho
     EXPECT_EQ(gdi.violations(), std::vector<std::string>{}) << "call " << n;
     EXPECT_EQ(wholePaint(), whole) << "call " << n;
   }
-  EXPECT_EQ(messages(), Messages{});
+  EXPECT_EQ(said(), "");
 }
 
 TEST_F(MultiTracePainterTest, ValuesOfTheSameKindUseTheirStorageAgain) {
-  give(Variant::Singles(513, -50.0F));
-  const void* const before = std::get<Variant::Singles>(painter.trace().value()).data();
-
+  give(Singles(513, -50.0F));
+  const void* const before = std::get<Singles>(painter.trace().value()).data();
   painter.trace(std::span<const float>(std::vector<float>(513, -60.0F)));
-  painter.trace(Variant(Variant::Singles(500, -70.0F)));
-
-  EXPECT_EQ(static_cast<const void*>(std::get<Variant::Singles>(painter.trace().value()).data()), before);
+  painter.trace(Variant(Singles(500, -70.0F)));
+  EXPECT_EQ(static_cast<const void*>(std::get<Singles>(painter.trace().value()).data()), before);
   EXPECT_TRUE(painter.dataChanged());
 }
 

@@ -40,11 +40,24 @@ class PainterTest : public ReportingTest {
     painter.trace(Variant(std::move(values)));
   }
   void paint() { painter.Paint(dc); }
-  // The points of each line drawn by the last paints.
-  [[nodiscard]] std::vector<std::vector<Point>> lines() const {
-    std::vector<std::vector<Point>> points;
-    for (const Call& line : gdi.polylines()) points.push_back(line.points);
-    return points;
+  // The lines that the next paint draws, as "x,y x,y | x,y x,y".
+  [[nodiscard]] std::string painted() {
+    gdi.clear();
+    paint();
+    return drawn();
+  }
+  [[nodiscard]] std::string painted(Variant::Singles values) {
+    give(std::move(values));
+    return painted();
+  }
+  [[nodiscard]] std::string drawn() const {
+    std::string text;
+    for (const Call& line : gdi.polylines()) {
+      text += text.empty() ? "" : " |";
+      for (const Point at : line.points)
+        text += (text.empty() ? "" : " ") + std::to_string(at.x) + "," + std::to_string(at.y);
+    }
+    return text;
   }
   MarkerPointer addMarker(const char* id, std::int32_t point, std::int16_t traceId = 0) {
     auto marker = std::make_shared<clsMarker>();

@@ -6,22 +6,30 @@ namespace {
 
 using testing::kGap;
 using testing::kGreen;
-using Messages = std::vector<std::string>;
+constexpr float kInfinite = std::numeric_limits<float>::infinity();
 
 class PainterMarkersTest : public testing::PainterTest {
  protected:
-  [[nodiscard]] std::string readout() {
+  // The texts that a step writes, a blank behind each.
+  template <class Step>
+  std::string written(Step step) {
     gdi.clear();
-    painter.updateMarkerDisplay(dc, {});
-    return gdi.texts().empty() ? "" : gdi.texts().back().text;
+    step();
+    std::string texts;
+    for (const testing::Call& text : gdi.texts()) texts += text.text + " ";
+    return texts;
   }
-  // Ids of the markers that are drawn.
-  [[nodiscard]] std::vector<std::string> drawnIds() {
-    gdi.clear();
-    painter.drawMarkers(dc);
-    std::vector<std::string> ids;
-    for (const testing::Call& text : gdi.texts()) ids.push_back(text.text);
-    return ids;
+  std::string readout() {
+    return written([this] { painter.updateMarkerDisplay(dc, {}); });
+  }
+  // With a text in the top row that ends `px` behind the plot's left edge.
+  std::string readoutBeside(std::size_t px) {
+    painter.topLabel(std::string(px / 8, 't'));
+    painter.Label(dc, {});
+    return readout();
+  }
+  std::string drawnIds() {
+    return written([this] { painter.drawMarkers(dc); });
   }
   // A panel with room for a read-out: plot (15, 44) of 580 x 40, frequencies 100 to 109 MHz.
   void widen() {
@@ -41,8 +49,7 @@ class PainterMarkersTest : public testing::PainterTest {
 };
 
 TEST_F(PainterMarkersTest, TheNearestPointIsTheOneWithTheSmallestSumOfDifferences) {
-  give({0, -50, -100, -50});  // (15, 24) (25, 44) (35, 64) (45, 44)
-  paint();
+  EXPECT_EQ(painted({0, -50, -100, -50}), "15,24 25,44 35,64 45,44");
   clsMarker marker;
   const auto nearest = [&](float x, float y) { return painter.findNearestPoint(x, y, marker), marker.point; };
   EXPECT_EQ(nearest(35, 44), 1);  // 10 from points 1 and 3: the lower index
@@ -50,37 +57,28 @@ TEST_F(PainterMarkersTest, TheNearestPointIsTheOneWithTheSmallestSumOfDifference
   EXPECT_EQ(nearest(25, 54), 1);        // 10 against 20
   EXPECT_EQ(nearest(14.4F, 10000), 2);  // over 9936 away, still below 10000
   EXPECT_EQ(nearest(15, 10100), 2);     // nothing within 10000
-  give({0, -82000});  // 32800 pixels apart: near the first point, the way to the second overflows
-  paint();
-  EXPECT_EQ(nearest(15, 24), 2);
-  EXPECT_EQ(messages(), Messages{"findNearestPoint() ...\rOverflow"});
+  EXPECT_EQ(painted({0, -82000}), "15,24 25,32824");
+  EXPECT_EQ(nearest(15, 24), 2);  // the way to the second overflows
+  EXPECT_EQ(said(), "findNearestPoint() ...\rOverflow");
 }
 
 TEST_F(PainterMarkersTest, ExtremesAreFoundInTheDataGapsAside) {
-  const float infinite = std::numeric_limits<float>::infinity();
-  give({infinite, -20, -5, -5, -90, -90, kGap, -infinite});
-  const MarkerPointer marker = addMarker("1", 0);
+  const MarkerPointer marker = (give({}), addMarker("1", 0));
   painter.activeMarker(marker);
-
-  painter.markerToMax();
-  EXPECT_EQ(marker->point, 2);  // the first of two
-  painter.markerToMin();
-  EXPECT_EQ(marker->point, 4);
-
+  const auto largest = [&] { return painter.markerToMax(), marker->point; };
+  const auto smallest = [&] { return painter.markerToMin(), marker->point; };
+  give({kInfinite, -20, -5, -5, -90, -90, kGap, -kInfinite});
+  EXPECT_EQ(largest(), 2);  // the first of two
+  EXPECT_EQ(smallest(), 4);
   give({-1, -2});  // new values are searched anew
-  painter.markerToMin();
-  EXPECT_EQ(marker->point, 1);
+  EXPECT_EQ(smallest(), 1);
   give({kGap, kGap});
-  painter.markerToMax();
-  EXPECT_EQ(marker->point, 1);
-  EXPECT_EQ(messages(), Messages{});
-
+  EXPECT_EQ(largest(), 1);
+  EXPECT_EQ(said(), "");
   painter.trace(Variant(Variant::Int16s{-9, -3}));
-  painter.markerToMin();
-  EXPECT_EQ(marker->point, 0);
-  EXPECT_EQ(messages(),
-            Messages{"clsMultiTracePainter::computeMinMax() ... unhandled array type.  Using Variant "
-                     "(SLOW!)\r"});
+  EXPECT_EQ(smallest(), 0);
+  EXPECT_EQ(said(),
+            "clsMultiTracePainter::computeMinMax() ... unhandled array type.  Using Variant (SLOW!)\r");
 }
 
 TEST_F(PainterMarkersTest, EveryKeyButTheRightArrowMovesLeftEvenBelowZero) {
@@ -89,27 +87,24 @@ TEST_F(PainterMarkersTest, EveryKeyButTheRightArrowMovesLeftEvenBelowZero) {
   const MarkerPointer marker = addMarker("1", 0);
   painter.activeMarker(marker);
   EXPECT_TRUE(marker->active);
-
-  painter.KeyPress(39);
-  EXPECT_EQ(marker->point, 1);
-  painter.KeyPress(37);
-  painter.KeyPress(65);
-  EXPECT_EQ(marker->point, -1);
-  marker->point = std::numeric_limits<std::int32_t>::max();
-  painter.KeyPress(39);
-  EXPECT_EQ(messages(), Messages{"clsMultiTracePainter::KeyPress()\rOverflow"});
+  const auto pressed = [&](std::int16_t key) { return painter.KeyPress(key), marker->point; };
+  EXPECT_EQ(pressed(39), 1);
+  EXPECT_EQ(pressed(37), 0);
+  EXPECT_EQ(pressed(65), -1);
+  marker->point = 2147483647;
+  EXPECT_EQ(pressed(39), 2147483647);
+  EXPECT_EQ(said(), "clsMultiTracePainter::KeyPress()\rOverflow");
 }
 
 TEST_F(PainterMarkersTest, MarkersAreDrawnOnTheirPointsInTheTraceColour) {
   give({0, -50, kGap, -50});
-  addMarker("1", 1);
+  const MarkerPointer marker = addMarker("1", 1);
   addMarker("2", 2);  // a gap
   addMarker("3", 9);  // no such point
   paint();
-
-  EXPECT_EQ(drawnIds(), std::vector<std::string>{"1"});
-  EXPECT_EQ(painter.findMarker("1")->positionX, 25);
-  EXPECT_EQ(painter.findMarker("1")->positionY, 44);
+  EXPECT_EQ(drawnIds(), "1 ");
+  EXPECT_EQ(marker->positionX, 25);
+  EXPECT_EQ(marker->positionY, 44);
   const auto created = gdi.succeeded("createPen");
   ASSERT_EQ(created.size(), 1U);
   EXPECT_EQ(created[0].pen, (testing::PenValue{PenStyle::Solid, 1, kGreen}));
@@ -124,21 +119,19 @@ TEST_F(PainterMarkersTest, AMarkerOnACountedPointThatIsNotDrawnStaysOnTheLastOne
   for (const std::int32_t point : {3, 4}) {
     marker->point = point;
     show();
-    EXPECT_EQ(drawnIds(), std::vector<std::string>{"1"});
+    EXPECT_EQ(drawnIds(), "1 ");
     EXPECT_EQ(marker->positionY, 64);  // -50 in the middle of 44..84
-    EXPECT_EQ(readout(), "1  102 MHz  -50 dBm");
+    EXPECT_EQ(readout(), "1  102 MHz  -50 dBm ");
     EXPECT_EQ(marker->point, point);
   }
-  EXPECT_EQ(painter.traceSize(), 4);
-
   marker->point = 5;
   show();
-  EXPECT_EQ(drawnIds(), std::vector<std::string>{});
+  EXPECT_EQ(drawnIds(), "");
 
   give({-10, kGap, -30});
   marker->point = 1;
   show();
-  EXPECT_EQ(readout(), "1  101 MHz  ---");
+  EXPECT_EQ(readout(), "1  101 MHz  --- ");
 }
 
 TEST_F(PainterMarkersTest, TheActiveMarkerReadsItsFrequencyAndLevelShortenedWithoutRoom) {
@@ -146,27 +139,19 @@ TEST_F(PainterMarkersTest, TheActiveMarkerReadsItsFrequencyAndLevelShortenedWith
   give({-10, -20.25F, -30, -40, -50, -60, -70, -80, -90, -100});
   painter.activeMarker(addMarker("1", 1));
   show();
-
-  EXPECT_EQ(readout(), "1  101 MHz  -20.25 dBm");
+  EXPECT_EQ(readout(), "1  101 MHz  -20.25 dBm ");
   // 22 letters of 8 up to the plot's right edge at 595, 2 below the panel's top.
   EXPECT_EQ(gdi.texts().back().points[0], (Point{419, 22}));
   painter.activeMarker()->point = 9;
-  EXPECT_EQ(readout(), "1  109 MHz  -100 dBm");  // the last point is the stop; 20 letters: from 435
-  painter.topLabel(std::string(53, 't'));        // 15 + 424 = 439
-  painter.Label(dc, {});
-  EXPECT_EQ(readout(), "1  -100 dBm");
-  painter.topLabel(std::string(63, 't'));  // 15 + 504 = 519, and 595 - 88 = 507
-  painter.Label(dc, {});
-  EXPECT_EQ(readout(), "");
-
-  painter.topLabel("");
-  painter.Label(dc, {});
-  painter.xStop(100.09e6);  // points 10 kHz apart
+  EXPECT_EQ(readout(), "1  109 MHz  -100 dBm ");  // the last point is the stop; 20 letters: from 435
+  EXPECT_EQ(readoutBeside(424), "1  -100 dBm ");  // 15 + 424 = 439
+  EXPECT_EQ(readoutBeside(504), "");              // 15 + 504 = 519, and 595 - 88 = 507
+  painter.xStop(100.09e6);                        // points 10 kHz apart
   painter.activeMarker()->point = 3;
   painter.xMarkerFormatString("0.000000");
-  EXPECT_EQ(readout(), "1  100.030000 MHz  -40 dBm");
+  EXPECT_EQ(readoutBeside(0), "1  100.030000 MHz  -40 dBm ");
   painter.autoFormatX(true);
-  EXPECT_EQ(readout(), "1  100.03 MHz  -40 dBm");
+  EXPECT_EQ(readout(), "1  100.03 MHz  -40 dBm ");
 }
 
 TEST_F(PainterMarkersTest, ADeltaMarkerReadsDifferencesOfStoredValuesAndGoesWithItsMarker) {
@@ -180,10 +165,9 @@ TEST_F(PainterMarkersTest, ADeltaMarkerReadsDifferencesOfStoredValuesAndGoesWith
   marker->deltaPartner = "1d";
   painter.activeMarker(delta);
   show();
-
-  EXPECT_EQ(readout(), "1d  -1 MHz  +0.4 dB");  // less than a pixel
+  EXPECT_EQ(readout(), "1d  -1 MHz  +0.4 dB ");  // less than a pixel
   painter.activeMarker(marker);
-  EXPECT_EQ(readout(), "1  102 MHz  -20.5 dBm   1d  -1 MHz  +0.4 dB");
+  EXPECT_EQ(readout(), "1  102 MHz  -20.5 dBm   1d  -1 MHz  +0.4 dB ");
 
   painter.deleteActiveMarker();
   EXPECT_EQ(painter.markerCollection().count(), 1U);
@@ -193,7 +177,7 @@ TEST_F(PainterMarkersTest, ADeltaMarkerReadsDifferencesOfStoredValuesAndGoesWith
   painter.deleteActiveMarker();
   painter.deleteActiveMarker();
   EXPECT_EQ(painter.activeMarker(), nullptr);
-  EXPECT_EQ(messages(), Messages{});
+  EXPECT_EQ(said(), "");
 }
 
 TEST_F(PainterMarkersTest, MarkersReturnToTheirFrequencyAfterTheAxisMoved) {
@@ -203,7 +187,6 @@ TEST_F(PainterMarkersTest, MarkersReturnToTheirFrequencyAfterTheAxisMoved) {
   const MarkerPointer outside = addMarker("2", 9);
   paint();
   painter.updateMarkerDisplay(dc, {});
-
   painter.xStart(102e6);
   painter.xStop(106.5e6);  // 0.5 MHz a point
   painter.ResetMarkers();
@@ -213,10 +196,9 @@ TEST_F(PainterMarkersTest, MarkersReturnToTheirFrequencyAfterTheAxisMoved) {
   painter.xStop(112e6);
   painter.ResetMarkers();
   EXPECT_EQ(inside->point, 1);
-
   painter.span(0);
   painter.ResetMarkers();
-  EXPECT_EQ(messages(), Messages{"ResetMarkers() failed...divide-by-zero error\rDivision by zero"});
+  EXPECT_EQ(said(), "ResetMarkers() failed...divide-by-zero error\rDivision by zero");
 }
 
 TEST_F(PainterMarkersTest, AMarkerForNoTraceIsReported) {
@@ -227,13 +209,11 @@ TEST_F(PainterMarkersTest, AMarkerForNoTraceIsReported) {
   EXPECT_EQ(painter.markerCollection().count(), 1U);
   EXPECT_THROW((void)painter.traceMarkerCollections(1), RuntimeError);
   painter.findNearestPoint(0, 0, *painter.findMarker("2"), std::int16_t{3});
-  EXPECT_EQ(
-      messages(),
-      (Messages{
-          "addMarkerToTrace() failed\rSubscript out of range",
-          "addMarkerToTrace() failed\rThis key is already associated with an element of this collection",
-          "traceMarkerCollections[Property Get]() ...\rSubscript out of range",
-          "findNearestPoint() ...\rSubscript out of range"}));
+  EXPECT_EQ(said(),
+            "addMarkerToTrace() failed\rSubscript out of range\n"
+            "addMarkerToTrace() failed\rThis key is already associated with an element of this collection\n"
+            "traceMarkerCollections[Property Get]() ...\rSubscript out of range\n"
+            "findNearestPoint() ...\rSubscript out of range");
 }
 
 }  // namespace

@@ -37,6 +37,13 @@ class ReportingTest : public ::testing::Test {
     dialogs_.texts.clear();
     messageLog().clear();
   }
+  // The message boxes since it was asked last, word for word, a line each.
+  [[nodiscard]] std::string said() {
+    std::string lines;
+    for (const std::string& text : dialogs_.texts) lines += (lines.empty() ? "" : "\n") + text;
+    clearMessages();
+    return lines;
+  }
 
  private:
   RecordingDialogs dialogs_;

@@ -73,8 +73,7 @@ TEST_F(MarkerTest, ActiveMarkerHasAPenOfItsOwnTwoPixelsWide) {
 
 TEST_F(MarkerTest, IdIsCentredTwoPixelsAboveTheHighestPointOfTheGlyph) {
   const struct {
-    bool twoEnded;
-    bool delta;
+    bool twoEnded, delta;
     std::int32_t y2;
     Point topLeft;
   } rows[] = {{false, false, 20, {92, 24}},  // two letters of 8 x 12: 16 wide; the glyph begins at 38
@@ -88,8 +87,7 @@ TEST_F(MarkerTest, IdIsCentredTwoPixelsAboveTheHighestPointOfTheGlyph) {
     marker.DELTA = row.delta;
     marker.positionY2 = row.y2;
     marker.drawId(gdi, gdi.viewDc());
-    ASSERT_EQ(gdi.texts().size(), 1U);
-    EXPECT_EQ(gdi.texts()[0].text, "12");
+    EXPECT_EQ(gdi.texts().at(0).text, "12");
     EXPECT_EQ(gdi.texts()[0].points[0], row.topLeft) << row.y2;
   }
   EXPECT_EQ(deltaMarkerId("12"), "12d");
