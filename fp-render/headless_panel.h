@@ -49,6 +49,11 @@ class HeadlessContainer : public PanelContainer {
   void caption(std::string_view text) override { caption_ = text; }
   void visible(bool) override {}
   void viewState(std::int16_t) override {}
+  void left(float) override {}
+  void top(float) override {}
+  void width(float) override {}
+  void height(float) override {}
+  [[nodiscard]] std::vector<std::uint8_t> picturePng() override { return {}; }
   [[nodiscard]] const std::string& captionText() const noexcept { return caption_; }
 
  private:
@@ -59,6 +64,14 @@ class HeadlessContainer : public PanelContainer {
 class HeadlessHost : public PanelHost {
  public:
   std::int32_t frontPanelOp(std::int32_t, std::int32_t, std::int16_t, const Variant&) override { return 0; }
+  std::int32_t frontPanelSet(std::int32_t, std::int32_t, std::int16_t, std::int16_t,
+                             const Variant&) override {
+    return 0;
+  }
+  std::int32_t saveDisplaySettings(std::int32_t, std::int32_t, const PanelSettings&) override { return 0; }
+  std::int32_t saveSetup(std::int32_t, std::int32_t, std::int32_t, const PanelSettings&) override {
+    return 0;
+  }
 };
 
 class HeadlessPanel {

@@ -5,6 +5,7 @@
 #include <cstdint>
 #include <memory>
 #include <string_view>
+#include <vector>
 
 #include "framework/panel/panel_host.h"
 #include "platform/data_server.h"
@@ -44,9 +45,24 @@ class FuzzOwner : public PanelHost, public PanelContainer {
   std::int32_t frontPanelOp(std::int32_t, std::int32_t, std::int16_t, const Variant&) override {
     return status;
   }
+  std::int32_t frontPanelSet(std::int32_t, std::int32_t, std::int16_t, std::int16_t,
+                             const Variant&) override {
+    return status;
+  }
+  std::int32_t saveDisplaySettings(std::int32_t, std::int32_t, const PanelSettings&) override {
+    return status;
+  }
+  std::int32_t saveSetup(std::int32_t, std::int32_t, std::int32_t, const PanelSettings&) override {
+    return status;
+  }
   void caption(std::string_view) override {}
   void visible(bool) override {}
   void viewState(std::int16_t) override {}
+  void left(float) override {}
+  void top(float) override {}
+  void width(float) override {}
+  void height(float) override {}
+  std::vector<std::uint8_t> picturePng() override { return {}; }
 };
 
 // One window, which may or may not get the capture.

@@ -32,6 +32,13 @@ char signOf(double difference) { return difference < 0 ? '-' : '+'; }
 
 }  // namespace
 
+MarkerReading markerReading(const clsMarker& marker, const ReadoutFormat& format) {
+  MarkerReading reading{marker.id, {}, {}};
+  appendX(reading.x, marker.valueX, format);
+  appendY(reading.y, marker.valueY, format);
+  return reading;
+}
+
 void appendReadout(std::string& text, const clsMarker& marker, const ReadoutFormat& format) {
   (text += marker.id) += kGap;
   appendX(text, marker.valueX, format);

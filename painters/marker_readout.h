@@ -17,6 +17,15 @@ struct ReadoutFormat {
   double pointSpacing = 0;  // in x units
 };
 
+// The same in parts, for a table.
+struct MarkerReading {
+  std::string id;
+  std::string x;
+  std::string y;
+  friend bool operator==(const MarkerReading&, const MarkerReading&) = default;
+};
+[[nodiscard]] MarkerReading markerReading(const clsMarker& marker, const ReadoutFormat& format);
+
 // "1  98.1 MHz  -43.2 dBm"
 void appendReadout(std::string& text, const clsMarker& marker, const ReadoutFormat& format);
 // "1  -43.2 dBm"

@@ -16,6 +16,7 @@
 #include "entry/numeric_entry.h"
 #include "painters/axis.h"
 #include "painters/grid.h"
+#include "painters/marker_readout.h"
 #include "painters/plot_labels.h"
 #include "painters/property.h"
 #include "painters/trace_store.h"
@@ -50,7 +51,7 @@ class clsMultiTracePainter : public TraceObject {
   // `maxTraces`, takes over the least recently used. PN 106, 107 and 111 are looked up as 106 in mode 0 and
   // 107 in mode 1, PN 25 and 214 as 25 and 214. Answers the slot's index, -1 when nothing was stored.
   std::int16_t addATrace(std::int16_t mode, std::int16_t pn, double value, std::int32_t size,
-                         std::optional<std::int16_t> traceId = std::nullopt);
+                         std::optional<std::int16_t> traceId = std::nullopt) override;
   // Each answers the slot's index, -1 after a failure.
   std::int16_t addNewTraceAtEnd(std::int16_t pn, double value, std::int32_t size,
                                 std::optional<std::int16_t> traceId = std::nullopt);
@@ -60,7 +61,7 @@ class clsMultiTracePainter : public TraceObject {
                                        std::optional<std::int16_t> traceId = std::nullopt);
   // The index of the last trace that has the PN, -1 when none has.
   [[nodiscard]] std::int16_t findATrace(std::int16_t pn) const;
-  [[nodiscard]] std::int16_t findATraceByPN(std::int16_t pn) const { return findATrace(pn); }
+  [[nodiscard]] std::int16_t findATraceByPN(std::int16_t pn) const override { return findATrace(pn); }
   // The index of the trace that owns the marker, -1 when none does.
   [[nodiscard]] std::int16_t findTraceByMarker(const MarkerPointer& marker) const;
   void removeATrace(std::int16_t traceId);
@@ -79,7 +80,7 @@ class clsMultiTracePainter : public TraceObject {
   void traceSize(std::int32_t size);
   // What addATrace was given.
   [[nodiscard]] double traceValue(std::int16_t index) const;
-  [[nodiscard]] std::int16_t pnOffset(std::int16_t index) const;
+  [[nodiscard]] std::int16_t pnOffset(std::int16_t index) const override;
   void pnOffset(std::int16_t index, std::int16_t pn);
   [[nodiscard]] TraceOrientation traceOrientation(std::int16_t index) const;
   void traceOrientation(std::int16_t index, TraceOrientation orientation);
@@ -115,15 +116,15 @@ class clsMultiTracePainter : public TraceObject {
   // --- Value axis. With auto scale off it runs from gridScaleTop, the level at its top, down by
   // `verticalResolution` a division; a top that was never set is null and counts as 0. verticalResolution and
   // dB per division are one value. Levels that are not finite and divisions that are not above 0 are refused.
-  [[nodiscard]] std::optional<double> gridScaleTop() const { return top_; }
+  [[nodiscard]] std::optional<double> gridScaleTop() const override { return top_; }
   void gridScaleTop(double level) override;
-  [[nodiscard]] double verticalResolution() const { return perDivision_; }
+  [[nodiscard]] double verticalResolution() const override { return perDivision_; }
   void verticalResolution(double perDivision) override;
   [[nodiscard]] double getDbPerDivision() const { return perDivision_; }
   void setDbPerDivision(double perDivision) { verticalResolution(perDivision); }
   [[nodiscard]] std::int32_t numberOfVerticalDivisions() const { return numberOfVerticalDivisions_; }
   void numberOfVerticalDivisions(std::int32_t divisions);  // up to 1000; no line for 0 or less
-  [[nodiscard]] bool getAutoScale() const { return autoScale_; }
+  [[nodiscard]] bool getAutoScale() const override { return autoScale_; }
   void setAutoScale(bool on) override { autoScale_ = on; }
   // The axis runs from the smallest to the largest value of the traces instead.
   Property<bool> calcMinMax;
@@ -147,7 +148,7 @@ class clsMultiTracePainter : public TraceObject {
   void numberOfHorizontalDivisions(std::int32_t divisions);  // as for the value axis
   // 0 no labels; 1 start, stop and width of a division; 2 centre and width of a division; 3 centre. Another
   // style keeps the labels as they are.
-  [[nodiscard]] std::int16_t xAxisStyle() const { return xAxisStyle_; }
+  [[nodiscard]] std::int16_t xAxisStyle() const override { return xAxisStyle_; }
   void xAxisStyle(std::int16_t style) override;
   [[nodiscard]] clsNumericEntry& xAxisFormatter();
   void updateXAxisLabels();
@@ -228,6 +229,8 @@ class clsMultiTracePainter : public TraceObject {
   // Refreshes the stored values of all markers and writes what the active marker reads into the top row.
   // Where there is not room for all of it, the delta is left out, then the x value, then the rest.
   void updateMarkerDisplay(DcHandle dc, const LabelFonts& fonts) override;
+  // What every marker reads, trace by trace.
+  [[nodiscard]] std::vector<MarkerReading> markerReadings();
   // Fills the panel with the background.
   void clearArea(DcHandle dc);
   // Colour of the selected trace, as last painted.
@@ -269,7 +272,7 @@ class clsMultiTracePainter : public TraceObject {
   void KeyPress(std::int16_t key) override;
 
   // --- Kept and given back: the interface that both painters share
-  [[nodiscard]] std::int16_t yAxisStyle() const { return yAxisStyle_; }
+  [[nodiscard]] std::int16_t yAxisStyle() const override { return yAxisStyle_; }
   void yAxisStyle(std::int16_t style) override { yAxisStyle_ = style; }
   Property<std::int16_t> maxTraces{5};
   Property<std::int16_t> maxPNs{40};
@@ -327,6 +330,7 @@ class clsMultiTracePainter : public TraceObject {
   void refreshValueX(const TraceSlot& slot, clsMarker& marker) const;
   void refreshValues(const TraceSlot& slot, clsMarker& marker) const;
   void writeReadout(DcHandle dc);
+  [[nodiscard]] ReadoutFormat readoutFormat() const;
   void composeReadout(Readout readout);
   [[nodiscard]] MarkerPointer partnerOf(const clsMarker& marker);
 

@@ -252,11 +252,27 @@ void clsMultiTracePainter::writeReadout(DcHandle dc) {
   }
 }
 
+ReadoutFormat clsMultiTracePainter::readoutFormat() const {
+  return {xAxisFormatter_, yAxisFormatter_,
+          autoFormatX() ? std::string_view() : std::string_view(xMarkerFormatString()), yMarkerFormatString(),
+          std::fabs(pointSpacing())};
+}
+
+std::vector<MarkerReading> clsMultiTracePainter::markerReadings() {
+  std::vector<MarkerReading> readings;
+  for (std::int16_t trace = 0; trace < traces_.count(); ++trace) {
+    const TraceSlot& slot = traces_.slot(trace);
+    for (const MarkerPointer& marker : slot.markers) {
+      refreshValues(slot, *marker);
+      readings.push_back(markerReading(*marker, readoutFormat()));
+    }
+  }
+  return readings;
+}
+
 void clsMultiTracePainter::composeReadout(Readout readout) {
   const clsMarker& marker = *activeMarker_;
-  const ReadoutFormat format{xAxisFormatter_, yAxisFormatter_,
-                             autoFormatX() ? std::string_view() : std::string_view(xMarkerFormatString()),
-                             yMarkerFormatString(), std::fabs(pointSpacing())};
+  const ReadoutFormat format = readoutFormat();
   readout_.clear();
   const MarkerPointer partner = partnerOf(marker);
   if (readout == Readout::LevelOnly) {

@@ -6,7 +6,8 @@
 
 #include "framework/panel/base_vfp.h"
 #include "framework/panel/host_codes.h"
-#include "framework/panel/panel_control.h"
+#include "framework/panel/hosted_panel.h"
+#include "framework/panel/report_html.h"
 #include "framework/support/error_handler.h"
 #include "framework/support/guard.h"
 #include "painters/multi_trace_painter.h"
@@ -16,9 +17,6 @@
 namespace frontpanels {
 namespace {
 
-constexpr std::int16_t kLeftButton = 1;
-constexpr std::int16_t kLeftArrow = 37;
-constexpr std::int16_t kRightArrow = 39;
 constexpr double kDefaultReferenceDbm = -20.0;
 constexpr double kDefaultDbPerDivision = 10.0;
 
@@ -29,80 +27,57 @@ constexpr float kInsetTopTwips = 360;
 constexpr float kInsetRightTwips = 180;
 constexpr float kInsetBottomTwips = 315;
 
+// What a host can link to on a panel.
+enum class LinkType : std::int16_t { Result = 1, Action = 2, Parameter = 3 };
+
 }  // namespace
 
-class SpectrumView::Implementation : public PanelControl {
+class SpectrumView::Implementation : public HostedPanel {
  public:
   Implementation(const PanelEnvironment& environment, PanelHost& host, PanelContainer& container)
-      : gdi_(environment.gdi),
-        view_(environment.view),
-        metrics_(environment.metrics),
-        host_(host),
-        container_(container),
+      : HostedPanel(environment, host, container),
         base_(environment, *this),
         DFISpectrum_(environment.hub, [this](std::int32_t index) { DFISpectrum_DataChanged(index); }) {
     DFISpectrum_.subscribe(kSpectrumPath);
   }
 
-  std::int32_t vfpOp(std::int32_t hardwareId, std::int16_t operation, const Variant& parameter);
-  std::int32_t vfpSet(std::int32_t hardwareId, std::int16_t parameterType, std::int16_t index,
-                      const Variant& value);
   void addMarker();
   void moveMarker(void (clsTraceManager::*move)());
   [[nodiscard]] clsBaseVFP& base() noexcept { return base_; }
   [[nodiscard]] const FrequencyPlan& plan() const noexcept { return plan_; }
 
-  // PanelControl: the drawing surface forwards to the view, whose pixels it measures in twips.
-  float ViewScaleLeft() override { return 0; }
-  float ViewScaleTop() override { return 0; }
-  float ViewScaleWidth() override {
-    return static_cast<float>(view_.clientSizePx().width) * metrics_.twipsPerPixelX;
+  // PanelControl
+  std::int32_t vfpOp(std::int32_t hardwareId, std::int16_t operation, const Variant& parameter,
+                     clsBaseVFP* base) override;
+  std::int32_t vfpSet(std::int32_t hardwareId, std::int16_t parameterType, std::int16_t index,
+                      const Variant& value, clsBaseVFP* base) override;
+  // The panel plays nothing by itself.
+  std::int32_t playbackOp(std::int32_t, std::int16_t, const Variant&, clsBaseVFP*) override {
+    return kStatusUnknownOperation;
   }
-  float ViewScaleHeight() override {
-    return static_cast<float>(view_.clientSizePx().height) * metrics_.twipsPerPixelY;
-  }
-  float ViewUseableScaleWidth() override { return ViewScaleWidth(); }
-  float ViewUseableScaleHeight() override { return ViewScaleHeight(); }
-  WindowHandle ViewHWnd() override { return view_.hwnd(); }
-  DcHandle ViewHDC() override { return view_.hdc(); }
-  MousePointer ViewMousePointer() override { return view_.mousePointer(); }
-  void ViewMousePointer(MousePointer pointer) override { view_.mousePointer(pointer); }
-  DrawMode ViewDrawMode() override { return drawMode_; }
-  void ViewDrawMode(DrawMode mode) override {
-    drawMode_ = mode;
-    gdi_.setRop2(view_.hdc(), mode);
-  }
-  PenStyle ViewDrawStyle() override { return drawStyle_; }
-  void ViewDrawStyle(PenStyle style) override { drawStyle_ = style; }
-  void Refresh() override { view_.refresh(); }
-  ScaleMode ViewScaleMode() override { return ScaleMode::Twips; }
-  std::int16_t ViewDrawWidth() override { return 1; }
-  void ViewState(std::int16_t state) override {
-    winState_ = state;
-    container_.viewState(state);
-  }
-  void ViewVisible(bool visible) override {
-    view_.visible(visible);
-    container_.visible(visible);
-  }
-  void ViewRefresh() override { view_.refresh(); }
-  void Caption(std::string_view text) override { container_.caption(text); }
-  std::int32_t frontPanelOp(std::int32_t hwId, std::int32_t vfpId, std::int16_t operation,
-                            const Variant& argument) override {
-    return host_.frontPanelOp(hwId, vfpId, operation, argument);
-  }
+  void resultData(std::int32_t resultTypeId, ResultReader& reader, clsBaseVFP* base) override;
   std::string typeName() override { return kTypeName; }
-  std::int16_t winState() override { return winState_; }
   SideArea* displayPanel() override { return nullptr; }
   SideArea* controlPanel() override { return nullptr; }
-  void InvisibleWidthMarkX1(float x) override { invisibleWidthMarkX1_ = x; }
-  void InvisibleHeightMarkY1(float y) override { invisibleHeightMarkY1_ = y; }
+  Control* MarkerToCenterButton() override { return nullptr; }
+  void evaluateEnablingMarkerToCenter() override {}
+  void Form_Resize() override { base_.Resize(); }
   void refreshControls() override { refreshTraces(); }
-  void refreshMenuItems() override {}
+  void refreshMenuItems() override { base_.refreshMenuItems(); }
+  void closeVfp() override { base_.closeVfp(); }
+  void saveVfp() override { base_.saveVfp(); }
+  void appendSettings(PanelSettings& settings) override;
   void changedTraceConfiguration(TraceState state, TraceObject* activeTrace,
                                  std::int16_t resultType) override;
   void setMarkerFrameColor(Color color) override { markerFrameColor_ = color; }
   void deltaMarkerButtonEnabled(bool enable) override { deltaMarkerButtonEnabled_ = enable; }
+  void frontPanelLink(const FrontPanelLink& link) override;
+  std::int32_t measurementInfo(Variant& measurementTypes) override;
+  std::string activeControlLink() override { return {}; }
+  Variant initializeLinkValue(std::int16_t linkType, std::int32_t genericId) override;
+  bool actionEnabled(std::int16_t action) override;
+  std::string reportHtml() override;
+  std::string linkSourceName() override;
 
  private:
   struct ParameterRow;
@@ -119,21 +94,11 @@ class SpectrumView::Implementation : public PanelControl {
   void adjustResolution();
   void refreshTraces();
 
-  Gdi& gdi_;
-  GraphView& view_;
-  ScreenMetrics metrics_;
-  PanelHost& host_;
-  PanelContainer& container_;
   clsBaseVFP base_;
   FrequencyPlan plan_;
   std::array<float, kMaxPoints> liveTrace_{};
   DataServer DFISpectrum_;
 
-  DrawMode drawMode_ = DrawMode::CopyPen;
-  PenStyle drawStyle_ = PenStyle::Solid;
-  std::int16_t winState_ = 0;
-  float invisibleWidthMarkX1_ = 0;
-  float invisibleHeightMarkY1_ = 0;
   Color markerFrameColor_{};
   bool deltaMarkerButtonEnabled_ = true;
 };
@@ -141,11 +106,24 @@ class SpectrumView::Implementation : public PanelControl {
 // --- Host
 
 std::int32_t SpectrumView::Implementation::vfpOp(std::int32_t hardwareId, std::int16_t operation,
-                                                 const Variant& parameter) {
+                                                 const Variant& parameter, clsBaseVFP* /*base*/) {
   if (base_.closing()) return kStatusDone;
   return guarded("SpectrumView::vfpOp() ... ", kStatusUnusableParameter, [&] {
-    return operation == kAddTraceOperation ? addTrace(parameter)
-                                           : base_.vfpOp(hardwareId, operation, parameter);
+    switch (operation) {
+      case QUILL_VFP_SAVE:
+        base_.saveBase();
+        refreshTraces();
+        return kStatusDone;
+      case kAddTraceOperation:
+        return addTrace(parameter);
+      case QUILL_VFP_SAVE_SETUP:
+        if (!parameter.isNumeric()) break;  // the base says what is wrong with it
+        base_.saveSetup(parameter.toInt32());
+        return kStatusDone;
+      default:
+        break;
+    }
+    return base_.vfpOp(hardwareId, operation, parameter);
   });
 }
 
@@ -174,7 +152,8 @@ const SpectrumView::Implementation::ParameterRow SpectrumView::Implementation::k
 };
 
 std::int32_t SpectrumView::Implementation::vfpSet(std::int32_t hardwareId, std::int16_t parameterType,
-                                                  std::int16_t index, const Variant& value) {
+                                                  std::int16_t index, const Variant& value,
+                                                  clsBaseVFP* /*base*/) {
   if (base_.closing()) return kStatusDone;
   return guarded("SpectrumView::vfpSet() ... ", kStatusUnusableParameter, [&] {
     const auto* const row = std::find_if(
@@ -188,7 +167,7 @@ std::int32_t SpectrumView::Implementation::vfpSet(std::int32_t hardwareId, std::
 
 std::int32_t SpectrumView::Implementation::addTrace(const Variant& parameter) {
   if (!parameter.isNumeric() || parameter.toDouble() != kAddTraceOperation) return kStatusUnusableParameter;
-  base_.traceManager().addTraceObject(std::make_shared<clsMultiTracePainter>(gdi_), kSpectrumResultType);
+  base_.traceManager().addTraceObject(std::make_shared<clsMultiTracePainter>(gdi()), kSpectrumResultType);
   return kStatusDone;
 }
 
@@ -198,6 +177,16 @@ void SpectrumView::Implementation::DFISpectrum_DataChanged(std::int32_t index) {
   if (base_.closing()) return;
   guard("SpectrumView::DfiSpectrum_DataChanged()", [&] {
     const std::size_t points = readSweep(index);
+    showSweep(findOrAddPainter(), std::span(liveTrace_).first(points));
+    refreshTraces();
+  });
+}
+
+void SpectrumView::Implementation::resultData(std::int32_t resultTypeId, ResultReader& reader,
+                                              clsBaseVFP* /*base*/) {
+  if (resultTypeId != kSpectrumResultType) return;
+  guard("SpectrumView::resultData()", [&] {
+    const std::size_t points = reader.GetFloat32Array(liveTrace_);
     showSweep(findOrAddPainter(), std::span(liveTrace_).first(points));
     refreshTraces();
   });
@@ -233,7 +222,7 @@ clsMultiTracePainter* SpectrumView::Implementation::findPainter() {
 
 clsMultiTracePainter& SpectrumView::Implementation::findOrAddPainter() {
   if (findPainter() == nullptr)
-    base_.traceManager().addTraceObject(std::make_shared<clsMultiTracePainter>(gdi_), kSpectrumResultType);
+    base_.traceManager().addTraceObject(std::make_shared<clsMultiTracePainter>(gdi()), kSpectrumResultType);
   clsMultiTracePainter* const painter = findPainter();
   if (painter == nullptr) raiseObjectVariableNotSet();
   return *painter;
@@ -241,7 +230,7 @@ clsMultiTracePainter& SpectrumView::Implementation::findOrAddPainter() {
 
 void SpectrumView::Implementation::refreshTraces() {
   guard("SpectrumView::refreshTraces()", [this] {
-    if (view_.visible()) base_.traceManager().paintTraces(true);
+    if (view().visible()) base_.traceManager().paintTraces(true);
   });
 }
 
@@ -274,10 +263,10 @@ void SpectrumView::Implementation::setUpTrace(clsMultiTracePainter& painter) {
   painter.setAutoScale(false);
   painter.xAxisStyle(1);
   painter.yAxisLabel("dBm");
-  painter.gridScaleLeft(kInsetLeftTwips / metrics_.twipsPerPixelX);
-  painter.gridInsetTop(kInsetTopTwips / metrics_.twipsPerPixelY);
-  painter.gridScaleRight(kInsetRightTwips / metrics_.twipsPerPixelX);
-  painter.gridScaleBottom(kInsetBottomTwips / metrics_.twipsPerPixelY);
+  painter.gridScaleLeft(kInsetLeftTwips / metrics().twipsPerPixelX);
+  painter.gridInsetTop(kInsetTopTwips / metrics().twipsPerPixelY);
+  painter.gridScaleRight(kInsetRightTwips / metrics().twipsPerPixelX);
+  painter.gridScaleBottom(kInsetBottomTwips / metrics().twipsPerPixelY);
   adjustResolution();
   updateXAxisLabels();
 }
@@ -313,6 +302,86 @@ void SpectrumView::Implementation::moveMarker(void (clsTraceManager::*move)()) {
   if (active != nullptr && active->activeMarker() != nullptr) (base_.traceManager().*move)();
 }
 
+// --- What a host keeps and asks
+
+void SpectrumView::Implementation::appendSettings(PanelSettings& settings) {
+  settings.push_back({kCenterFrequencyParameter, plan_.centerHz()});
+  settings.push_back({kSpanParameter, plan_.spanHz()});
+}
+
+std::int32_t SpectrumView::Implementation::measurementInfo(Variant& measurementTypes) {
+  measurementTypes = Variant::Int32s{kSpectrumResultType};
+  return kStatusDone;
+}
+
+// While logging the panel stays open, in playback it cannot be closed.
+bool SpectrumView::Implementation::actionEnabled(std::int16_t action) {
+  if (action == QUILL_VFP_CLOSE) return !base_.recordMode && !base_.playback;
+  return action == QUILL_VFP_SAVE;
+}
+
+// What the host can link to. The panel's settings are fields that only its host sets so far, so nothing on
+// it can be shown bold, italic or disabled.
+void SpectrumView::Implementation::frontPanelLink(const FrontPanelLink& link) {
+  const auto report = [](const char* what) {
+    errorHandler().Assert(std::string("SpectrumView::frontPanelLink()") + what);
+  };
+  switch (static_cast<LinkType>(link.linkType)) {
+    case LinkType::Result:
+      return report(" ... unhandled result");
+    case LinkType::Action:
+      if (link.genericId == QUILL_VFP_CLOSE)
+        return errorHandler().Assert("I don't know how to invoke close yet!");
+      return report(" ... unhandled action");
+    case LinkType::Parameter:
+      return report(" ... unhandled parameter");
+  }
+  report("...unrecognized link type");
+}
+
+Variant SpectrumView::Implementation::initializeLinkValue(std::int16_t linkType, std::int32_t genericId) {
+  if (static_cast<LinkType>(linkType) != LinkType::Parameter) {
+    errorHandler().Assert("SpectrumView::initializeLinkValue()...unsupported link type");
+    return {};
+  }
+  switch (genericId) {
+    case kCenterFrequencyParameter:
+      return plan_.centerHz();
+    case kSpanParameter:
+      return plan_.spanHz();
+    default:
+      errorHandler().Assert("SpectrumView::initializeLinkValue() ... unhandled parameter");
+      return {};
+  }
+}
+
+std::string SpectrumView::Implementation::linkSourceName() {
+  return base_.frontPanelCaption().empty() ? kTypeName : base_.frontPanelCaption();
+}
+
+std::string SpectrumView::Implementation::reportHtml() {
+  clsNumericEntry frequency;
+  frequency.frequencySuffix();
+  frequency.formatString("0.########");
+  PanelReport report;
+  report.caption = linkSourceName();
+  report.settings = {{"Center", frequency.formatter(plan_.centerHz())},
+                     {"Span", frequency.formatter(plan_.spanHz())},
+                     {"Start", frequency.formatter(plan_.startHz())},
+                     {"Stop", frequency.formatter(plan_.stopHz())}};
+  if (clsMultiTracePainter* const painter = findPainter()) {
+    const clsNumericEntry& level = painter->yAxisFormatter();
+    report.settings.push_back({"Reference level", level.formatter(painter->gridScaleTop().value_or(0))});
+    report.settings.push_back({"Scale", numberToText(painter->verticalResolution()) + " dB/div"});
+    for (const MarkerReading& reading : painter->markerReadings())
+      report.readings.push_back({reading.id, reading.x, reading.y});
+  }
+  report.xTitle = "Frequency";
+  report.yTitle = "Level";
+  report.picturePng = container().picturePng();
+  return frontpanels::reportHtml(report);
+}
+
 // --- The panel from outside
 
 SpectrumView::SpectrumView(const PanelEnvironment& environment, PanelHost& host, PanelContainer& container)
@@ -321,40 +390,52 @@ SpectrumView::SpectrumView(const PanelEnvironment& environment, PanelHost& host,
 SpectrumView::~SpectrumView() = default;
 
 std::int32_t SpectrumView::vfpOp(std::int32_t hardwareId, std::int16_t operation, const Variant& parameter) {
-  return implementation_->vfpOp(hardwareId, operation, parameter);
+  return implementation_->vfpOp(hardwareId, operation, parameter, nullptr);
 }
 
 std::int32_t SpectrumView::vfpSet(std::int32_t hardwareId, std::int16_t parameterType, std::int16_t index,
                                   const Variant& value) {
-  return implementation_->vfpSet(hardwareId, parameterType, index, value);
+  return implementation_->vfpSet(hardwareId, parameterType, index, value, nullptr);
+}
+
+std::int32_t SpectrumView::displayData(const Variant& vParameter, std::span<const std::uint8_t> resultData,
+                                       std::int32_t& dataPointer, std::int32_t& dataCount,
+                                       std::int32_t resultTypeId, std::int32_t resultLength) {
+  return base().displayData(vParameter, resultData, dataPointer, dataCount, resultTypeId, resultLength);
+}
+
+std::int32_t SpectrumView::displayParameter(std::int16_t order, const Variant& newValue) {
+  return base().displayParameter(order, newValue);
+}
+
+void SpectrumView::PopUp_Click(std::int32_t subjectId, std::int32_t buttonId) {
+  base().PopUp_Click(subjectId, buttonId);
 }
 
 std::string SpectrumView::Caption() { return base().Caption(); }
 void SpectrumView::Form_Resize() { base().Resize(); }
-void SpectrumView::Paint() { base().traceManager().paintTraces(true); }
+void SpectrumView::Paint() { base().Paint(); }
+void SpectrumView::Activate() { base().Activate(); }
 
 void SpectrumView::MouseDown(std::int16_t button, std::int16_t shift, float xTwips, float yTwips) {
-  if (button == kLeftButton) base().traceManager().MouseDown(button, shift, xTwips, yTwips);
+  base().MouseDown(button, shift, xTwips, yTwips);
 }
 
 void SpectrumView::MouseMove(std::int16_t button, std::int16_t shift, float xTwips, float yTwips) {
-  base().traceManager().MouseMove(button, shift, xTwips, yTwips);
+  base().MouseMove(button, shift, xTwips, yTwips);
 }
 
 void SpectrumView::MouseUp(std::int16_t button, std::int16_t shift, float xTwips, float yTwips) {
-  base().traceManager().MouseUp(button, shift, xTwips, yTwips);
+  base().MouseUp(button, shift, xTwips, yTwips);
 }
 
-void SpectrumView::KeyDown(std::int16_t keyCode, std::int16_t /*shift*/) {
-  if (keyCode == kLeftArrow) base().traceManager().moveMarkerLeft();
-  if (keyCode == kRightArrow) base().traceManager().moveMarkerRight();
-}
+void SpectrumView::KeyDown(std::int16_t keyCode, std::int16_t shift) { base().KeyDown(keyCode, shift); }
 
 void SpectrumView::addMarker() { implementation_->addMarker(); }
 void SpectrumView::markerToMax() { implementation_->moveMarker(&clsTraceManager::markerToMax); }
 void SpectrumView::markerToMin() { implementation_->moveMarker(&clsTraceManager::markerToMin); }
 clsBaseVFP& SpectrumView::base() { return implementation_->base(); }
-PanelControl& SpectrumView::control() { return *implementation_; }
+HostedPanel& SpectrumView::control() { return *implementation_; }
 const FrequencyPlan& SpectrumView::frequencyPlan() const { return implementation_->plan(); }
 
 }  // namespace frontpanels

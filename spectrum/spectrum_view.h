@@ -5,6 +5,7 @@
 
 #include <cstdint>
 #include <memory>
+#include <span>
 #include <string>
 
 #include "framework/panel/panel_environment.h"
@@ -15,7 +16,7 @@ namespace frontpanels {
 
 class clsBaseVFP;
 class FrequencyPlan;
-class PanelControl;
+class HostedPanel;
 
 class SpectrumView {
  public:
@@ -29,6 +30,13 @@ class SpectrumView {
   std::int32_t vfpSet(std::int32_t hardwareId, std::int16_t parameterType, std::int16_t index,
                       const Variant& value);
 
+  // Decodes a result buffer from the cursor on; cursor and bytes left end where reading ended.
+  std::int32_t displayData(const Variant& vParameter, std::span<const std::uint8_t> resultData,
+                           std::int32_t& dataPointer, std::int32_t& dataCount, std::int32_t resultTypeId,
+                           std::int32_t resultLength);
+  std::int32_t displayParameter(std::int16_t order, const Variant& newValue);
+  void PopUp_Click(std::int32_t subjectId, std::int32_t buttonId);
+
   [[nodiscard]] std::string Caption();
 
   // Events of the window.
@@ -38,6 +46,7 @@ class SpectrumView {
   void MouseMove(std::int16_t button, std::int16_t shift, float xTwips, float yTwips);
   void MouseUp(std::int16_t button, std::int16_t shift, float xTwips, float yTwips);
   void KeyDown(std::int16_t keyCode, std::int16_t shift);
+  void Activate();
 
   // Marker commands. Without a trace there is nothing to mark, without a marker nothing to move: no report.
   void addMarker();
@@ -47,7 +56,7 @@ class SpectrumView {
   // The parts behind the panel. They live as long as it does.
   [[nodiscard]] clsBaseVFP& base();
   [[nodiscard]] const FrequencyPlan& frequencyPlan() const;
-  [[nodiscard]] PanelControl& control();  // with the surface that the graph is drawn on
+  [[nodiscard]] HostedPanel& control();  // with the surface that the graph is drawn on
 
   static constexpr const char* kTypeName = "SpectrumView";
   static constexpr const char* kSpectrumPath = "Brantor Scanner/Spectrum/Spectrum Trace";

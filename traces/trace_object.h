@@ -57,14 +57,25 @@ class TraceObject {
   [[nodiscard]] virtual Color activeTraceColor() const = 0;
 
   // Axis settings that a host sends by code; both kinds of painter have them.
+  [[nodiscard]] virtual std::int16_t xAxisStyle() const = 0;
   virtual void xAxisStyle(std::int16_t style) = 0;
+  [[nodiscard]] virtual std::int16_t yAxisStyle() const = 0;
   virtual void yAxisStyle(std::int16_t style) = 0;
-  // dB (or units of the value axis) per division, and the level at the top of the axis.
+  // dB (or units of the value axis) per division, and the level at the top of the axis, null until it is set.
+  [[nodiscard]] virtual double verticalResolution() const = 0;
   virtual void verticalResolution(double perDivision) = 0;
+  [[nodiscard]] virtual std::optional<double> gridScaleTop() const = 0;
   virtual void gridScaleTop(double level) = 0;
+  [[nodiscard]] virtual bool getAutoScale() const = 0;
   virtual void setAutoScale(bool on) = 0;
 
-  // Sub-traces. The selected one receives marker and key operations.
+  // Sub-traces, each of a PN offset. Adding answers the index of the one that took the PN, -1 when none did;
+  // so does looking one up.
+  virtual std::int16_t addATrace(std::int16_t mode, std::int16_t pn, double value, std::int32_t size,
+                                 std::optional<std::int16_t> traceId) = 0;
+  [[nodiscard]] virtual std::int16_t findATraceByPN(std::int16_t pn) const = 0;
+  [[nodiscard]] virtual std::int16_t pnOffset(std::int16_t index) const = 0;
+  // The selected one receives marker and key operations.
   [[nodiscard]] virtual std::int16_t numberOfTraces() const = 0;
   [[nodiscard]] virtual std::int16_t selectedTraceIndex() const = 0;
   virtual void selectedTraceIndex(std::int16_t index) = 0;

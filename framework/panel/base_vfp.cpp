@@ -10,16 +10,12 @@
 namespace frontpanels {
 namespace {
 
-constexpr float kSmallestDrawingAreaTwips = 10.0F;
-constexpr double kMarginShare = 0.025;
-constexpr float kMarginPenWidths = 4.0F;
+// A form of the host that shares the base without a display of its own to switch.
+constexpr std::string_view kNetworkParametersForm = "frmNetworkParameters";
 
-// The larger of four pen widths and a fortieth of the length.
-float marginTwips(float lengthTwips, std::int16_t penWidthPx, float twipsPerPixel) {
-  const float byPen = kMarginPenWidths * static_cast<float>(penWidthPx) * twipsPerPixel;
-  const auto byLength = static_cast<float>(kMarginShare * static_cast<double>(lengthTwips));
-  return std::max(byPen, byLength);
-}
+constexpr std::int16_t kLeftButton = 1;
+constexpr std::int16_t kLeftArrow = 37;
+constexpr std::int16_t kRightArrow = 39;
 
 }  // namespace
 
@@ -28,131 +24,64 @@ SharedPanelState& sharedPanelState() noexcept {
   return state;
 }
 
-// One row a code. A code whose value must be a number names the message for one that is none.
-struct clsBaseVFP::ParameterRow {
-  std::int16_t code;
-  const char* mustBeNumeric;
-  void (*apply)(clsBaseVFP& base, const Variant& value);
-};
-
-const clsBaseVFP::ParameterRow clsBaseVFP::kParameters[] = {
-    {TIME_MEASUREMENT_PERIOD, "clsBaseVFP::vfpSet() TIME_MEASUREMENT_PERIOD must be numeric",
-     [](clsBaseVFP& base, const Variant& value) { base.measurementPeriod_ = value.toDouble(); }},
-    {TIME_DATABASE_PERIOD, "clsBaseVFP::vfpSet() TIME_DATABASE_PERIOD must be numeric",
-     [](clsBaseVFP& base, const Variant& value) { base.databasePeriod_ = value.toDouble(); }},
-    {TIME_DISPLAY_PERIOD, "clsBaseVFP::vfpSet() TIME_DISPLAY_PERIOD must be numeric",
-     [](clsBaseVFP& base, const Variant& value) { base.displayPeriod_ = value.toDouble(); }},
-    {PARM_MEASUREMENT_ID, "clsBaseVFP::vfpSet() PARM_MEASUREMENT_ID must be numeric",
-     [](clsBaseVFP& base, const Variant& value) { base.measurementId_ = value.toInt32(); }},
-    {kCaptionParameter, nullptr,
-     [](clsBaseVFP& base, const Variant& value) {
-       base.frontPanelCaption_ = value.toText();
-       base.Caption(base.frontPanelCaption_);
-     }},
-    {PARM_RESOURCE_ID, "clsBaseVFP::vfpSet() PARM_RESOURCE_ID must be numeric",
-     [](clsBaseVFP& base, const Variant& value) {
-       base.resourceId_ = value.toInt32();
-       base.resourceIdValid_ = true;
-     }},
-    {kXAxisStyleParameter, nullptr,
-     [](clsBaseVFP& base, const Variant& value) {
-       base.activePainter().xAxisStyle(value.toInt16());
-       base.child_.refreshControls();
-     }},
-    {kVerticalResolutionParameter, nullptr,
-     [](clsBaseVFP& base, const Variant& value) {
-       // Through text: the host's single-precision 0.1 arrives as the 0.1 that it shows.
-       base.activePainter().verticalResolution(Variant(value.toText()).toDouble());
-       base.child_.refreshControls();
-     }},
-    {kGridTopParameter, nullptr,
-     [](clsBaseVFP& base, const Variant& value) {
-       base.activePainter().gridScaleTop(value.toDouble());
-       base.child_.refreshControls();
-     }},
-    {kYAxisStyleParameter, nullptr,
-     [](clsBaseVFP& base, const Variant& value) {
-       base.activePainter().yAxisStyle(value.toInt16());
-       base.child_.refreshControls();
-     }},
-    {kAutoScaleParameter, nullptr,
-     [](clsBaseVFP& base, const Variant& value) {
-       base.activePainter().setAutoScale(value.toBoolean());
-       base.child_.refreshControls();
-     }},
-};
-
 clsBaseVFP::clsBaseVFP(const PanelEnvironment& environment, PanelControl& child)
     : child_(child),
       metrics_(environment.metrics),
       fonts_(environment.gdi, environment.metrics, boldLabels(environment.commandLine)),
-      traceManager_({environment.gdi, environment.windowing, environment.metrics, fonts_.handles(),
-                     boldLabels(environment.commandLine)}) {
-  traceManager_.setForm(&child_);
+      traceManager_(std::make_shared<clsTraceManager>(
+          TraceManagerEnvironment{environment.gdi, environment.windowing, environment.metrics,
+                                  fonts_.handles(), boldLabels(environment.commandLine)})) {
+  traceManager_->setForm(&child_);
 }
 
-// --- Host
+// --- Operations
+
+struct clsBaseVFP::OperationRow {
+  std::int16_t operation;
+  std::int32_t (*run)(clsBaseVFP& base, const Variant& parameter);
+};
+
+const clsBaseVFP::OperationRow clsBaseVFP::kOperations[] = {
+    {QUILL_VFP_CLOSE, [](clsBaseVFP& base, const Variant&) { return base.vfpClose(); }},
+    {QUILL_VFP_SAVE,
+     [](clsBaseVFP& base, const Variant&) {
+       base.saveBase();
+       return kStatusDone;
+     }},
+    {kAddTraceOperation, [](clsBaseVFP& base, const Variant& parameter) { return base.addTrace(parameter); }},
+    {kRemoveTraceOperation,
+     [](clsBaseVFP& base, const Variant& parameter) { return base.removeTrace(parameter); }},
+    {kShowOperation, [](clsBaseVFP& base, const Variant&) { return base.show(); }},
+    {QUILL_VFP_SAVE_SETUP,
+     [](clsBaseVFP& base, const Variant& parameter) { return base.saveSetupUnder(parameter); }},
+    {kLoggingOnOperation, [](clsBaseVFP& base, const Variant&) { return base.confirmLogging(); }},
+    {kPlaybackOperation,
+     [](clsBaseVFP& base, const Variant& parameter) { return base.startPlayback(parameter); }},
+    {kDisplayStateOperation,
+     [](clsBaseVFP& base, const Variant& parameter) { return base.setDisplayState(parameter); }},
+};
 
 std::int32_t clsBaseVFP::vfpOp(std::int32_t /*hardwareId*/, std::int16_t operation,
                                const Variant& parameter) {
   if (closing_) return kStatusDone;
   return guarded("clsBaseVFP::vfpOp() ... ", kStatusUnusableParameter, [&] {
-    switch (operation) {
-      case QUILL_VFP_CLOSE:
-        closing_ = true;
-        return vfpClose();
-      case kAddTraceOperation:
-        return addTrace(parameter);
-      case kRemoveTraceOperation:
-        return removeTrace(parameter);
-      case kShowOperation:
-        return show();
-      default:
-        return kStatusUnknownOperation;
-    }
+    const auto* const row =
+        std::find_if(std::begin(kOperations), std::end(kOperations),
+                     [operation](const OperationRow& candidate) { return candidate.operation == operation; });
+    return row == std::end(kOperations) ? kStatusUnknownOperation : row->run(*this, parameter);
   });
-}
-
-std::int32_t clsBaseVFP::vfpSet(std::int32_t /*hardwareId*/, std::int16_t parameterType,
-                                std::int16_t /*index*/, const Variant& value) {
-  if (closing_) return kStatusDone;
-  return guarded("clsBaseVFP::vfpSet() ... ", kStatusUnusableParameter, [&] {
-    const auto* const row = std::find_if(
-        std::begin(kParameters), std::end(kParameters),
-        [parameterType](const ParameterRow& candidate) { return candidate.code == parameterType; });
-    if (row == std::end(kParameters)) {
-      reportUnhandled(parameterType);
-      return kStatusDone;
-    }
-    if (row->mustBeNumeric != nullptr && !value.isNumeric()) {
-      errorHandler().Assert(row->mustBeNumeric);
-      return kStatusUnusableParameter;
-    }
-    row->apply(*this, value);
-    return kStatusDone;
-  });
-}
-
-void clsBaseVFP::reportUnhandled(std::int16_t parameterType) {
-  if (!warnOnUnhandledParameters) return;
-  errorHandler().Assert(child_.typeName() +
-                        "::vfpSet() ... unhandled parameterType = " + std::to_string(parameterType));
 }
 
 std::int32_t clsBaseVFP::vfpClose() {
+  closing_ = true;
   sharedPanelState().dirty = true;
-  child_.ViewVisible(false);
+  const bool ownWindow = isCommonBase();
+  commonBase_ = nullptr;
+  if (ownWindow) child_.ViewVisible(false);
   return kStatusDone;
 }
 
-void clsBaseVFP::closeVfp() {
-  guard("clsBaseVFP::closeVfp() ... ", [this] {
-    const std::int32_t status =
-        child_.frontPanelOp(resourceId_, virtualFrontPanelId, QUILL_VFP_CLOSE, Variant());
-    if (status != kStatusDone) errorHandler().ReportError("QUILL_VFP_CLOSE failed");
-  });
-}
-
+// The status word comes with the next change of logging or saving: a panel that was just shown has neither.
 std::int32_t clsBaseVFP::show() {
   if (windowOwner) {
     child_.ViewVisible(false);
@@ -168,100 +97,220 @@ std::int32_t clsBaseVFP::show() {
 
 std::int32_t clsBaseVFP::addTrace(const Variant& parameter) {
   if (!parameter.isNumeric()) return kStatusUnusableParameter;
-  return traceManager_.addTrace(parameter.toInt32());
+  return traceManager_->addTrace(parameter.toInt32());
 }
 
 std::int32_t clsBaseVFP::removeTrace(const Variant& parameter) {
-  traceManager_.removeTrace(ResultTypeRecord(parameter.toInt32()));
+  traceManager_->removeTrace(ResultTypeRecord(parameter.toInt32()));
   return kStatusDone;
 }
 
-TraceObject& clsBaseVFP::activePainter() {
-  if (traceManager_.activeTrace() == nullptr) raiseObjectVariableNotSet();
-  return *traceManager_.activeTrace();
-}
-
-void clsBaseVFP::Caption(const std::string& text) {
-  caption_ = text;
-  child_.Caption(caption_);
-}
-
-// --- Areas
-
-void clsBaseVFP::rightPanelVisible(bool visible) {
-  rightPanelVisible_ = visible;
-  showSideArea(child_.displayPanel(), visible);
-}
-
-void clsBaseVFP::bottomPanelVisible(bool visible) {
-  bottomPanelVisible_ = visible;
-  showSideArea(child_.controlPanel(), visible);
-}
-
-void clsBaseVFP::showSideArea(SideArea* area, bool visible) {
-  guard("clsBaseVFP::showSideArea() ... ", [&] {
-    if (area != nullptr) area->Visible(visible);
-    child_.refreshMenuItems();
-    Resize();
-  });
-}
-
-SideArea* clsBaseVFP::shownDisplayPanel() { return rightPanelVisible_ ? child_.displayPanel() : nullptr; }
-SideArea* clsBaseVFP::shownControlPanel() { return bottomPanelVisible_ ? child_.controlPanel() : nullptr; }
-
-void clsBaseVFP::Resize() {
-  guard("clsBaseVFP::Resize() ... ", [this] {
-    reportWrongScaleModes();
-    placeSideAreas();
-    setDrawingArea();
-  });
-}
-
-void clsBaseVFP::reportWrongScaleModes() {
-  const auto check = [this](ScaleMode mode, const char* where) {
-    if (mode != ScaleMode::Twips)
-      errorHandler().Assert("clsBaseVFP::Resize() ... " + child_.typeName() + where);
-  };
-  check(child_.ViewScaleMode(), ".ScaleMode should be vbTwips");
-  if (SideArea* const area = child_.controlPanel())
-    check(area->ScaleMode(), ".ControlPanel.ScaleMode should be vbTwips");
-  if (SideArea* const area = child_.displayPanel())
-    check(area->ScaleMode(), ".DisplayPanel.ScaleMode should be vbTwips");
-}
-
-// The bottom area spans the whole width, the right one ends above it.
-void clsBaseVFP::placeSideAreas() {
-  const float viewWidth = child_.ViewScaleWidth();
-  const float viewHeight = child_.ViewScaleHeight();
-  float graphHeight = viewHeight;
-  if (SideArea* const bottom = shownControlPanel()) {
-    graphHeight = std::max(viewHeight - bottom->Height(), 0.0F);
-    bottom->Move(0, graphHeight, viewWidth, bottom->Height());
+std::int32_t clsBaseVFP::saveSetupUnder(const Variant& parameter) {
+  if (!parameter.isNumeric()) {
+    errorHandler().Assert("clsBaseVFP::vfpOp() ... QUILL_VFP_SAVE_SETUP requires a numeric parameter");
+    return kStatusUnusableParameter;
   }
-  child_.InvisibleHeightMarkY1(graphHeight);
-  float graphWidth = viewWidth;
-  if (SideArea* const right = shownDisplayPanel()) {
-    graphWidth = std::max(viewWidth - right->Width(), 0.0F);
-    right->Move(graphWidth, 0, right->Width(), graphHeight);
-  }
-  child_.InvisibleWidthMarkX1(graphWidth);
+  saveSetup(parameter.toInt32());
+  return kStatusDone;
 }
 
-void clsBaseVFP::setDrawingArea() {
-  guard("clsBaseVFP::setDrawingArea() ... ", [this] {
-    float height = child_.ViewScaleHeight();
-    if (SideArea* const bottom = shownControlPanel()) height -= bottom->Height();
-    height = std::max(height, kSmallestDrawingAreaTwips);
-    float width = child_.ViewScaleWidth();
-    if (SideArea* const right = shownDisplayPanel()) width -= right->Width();
-    width = std::max(width, kSmallestDrawingAreaTwips);
-    const float marginX = marginTwips(width, child_.ViewDrawWidth(), metrics_.twipsPerPixelX);
-    const float marginY = marginTwips(height, child_.ViewDrawWidth(), metrics_.twipsPerPixelY);
-    traceManager_.drawingArea(marginX, marginY, width - marginX * 2.0F, height - marginY * 2.0F);
-    traceManager_.setShadowDC();
-    traceManager_.paintTraces(true);
-    child_.ViewRefresh();
+std::int32_t clsBaseVFP::confirmLogging() {
+  loggingConfirmed_ = true;
+  logIndicatorHandler();
+  return kStatusDone;
+}
+
+std::int32_t clsBaseVFP::startPlayback(const Variant& parameter) {
+  playback = true;
+  if (!isCommonBase()) commonBase_->vfpOp(resourceId_, kPlaybackOperation, parameter);
+  child_.refreshControls();
+  logIndicatorHandler();
+  if (child_.typeName() != kNetworkParametersForm) {
+    decideMenuItem(kDisplayStateOnItem, &MenuItemState::enabled, false);
+    decideMenuItem(kDisplayStateOffItem, &MenuItemState::enabled, false);
+  }
+  decideMenuItem(kCloseItem, &MenuItemState::enabled, false);
+  child_.ViewVisible(true);
+  return kStatusDone;
+}
+
+// Whatever is not 0 means on, also what is no number.
+std::int32_t clsBaseVFP::setDisplayState(const Variant& parameter) {
+  displayState_ = parameter.isNumeric() && parameter.toDouble() == 0 ? 0 : 1;
+  child_.refreshMenuItems();
+  return kStatusDone;
+}
+
+// --- The reverse path
+
+std::int32_t clsBaseVFP::baseVfpOp(std::int32_t hardwareId, std::int16_t operation,
+                                   const Variant& parameter) {
+  if (closing_) return kStatusDone;
+  return guarded("clsBaseVFP::baseVfpOp() ... ", kStatusUnusableParameter, [&] {
+    if (operation < kFirstPlaybackOperation)
+      return child_.vfpOp(hardwareId, operation, parameter, furtherArgument());
+    const auto playbackOperation = static_cast<std::int16_t>(operation - kFirstPlaybackOperation);
+    return child_.playbackOp(hardwareId, playbackOperation, parameter, furtherArgument());
   });
+}
+
+std::int32_t clsBaseVFP::baseVfpSet(std::int32_t hardwareId, std::int16_t parameterType, std::int16_t index,
+                                    const Variant& value) {
+  if (closing_) return kStatusDone;
+  return guarded("clsBaseVFP::baseVfpSet() ... ", kStatusUnusableParameter,
+                 [&] { return child_.vfpSet(hardwareId, parameterType, index, value, furtherArgument()); });
+}
+
+std::int32_t clsBaseVFP::displayParameter(std::int16_t order, const Variant& newValue) {
+  if (closing_) return kStatusDone;
+  return guarded("clsBaseVFP::displayParameter() ... ", kStatusUnusableParameter,
+                 [&] { return child_.vfpSet(resourceId_, order, 0, newValue, furtherArgument()); });
+}
+
+// --- Requests to the host
+
+void clsBaseVFP::reportStatus(std::string_view routine, std::int32_t status) {
+  if (status == kStatusDone) return;
+  errorHandler().ReportError(child_.typeName().append(routine) + " status = " + std::to_string(status));
+}
+
+void clsBaseVFP::closeVfp() {
+  guard("clsBaseVFP::closeVfp() ... ", [this] {
+    if (child_.frontPanelOp(resourceId_, virtualFrontPanelId, QUILL_VFP_CLOSE, Variant()) != kStatusDone)
+      errorHandler().ReportError("QUILL_VFP_CLOSE failed");
+  });
+}
+
+void clsBaseVFP::saveVfp() {
+  guard("clsBaseVFP::saveVfp() ... ", [this] {
+    if (child_.frontPanelOp(resourceId_, virtualFrontPanelId, QUILL_VFP_SAVE, Variant()) != kStatusDone)
+      errorHandler().ReportError("QUILL_VFP_SAVE failed");
+  });
+}
+
+void clsBaseVFP::saveBase() {
+  guard("clsBaseVFP::saveBase() ... ", [this] {
+    reportStatus("::saveBase()", child_.saveDisplaySettings(resourceId_, virtualFrontPanelId, settings()));
+  });
+}
+
+void clsBaseVFP::saveSetup(std::int32_t setUpId) {
+  guard("clsBaseVFP::saveSetup() ... ", [&] {
+    reportStatus("::saveSetup()", child_.saveSetup(setUpId, resourceId_, virtualFrontPanelId, settings()));
+  });
+}
+
+std::int32_t clsBaseVFP::frontPanelOp(std::int32_t hwId, std::int32_t vfpId, std::int16_t operation,
+                                      const Variant& argument) {
+  return guarded("clsBaseVFP::frontPanelOp() ... ", kStatusUnusableParameter,
+                 [&] { return child_.frontPanelOp(hwId, vfpId, operation, argument); });
+}
+
+std::int32_t clsBaseVFP::frontPanelSet(std::int32_t hwId, std::int32_t vfpId, std::int16_t parameterType,
+                                       std::int16_t index, const Variant& value) {
+  return guarded("clsBaseVFP::frontPanelSet() ... ", kStatusUnusableParameter,
+                 [&] { return child_.frontPanelSet(hwId, vfpId, parameterType, index, value); });
+}
+
+// --- Passed on to the control
+
+void clsBaseVFP::frontPanelLink(const FrontPanelLink& link) {
+  if (closing_) return;
+  guard("clsBaseVFP::frontPanelLink() ... ", [&] { child_.frontPanelLink(link); });
+}
+
+std::int32_t clsBaseVFP::measurementInfo(Variant& measurementTypes) {
+  if (closing_) return kStatusDone;
+  return guarded("clsBaseVFP::measurementInfo() ... ", kStatusUnusableParameter,
+                 [&] { return child_.measurementInfo(measurementTypes); });
+}
+
+std::string clsBaseVFP::activeControlLink() {
+  return guarded("clsBaseVFP::activeControlLink() ... ", std::string(),
+                 [&] { return child_.activeControlLink(); });
+}
+
+Variant clsBaseVFP::initializeLinkValue(std::int16_t linkType, std::int32_t genericId) {
+  if (closing_) return {};
+  return guarded("clsBaseVFP::initializeLinkValue() ... ", Variant(),
+                 [&] { return child_.initializeLinkValue(linkType, genericId); });
+}
+
+bool clsBaseVFP::actionEnabled(std::int16_t action) {
+  if (closing_) return false;
+  return guarded("clsBaseVFP::actionEnabled() ... ", false, [&] { return child_.actionEnabled(action); });
+}
+
+std::string clsBaseVFP::reportHtml() {
+  return guarded("clsBaseVFP::reportHtml() ... ", std::string(), [&] { return child_.reportHtml(); });
+}
+
+std::string clsBaseVFP::linkSourceName() {
+  return guarded("clsBaseVFP::linkSourceName() ... ", std::string(), [&] { return child_.linkSourceName(); });
+}
+
+// --- Events
+
+void clsBaseVFP::MouseDown(std::int16_t button, std::int16_t shift, float xTwips, float yTwips) {
+  guard("clsBaseVFP::MouseDown() ... ", [&] {
+    if (button == kLeftButton) traceManager_->MouseDown(button, shift, xTwips, yTwips);
+  });
+}
+
+void clsBaseVFP::MouseMove(std::int16_t button, std::int16_t shift, float xTwips, float yTwips) {
+  guard("clsBaseVFP::MouseMove() ... ", [&] { traceManager_->MouseMove(button, shift, xTwips, yTwips); });
+}
+
+void clsBaseVFP::MouseUp(std::int16_t button, std::int16_t shift, float xTwips, float yTwips) {
+  guard("clsBaseVFP::MouseUp() ... ", [&] { traceManager_->MouseUp(button, shift, xTwips, yTwips); });
+}
+
+void clsBaseVFP::KeyDown(std::int16_t keyCode, std::int16_t /*shift*/) {
+  guard("clsBaseVFP::KeyDown() ... ", [&] {
+    if (keyCode == kLeftArrow) traceManager_->moveMarkerLeft();
+    if (keyCode == kRightArrow) traceManager_->moveMarkerRight();
+  });
+}
+
+// Keys act when they go down.
+void clsBaseVFP::KeyUp(std::int16_t /*keyCode*/, std::int16_t /*shift*/) {}
+
+void clsBaseVFP::Activate() {
+  if (closing_) return;
+  guard("clsBaseVFP::Activate() ... ", [this] { child_.refreshMenuItems(); });
+}
+
+void clsBaseVFP::QueryUnload(bool& cancel) {
+  if (closing_) return;
+  guard("clsBaseVFP::QueryUnload() ... ", [&] {
+    cancel = true;
+    if (!recordMode) child_.closeVfp();
+  });
+}
+
+void clsBaseVFP::Paint() {
+  guard("clsBaseVFP::Paint() ... ", [this] { traceManager_->paintTraces(true); });
+}
+
+// --- Members that tell when they are replaced
+
+void clsBaseVFP::traceManager(std::shared_ptr<clsTraceManager> manager) {
+  guard("clsBaseVFP::traceManager() ... ", [&] {
+    if (!manager) raiseObjectVariableNotSet();
+    traceManager_ = std::move(manager);
+    traceManager_->setForm(&child_);
+    errorHandler().Assert("Warning...clsBaseVFP::traceManager() is setting v_traceManager");
+  });
+}
+
+void clsBaseVFP::popUpMenu(PopUpMenu* menu) {
+  popUpMenu_ = menu;
+  errorHandler().Assert("Warning...clsBaseVFP::popUpMenu() is setting v_popUpMenu");
+}
+
+void clsBaseVFP::resourceId(std::int32_t id) noexcept {
+  resourceId_ = id;
+  resourceIdValid_ = true;
 }
 
 }  // namespace frontpanels

@@ -11,20 +11,13 @@
 #include "spectrum/frequency_plan.h"
 #include "tests/support/fake_surface.h"
 #include "tests/support/recording_gdi.h"
+#include "tests/support/recording_owner.h"
 #include "tests/support/reporting_fixture.h"
 
 namespace frontpanels::testing {
 namespace {
 
 using Messages = std::vector<std::string>;
-
-class QuietOwner : public PanelHost, public PanelContainer {
- public:
-  std::int32_t frontPanelOp(std::int32_t, std::int32_t, std::int16_t, const Variant&) override { return 0; }
-  void caption(std::string_view) override {}
-  void visible(bool) override {}
-  void viewState(std::int16_t) override {}
-};
 
 // A view of 800 x 600 pixels: the graph is 760 x 570 at (20, 15).
 class SpectrumViewTest : public ReportingTest {
@@ -61,7 +54,7 @@ class SpectrumViewTest : public ReportingTest {
   FakeWindowing windowing;
   FakeGraphView view;
   DataHub hub;
-  QuietOwner owner;
+  RecordingOwner owner;
   std::unique_ptr<SpectrumView> panel;
 };
 

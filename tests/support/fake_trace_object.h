@@ -65,11 +65,22 @@ class FakeTraceObject : public TraceObject {
   }
   void updateMarkerDisplay(DcHandle, const LabelFonts&) override { log("updateMarkerDisplay"); }
   Color activeTraceColor() const override { return color; }
+  std::int16_t xAxisStyle() const override { return 1; }
+  std::int16_t yAxisStyle() const override { return 0; }
+  double verticalResolution() const override { return 10; }
+  std::optional<double> gridScaleTop() const override { return std::nullopt; }
+  bool getAutoScale() const override { return false; }
   void xAxisStyle(std::int16_t style) override { log("xAxisStyle " + std::to_string(style)); }
   void yAxisStyle(std::int16_t style) override { log("yAxisStyle " + std::to_string(style)); }
   void verticalResolution(double value) override { log("verticalResolution " + std::to_string(value)); }
   void gridScaleTop(double level) override { log("gridScaleTop " + std::to_string(level)); }
   void setAutoScale(bool on) override { log(on ? "setAutoScale on" : "setAutoScale off"); }
+  std::int16_t addATrace(std::int16_t, std::int16_t, double, std::int32_t,
+                         std::optional<std::int16_t>) override {
+    return -1;
+  }
+  std::int16_t findATraceByPN(std::int16_t) const override { return -1; }
+  std::int16_t pnOffset(std::int16_t) const override { return 0; }
   std::int16_t numberOfTraces() const override { return static_cast<std::int16_t>(subTraces.size()); }
   std::int16_t selectedTraceIndex() const override { return selected; }
   void selectedTraceIndex(std::int16_t index) override { selected = index; }
