@@ -2,6 +2,7 @@
 
 #include "activex/data_hub_object.h"
 #include "activex/diagnostics_object.h"
+#include "activex/result_buffer_object.h"
 #include "activex/spectrum_control.h"
 #include "frontpanels_h.h"
 
@@ -17,6 +18,7 @@ const ClassRow kClasses[] = {
     {&CLSID_SpectrumView, L"SpectrumView", L"Front Panels SpectrumView", true, create<SpectrumControl>},
     {&CLSID_DataHub, L"DataHub", L"Front Panels DataHub", false, create<DataHubObject>},
     {&CLSID_Diagnostics, L"Diagnostics", L"Front Panels Diagnostics", false, create<DiagnosticsObject>},
+    {&CLSID_ResultBuffer, L"ResultBuffer", L"Front Panels ResultBuffer", false, create<ResultBufferObject>},
 };
 
 }  // namespace

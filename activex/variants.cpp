@@ -4,6 +4,7 @@
 
 #include <new>
 
+#include "activex/barrier.h"
 #include "platform/runtime_error.h"
 #include "platform/win32/utf16.h"
 
@@ -197,6 +198,42 @@ bool withSingles(const VARIANT& value, const std::function<void(std::span<const 
   const LockedArray array((V_VT(&value) & VT_BYREF) != 0 ? *V_ARRAYREF(&value) : V_ARRAY(&value));
   body({&array.at<float>(0), array.count()});
   return true;
+}
+
+LONG withBytes(const VARIANT& value, const std::function<LONG(std::span<const std::uint8_t>)>& body) {
+  if (isReferenceToVariant(value)) return withBytes(*V_VARIANTREF(&value), body);
+  if ((V_VT(&value) & ~VT_BYREF) == (VT_ARRAY | VT_UI1)) {
+    const LockedArray array((V_VT(&value) & VT_BYREF) != 0 ? *V_ARRAYREF(&value) : V_ARRAY(&value));
+    return body({&array.at<std::uint8_t>(0), array.count()});
+  }
+  const Variant list = fromAutomation(value);
+  std::vector<std::uint8_t> bytes;
+  bytes.reserve(list.elementCount());
+  for (std::size_t i = 0; i < list.elementCount(); ++i) {
+    const std::int16_t number = list.element(i).toInt16();
+    if (number < 0 || number > 255) raiseOverflow();
+    bytes.push_back(static_cast<std::uint8_t>(number));
+  }
+  return body(bytes);
+}
+
+Variant hostValue(const VARIANT& value) {
+  try {
+    return fromAutomation(value);
+  } catch (const RuntimeError&) {
+    return ErrorValue{DISP_E_TYPEMISMATCH};
+  }
+}
+
+void replaceVariable(VARIANT& variable, const Variant& value) {
+  if (isReferenceToVariant(variable)) return replaceVariable(*V_VARIANTREF(&variable), value);
+  VARIANT fresh = toAutomation(value);
+  const HRESULT cleared = VariantClear(&variable);
+  if (FAILED(cleared)) {
+    VariantClear(&fresh);
+    check(cleared);
+  }
+  variable = fresh;
 }
 
 VARIANT toAutomation(const Variant& value) {

@@ -121,7 +121,7 @@ export_classes before
 timeout 60 wine regsvr32 /s "$(windows_path "$library")"
 judge $? "the library registers"
 export_classes registered
-for name in SpectrumView SpectrumView.1 DataHub DataHub.1 Diagnostics Diagnostics.1; do
+for name in SpectrumView SpectrumView.1 DataHub DataHub.1 Diagnostics Diagnostics.1 ResultBuffer ResultBuffer.1; do
   grep -qF "Classes\\FrontPanels.$name\\CLSID]" "$out/registered.txt"
   judge $? "FrontPanels.$name is in the registry"
 done
