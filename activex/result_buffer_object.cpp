@@ -89,6 +89,13 @@ HRESULT ResultBufferObject::Bytes(VARIANT* buffer) {
   return barrier(IID_IResultBuffer, [&] { *buffer = toAutomation(writer_.Bytes()); });
 }
 
+// For scripts, some of which cannot count the elements of an array of bytes.
+HRESULT ResultBufferObject::get_Length(LONG* byteCount) {
+  if (byteCount == nullptr) return E_POINTER;
+  *byteCount = 0;
+  return barrier(IID_IResultBuffer, [&] { *byteCount = static_cast<LONG>(writer_.Bytes().size()); });
+}
+
 void* ResultBufferObject::findInterface(REFIID id) noexcept {
   if (id == IID_IResultBuffer || id == IID_IDispatch) return static_cast<IResultBuffer*>(this);
   if (id == IID_ISupportErrorInfo) return static_cast<ISupportErrorInfo*>(this);

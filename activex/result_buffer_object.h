@@ -30,6 +30,7 @@ class ResultBufferObject final
   HRESULT STDMETHODCALLTYPE EndMeasurement() override;
   HRESULT STDMETHODCALLTYPE Bytes(VARIANT* buffer) override;
   HRESULT STDMETHODCALLTYPE Clear() override;
+  HRESULT STDMETHODCALLTYPE get_Length(LONG* byteCount) override;
   HRESULT STDMETHODCALLTYPE InterfaceSupportsErrorInfo(REFIID id) override {
     return id == IID_IResultBuffer ? S_OK : S_FALSE;
   }

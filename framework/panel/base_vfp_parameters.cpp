@@ -19,10 +19,14 @@ std::string markerId(std::int32_t number, bool delta) {
   return delta ? deltaMarkerId(id) : id;
 }
 
+// There is a place for markers before there is a trace.
+std::int16_t tracesWithMarkers(const TraceObject& painter) {
+  return std::max<std::int16_t>(painter.numberOfTraces(), 1);
+}
+
 // The marker of the trace object that has the id, whichever of its traces it is on.
 MarkerPointer findMarker(TraceObject& painter, const std::string& id) {
-  const std::int16_t traces = std::max<std::int16_t>(painter.numberOfTraces(), 1);
-  for (std::int16_t trace = 0; trace < traces; ++trace)
+  for (std::int16_t trace = 0; trace < tracesWithMarkers(painter); ++trace)
     for (const MarkerPointer& marker : painter.traceMarkerCollections(trace))
       if (marker->id == id) return marker;
   return nullptr;
@@ -292,7 +296,7 @@ void clsBaseVFP::appendTraceSettings(PanelSettings& settings) {
     settings.push_back({kGridTopParameter, *top});
   settings.push_back({kAutoScaleParameter, painter->getAutoScale()});
   for (const bool delta : {false, true}) {
-    for (std::int16_t trace = 0; trace < painter->numberOfTraces(); ++trace) {
+    for (std::int16_t trace = 0; trace < tracesWithMarkers(*painter); ++trace) {
       for (const MarkerPointer& marker : painter->traceMarkerCollections(trace)) {
         if (marker->DELTA != delta) continue;
         const std::string& number = delta ? marker->deltaPartner : marker->id;

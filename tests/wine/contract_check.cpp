@@ -9,6 +9,7 @@
 
 #include <algorithm>
 #include <cfloat>
+#include <functional>
 #include <limits>
 #include <map>
 #include <string>
@@ -87,6 +88,141 @@ void answersOfTheHost(IDispatch& diagnostics) {
   expect(first.references == 1 && second.references == 1, "no reference to a sink is left");
 }
 
+// Notes any event: its number, then the arguments as text, the status left out.
+class EventSink final : public Listener {
+ public:
+  std::vector<std::wstring> received;
+  std::function<void()> during = [] {};
+  LONG status = 0;
+
+  HRESULT STDMETHODCALLTYPE Invoke(DISPID member, REFIID, LCID, WORD, DISPPARAMS* parameters, VARIANT*,
+                                   EXCEPINFO*, UINT*) override {
+    std::wstring line = std::to_wstring(member);
+    for (UINT i = parameters->cArgs - 1; i > 0; --i) {
+      Value text;
+      const bool plain = SUCCEEDED(VariantChangeType(text.get(), &parameters->rgvarg[i], 0, VT_BSTR));
+      line += L" " + (plain ? text.text() : std::wstring(L"?"));
+    }
+    received.push_back(line);
+    *V_I4REF(&parameters->rgvarg[0]) = status;
+    during();
+    return S_OK;
+  }
+};
+
+void settingsForKeeping(IDispatch& diagnostics) {
+  chapter("settings for keeping");
+  Hosted hosted;
+  IDispatch& panel = *hosted.members.get();
+  put(panel, L"virtualFrontPanelId", 6);
+  call(panel, L"vfpSet", {0, 315, 0, kHardwareId});
+  EventSink sink;
+  DWORD cookie = 0;
+  const auto point = pointOf(panel, eventsOf(panel));
+  point->Advise(&sink, &cookie);
+  LONG kept = 0;
+  sink.during = [&] {
+    const Value list = call(panel, L"Settings");
+    if (V_VT(&list.variant()) == (VT_ARRAY | VT_VARIANT))
+      SafeArrayGetUBound(V_ARRAY(&list.variant()), 1, &kept);
+  };
+  sink.status = 2;
+  call(diagnostics, L"Clear");
+  expect(call(panel, L"vfpOp", {0, 9}).number() == 0 && call(panel, L"vfpOp", {0, 13, 77}).number() == 0,
+         "both saves answer 0");
+  const std::wstring resource = std::to_wstring(kHardwareId);
+  expect(sink.received == std::vector<std::wstring>{L"3 " + resource + L" 6 ?", L"4 77 " + resource + L" 6"},
+         "a list is handed over, and the id of a set-up");
+  expect(kept > 10, "whose settings can be read inside the event");
+  expect(takeMessages(diagnostics) ==
+             L"SpectrumView::saveBase() status = 2|SpectrumView::saveSetup() status = 2|",
+         "a host that refuses is reported");
+  call(panel, L"PopUp_Click", {0, 1002});
+  expect(sink.received.back() == L"1 " + resource + L" 6 21 0", "the menu's request carries its argument");
+  call(diagnostics, L"Clear");
+  point->Unadvise(cookie);
+}
+
+constexpr VARTYPE kAutomationTypes[] = {
+    VT_EMPTY, VT_NULL,    VT_I2,      VT_I4, VT_R4,  VT_R8,  VT_CY,  VT_DATE, VT_BSTR, VT_DISPATCH, VT_ERROR,
+    VT_BOOL,  VT_UNKNOWN, VT_DECIMAL, VT_I1, VT_UI1, VT_UI2, VT_UI4, VT_I8,   VT_UI8,  VT_INT,      VT_UINT};
+
+// A value of every type that a host can make, and a reference to it.
+std::vector<VARIANT> everyType(std::vector<Value>& owned) {
+  static LONGLONG cell[4] = {};
+  std::vector<VARIANT> values;
+  for (const VARTYPE type : kAutomationTypes) {
+    VARIANT value{};
+    V_VT(&value) = type;
+    if (type != VT_BSTR && type != VT_DECIMAL) V_I8(&value) = 0;
+    values.push_back(value);
+    VARIANT reference{};
+    V_VT(&reference) = static_cast<VARTYPE>(VT_BYREF | type);
+    V_BYREF(&reference) = cell;
+    if (type <= VT_NULL) continue;  // neither is referred to, nor an array's element
+    values.push_back(reference);
+    VARIANT array{};
+    V_VT(&array) = static_cast<VARTYPE>(VT_ARRAY | type);
+    for (const UINT dimensions : {1U, 2U}) {
+      SAFEARRAYBOUND bounds[2] = {{2, 0}, {2, 0}};
+      V_ARRAY(&array) = SafeArrayCreate(type, dimensions, bounds);
+      if (V_ARRAY(&array) == nullptr) continue;
+      Value keeper;
+      *keeper.get() = array;
+      owned.push_back(std::move(keeper));
+      values.push_back(array);
+    }
+    V_ARRAY(&array) = nullptr;
+    values.push_back(array);
+  }
+  return values;
+}
+
+bool isStatus(const Value& answer) {
+  const int status = answer.number();
+  return V_VT(&answer.variant()) == VT_I4 && (status == 0 || status == -1 || status == -8);
+}
+
+Value callWith(IDispatch& object, const wchar_t* name, std::vector<VARIANT> arguments) {
+  std::reverse(arguments.begin(), arguments.end());
+  DISPPARAMS parameters{arguments.data(), nullptr, static_cast<UINT>(arguments.size()), 0};
+  Value result;
+  object.Invoke(memberOf(object, name), IID_NULL, LOCALE_USER_DEFAULT, DISPATCH_METHOD, &parameters,
+                result.get(), nullptr, nullptr);
+  return result;
+}
+
+void anyValueAtAll(IDispatch& diagnostics) {
+  chapter("any value at all");
+  Hosted hosted;
+  IDispatch& panel = *hosted.members.get();
+  std::vector<Value> owned;
+  const Value zero(0);
+  const std::vector<VARIANT> values = everyType(owned);
+  int strange = 0;
+  for (const VARIANT& value : values) {
+    for (const int code : {9, 10, 13, 15, 21, 43, 312, 314, 315, 322, 700, 704, 706, 716, 727, 740, 810}) {
+      const Value number(code);
+      strange +=
+          !isStatus(callWith(panel, L"vfpSet", {zero.variant(), number.variant(), zero.variant(), value}));
+      strange += !isStatus(callWith(panel, L"vfpOp", {zero.variant(), number.variant(), value}));
+      strange += !isStatus(callWith(panel, L"displayParameter", {number.variant(), value}));
+    }
+    LONG cursor = 0;
+    LONG left = 2;
+    VARIANT byCursor{};
+    V_VT(&byCursor) = VT_BYREF | VT_I4;
+    V_I4REF(&byCursor) = &cursor;
+    VARIANT byLeft = byCursor;
+    V_I4REF(&byLeft) = &left;
+    strange += !isStatus(
+        callWith(panel, L"displayData", {value, value, byCursor, byLeft, zero.variant(), zero.variant()}));
+  }
+  expect(strange == 0, "every entry point answers a status to " + std::to_string(values.size()) + " values" +
+                           (strange == 0 ? "" : ", but not " + std::to_string(strange) + " times"));
+  call(diagnostics, L"Clear");
+}
+
 void closedInItsOwnRequest(HWND window) {
   chapter("closed in its own request");
   FullContainer container(window);
@@ -152,10 +288,12 @@ void tellsItsPlace(HWND window) {
   Hosted hosted;
   hosted.object->SetClientSite(&container);
   call(*hosted.members.get(), L"vfpSet", {0, 314, 0, L"Receiver 1"});
+  call(*hosted.members.get(), L"vfpSet", {0, 702, 0, 4500});
   call(*hosted.members.get(), L"vfpOp", {0, 12});
-  const std::vector<std::wstring> expected = {L"Caption=Receiver 1", L"Visible=False", L"ViewState=0",
-                                              L"Visible=True", L"Caption=Receiver 1"};
-  expect(place.told == expected, "caption, visibility and state reach the container's place");
+  const std::vector<std::wstring> expected = {L"Caption=Receiver 1", L"Visible=False",     L"ViewState=0",
+                                              L"Width=4500",         L"Visible=False",     L"ViewState=0",
+                                              L"Visible=True",       L"Caption=Receiver 1"};
+  expect(place.told == expected, "caption, size, visibility and state reach the container's place");
   container.extender = hosted.members.get();
   expect(call(*hosted.members.get(), L"vfpOp", {0, 12}).number() == 0,
          "a container that answers the control itself is not asked in circles");
@@ -568,6 +706,8 @@ void worksWithoutMaskedExceptions(HWND window) {
 
 void checkAll(IDispatch& diagnostics, HWND window) {
   answersOfTheHost(diagnostics);
+  settingsForKeeping(diagnostics);
+  anyValueAtAll(diagnostics);
   closedInItsOwnRequest(window);
   takeMessages(diagnostics);  // what closing in the middle of a request reports is not looked at
   showsBoxesToUsersOnly(diagnostics, window);

@@ -5,7 +5,8 @@
 namespace frontpanels::testing {
 namespace {
 
-constexpr const wchar_t* kPlaceNames[] = {L"Caption", L"Visible", L"ViewState"};
+constexpr const wchar_t* kPlaceNames[] = {L"Caption", L"Visible", L"ViewState", L"Left",
+                                          L"Top",     L"Width",   L"Height"};
 
 }  // namespace
 
@@ -23,7 +24,7 @@ HRESULT RequestSink::Invoke(DISPID member, REFIID, LCID, WORD, DISPPARAMS* param
 }
 
 HRESULT PlaceProperties::GetIDsOfNames(REFIID, LPOLESTR* names, UINT, LCID, DISPID* ids) {
-  for (DISPID i = 0; i < 3; ++i)
+  for (DISPID i = 0; i < 7; ++i)
     if (std::wstring(names[0]) == kPlaceNames[i]) return ids[0] = i, S_OK;
   return DISP_E_UNKNOWNNAME;
 }

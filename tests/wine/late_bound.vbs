@@ -2,7 +2,7 @@
 Option Explicit
 
 Const SpectrumPath = "Brantor Scanner/Spectrum/Spectrum Trace"
-Dim folder, diagnostics, panel, hub
+Dim folder, diagnostics, panel, hub, buffer, length
 
 Sub Check(what, actual, expected)
   If CStr(actual) = CStr(expected) Then
@@ -70,6 +70,86 @@ Sub Sweep()
   Check "a sweep of 514 points is refused", LastMessage(), "SpectrumView::DfiSpectrum_DataChanged()|Subscript out of range"
 End Sub
 
+Function ResultsOf(resource, carrierAt)
+  Dim levels(512), i
+  For i = 0 To 512
+    levels(i) = -100
+  Next
+  levels(carrierAt) = -25
+  Set buffer = CreateObject("FrontPanels.ResultBuffer")
+  buffer.HardwareId resource
+  buffer.BeginMeasurement 12
+  buffer.BeginSubMeasurement 1
+  buffer.BeginRecord 25
+  buffer.Float32Array levels
+  buffer.EndRecord
+  buffer.BeginRecord 4711
+  buffer.Int16 1
+  buffer.EndRecord
+  buffer.EndSubMeasurement
+  buffer.EndMeasurement
+  length = buffer.Length
+  ResultsOf = buffer.Bytes
+End Function
+
+Function Listed(list)
+  Dim i
+  For i = 0 To UBound(list)
+    Listed = Listed & " " & list(i)
+  Next
+End Function
+
+Sub Results()
+  Dim other, bytes, cursor, bytesLeft, list, i, again
+  Set other = CreateObject("FrontPanels.SpectrumView")
+  Check "the measurement is taken", other.vfpSet(0, 312, 0, 12), 0
+  diagnostics.Clear
+  bytes = ResultsOf(5, 100)
+  bytesLeft = length
+  cursor = 0
+  Check "a buffer for any resource is shown while none is set", other.displayData(Empty, bytes, cursor, bytesLeft, 0, 0), 0
+  Check "the cursor stands at the end", cursor, length
+  Check "with nothing left", bytesLeft, 0
+  Check "a record that the panel does not know is stepped over", diagnostics.Count, 1
+  Check "with a report", LastMessage(), "SpectrumView::DisplayData() ... no data read for result type 4711|"
+  other.vfpOp 0, 10, 10
+  other.addMarker
+  other.markerToMax
+  Check "the report holds the marker's reading", InStr(other.reportHtml, "<td>1</td>") > 0, True
+  Check "and the picture", InStr(other.reportHtml, "src=""data:image/png;base64,iVBORw0KGgo") > 0, True
+
+  Check "the resource is set", other.vfpSet(0, 315, 0, 6), 0
+  cursor = 0
+  bytesLeft = length
+  Check "another resource's buffer is refused", other.displayData(Empty, bytes, cursor, bytesLeft, 0, 0), -8
+  Check "word for word", LastMessage(), "clsBaseVFP::displayData() ... wrong resource id|"
+  other.vfpSet 0, 312, 0, 13
+  bytes = ResultsOf(6, 400)
+  cursor = 0
+  bytesLeft = length
+  diagnostics.Clear
+  Check "another measurement's results are shown", other.displayData(Empty, bytes, cursor, bytesLeft, 0, 0), 0
+  Check "and reported", Replace(diagnostics.Message(0), vbCr, "|"), "clsBaseVFP::displayData() ... wrong measurement id|"
+  cursor = 3
+  Check "a cursor that lies about the count is refused", other.displayData(Empty, bytes, cursor, length, 0, 0), -8
+  Check "and stays", cursor, 3
+  Check "numbers may stand for bytes", other.displayData(Empty, Array(6, 0, 0, 0, 0, 0, 0, 0), 0, 8, 0, 0), 0
+  Check "but 256 is none", other.displayData(Empty, Array(256, 0, 0, 0, 0, 0, 0, 0), 0, 8, 0, 0), -8
+
+  list = other.Settings
+  Set again = CreateObject("FrontPanels.SpectrumView")
+  again.vfpOp 0, 10, 10
+  For i = 0 To UBound(list) Step 2
+    If again.vfpSet(0, list(i), 0, list(i + 1)) <> 0 Then Check "setting " & list(i) & " is taken", False, True
+  Next
+  Check "what was handed over restores another panel", Listed(again.Settings), Listed(list)
+  other.baseInstance.warnOnUnhandledParameters = True
+  other.vfpSet 0, 4000, 0, 1
+  Check "the base is reached by name", LastMessage(), "SpectrumView::vfpSet() ... unhandled parameterType = 4000|"
+  Check "and read", other.baseInstance.measurementId, 13
+  diagnostics.Clear
+End Sub
+
 Sub Closing()
   Check "closing answers 0", panel.vfpOp(0, 1), 0
   Check "then everything does", panel.vfpSet(0, 312, 0, "abc"), 0
@@ -89,6 +169,7 @@ Check "messages can be kept without boxes", diagnostics.ShowMessages, False
 Statuses
 Errors
 Sweep
+Results
 Closing
 Set panel = Nothing
 WScript.Echo "script finished"

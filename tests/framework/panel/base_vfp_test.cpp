@@ -462,8 +462,7 @@ TEST_F(BaseVfpTest, WhatASaveHandsOverRestoresAnotherPanel) {
   EXPECT_EQ(kept.size(), 6U + 5U + 3U + 4U + 4U + 1U);
 
   Panel fresh{environment};
-  const auto painter = std::make_shared<clsMultiTracePainter>(gdi);
-  painter->numberOfTraces(1);
+  const auto painter = std::make_shared<clsMultiTracePainter>(gdi);  // before its first values
   fresh.base.traceManager().addTraceObject(painter, 25);
   for (const PanelSetting& setting : kept) EXPECT_EQ(fresh.set(setting.parameterType, setting.value), 0);
   EXPECT_EQ(fresh.base.settings(), kept);
