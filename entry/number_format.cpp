@@ -114,6 +114,16 @@ void appendNumber(std::string& text, double number, std::string_view format) {
   appendDigits(text, decimal, parsed);
 }
 
+double toSignificantDigits(double number) noexcept {
+  std::array<char, 32> text{};
+  const char* const end = std::to_chars(text.data(), text.data() + text.size(), number,
+                                        std::chars_format::scientific, kSignificantDigits - 1)
+                              .ptr;
+  double rounded = number;  // stays where no double is that large, or the number is none
+  std::from_chars(text.data(), end, rounded);
+  return rounded;
+}
+
 std::string_view formatForStep(double step) noexcept {
   return formatWithDecimals(step > 0 ? 1 - std::floor(std::log10(step)) : 0);
 }

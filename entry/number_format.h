@@ -14,6 +14,10 @@ namespace frontpanels {
 // as it was.
 void appendNumber(std::string& text, double number, std::string_view format);
 
+// The number that its 15 significant digits read as: what a sum or a product of decimal numbers would be
+// without the error of binary ones.
+[[nodiscard]] double toSignificantDigits(double number) noexcept;
+
 // The format with as many optional decimals as tell apart numbers that are `step` apart, to one digit more
 // than the step's first: "0" for 10, "0.#" for 2.5, "0.###" for 0.02. "0" when the step is no positive
 // number.

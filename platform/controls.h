@@ -119,6 +119,11 @@ class Control {
   // user could not have it.
   void SetFocus();
 
+  // Tells the user that an entry is refused.
+  void beep() {
+    if (peer_ != nullptr) peer_->beep();
+  }
+
   // What a user does. Nothing happens to a control that is not usable; the focus is moved by the caller.
   virtual void userClick();
   // One key that types `code`: raises KeyDown and KeyPress, and has its effect unless it was consumed.

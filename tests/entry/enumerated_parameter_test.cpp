@@ -1,32 +1,16 @@
 #include "entry/enumerated_parameter.h"
 
-#include <map>
 #include <vector>
 
 #include "framework/support/enumerated_tables.h"
-#include "platform/runtime_error.h"
+#include "tests/support/listed_records.h"
 #include "tests/support/reporting_fixture.h"
 
 namespace frontpanels {
 namespace {
 
 using Messages = std::vector<std::string>;
-
-class ListedRecords : public HostRecordSet {
- public:
-  explicit ListedRecords(std::vector<std::map<std::string, Variant, std::less<>>> records)
-      : records_(std::move(records)) {}
-
-  [[nodiscard]] std::size_t count() const override { return records_.size(); }
-  [[nodiscard]] Variant field(std::size_t record, std::string_view name) const override {
-    const auto found = records_.at(record).find(name);
-    if (found == records_.at(record).end()) raiseInvalidProcedureCall();
-    return found->second;
-  }
-
- private:
-  std::vector<std::map<std::string, Variant, std::less<>>> records_;
-};
+using testing::ListedRecords;
 
 // The averaging is the type at hand: Off 32, Linear 0, Exponential 1, Max Hold 2, Min Hold 3.
 class EnumeratedParameterTest : public testing::ReportingTest {
