@@ -18,10 +18,10 @@ namespace frontpanels {
 inline constexpr std::int16_t kNoTabIndex = -1;
 
 struct ControlRow {
-  const char* name;
-  ControlKind kind;
-  const char* parent;  // a frame or picture further up in the table, "" for the panel itself
-  const char* caption;
+  const char* name = "";
+  ControlKind kind{};
+  const char* parent = "";  // a frame or picture further up in the table; none for the panel itself
+  const char* caption = "";
   ControlPlace place;  // relative to the parent
   std::int16_t tabIndex = kNoTabIndex;
   bool visible = true;
@@ -33,6 +33,7 @@ class ControlSet final : private ControlScope {
   // A spin button steps the text box last listed before it. Raises error 457 for a name that comes twice,
   // "Invalid procedure call or argument" for a parent that cannot be one and a spin button without a box.
   explicit ControlSet(std::span<const ControlRow> rows);
+  ~ControlSet() override = default;
   ControlSet(const ControlSet&) = delete;
   ControlSet& operator=(const ControlSet&) = delete;
 

@@ -62,6 +62,21 @@ unit_tests() {
   grep -E 'FAILED|Failure' "$out/cross_tests.txt"
 }
 
+# The fields of a panel at the usual scale and at a larger one, which programs learn with the session.
+fields() {
+  local dpi key='HKCU\Control Panel\Desktop' pictures=$root/build/screenshots
+  mkdir -p "$pictures"
+  rm -f "$pictures"/controls_*.png
+  for dpi in 144 96; do
+    wine reg add "$key" /v LogPixels /t REG_DWORD /d "$dpi" /f >/dev/null 2>&1
+    wineserver -k
+    wineserver -w
+    program "fields_$dpi" controls_test "$(windows_path "$pictures")"
+    [ -s "$pictures/controls_$dpi.png" ]
+    judge $? "the fields are pictured at $dpi dots an inch"
+  done
+}
+
 # Everything that the machine knows about classes, as text.
 export_classes() {
   wine reg export 'HKLM\Software\Classes' "$(windows_path "$out/$1.reg")" /y >/dev/null 2>&1
@@ -140,6 +155,7 @@ export_classes undone
 cmp -s "$out/before.txt" "$out/undone.txt"
 judge $? "the registry is as it was before, key by key"
 for_one_user
+fields
 wineserver -k >/dev/null 2>&1
 
 printf '%d passed, %d failed\n' "$passed" "$failed"
