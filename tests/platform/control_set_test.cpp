@@ -85,7 +85,7 @@ TEST_F(ControlSetTest, TabStopsAtUsableControlsAndOnceInAnOptionGroup) {
   };
   EXPECT_EQ(walk(true), (Events{"CenterTextBox", "TimeOption", "UplinkOption", "TypeCombo", "AutoBox",
                                 "SingleButton"}));  // nothing chosen: the group's first in the table
-  set.control("DownlinkOption").SetFocus();  // not the one that the group is entered by
+  set.control("DownlinkOption").SetFocus();         // not the one that the group is entered by
   EXPECT_EQ(walk(true), (Events{"TypeCombo", "AutoBox", "SingleButton"}));
   set.optionButton("DownlinkOption").Value(true);
   set.list("TypeCombo").Enabled(false);
