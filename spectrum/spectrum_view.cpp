@@ -370,8 +370,8 @@ std::string SpectrumView::Implementation::reportHtml() {
                      {"Start", frequency.formatter(plan_.startHz())},
                      {"Stop", frequency.formatter(plan_.stopHz())}};
   if (clsMultiTracePainter* const painter = findPainter()) {
-    const clsNumericEntry& level = painter->yAxisFormatter();
-    report.settings.push_back({"Reference level", level.formatter(painter->gridScaleTop().value_or(0))});
+    const std::string top = numberToText(painter->gridScaleTop().value_or(0));
+    report.settings.push_back({"Reference level", top + " " + painter->yAxisLabel()});
     report.settings.push_back({"Scale", numberToText(painter->verticalResolution()) + " dB/div"});
     for (const MarkerReading& reading : painter->markerReadings())
       report.readings.push_back({reading.id, reading.x, reading.y});

@@ -8,6 +8,7 @@
 
 #include "framework/panel/base_vfp.h"
 #include "painters/multi_trace_painter.h"
+#include "platform/result_writer.h"
 #include "spectrum/frequency_plan.h"
 #include "tests/support/fake_surface.h"
 #include "tests/support/recording_gdi.h"
@@ -85,6 +86,87 @@ TEST_F(SpectrumViewTest, ASweepShowsItsOwnPointsOfWhichMoreThan513AreAnErrorThat
   ASSERT_EQ(traceLines().size(), 2U);
   EXPECT_EQ(traceLines()[0].points.size(), 2U);
   EXPECT_EQ(traceLines()[1].points.size(), 3U);
+}
+
+TEST_F(SpectrumViewTest, ASweepInAResultBufferIsDrawnLikeOneFromTheHub) {
+  const auto display = [this](const std::vector<float>& levels) {
+    ResultWriter writer;
+    writer.HardwareId(1);
+    writer.BeginMeasurement(0x7FFF);
+    writer.BeginSubMeasurement(1);
+    writer.BeginRecord(25);
+    writer.Float32Array(levels);
+    writer.EndRecord();
+    writer.EndSubMeasurement();
+    writer.EndMeasurement();
+    const std::vector<std::uint8_t> bytes = writer.Bytes();
+    std::int32_t dataPointer = 0;
+    auto dataCount = static_cast<std::int32_t>(bytes.size());
+    return panel->displayData({}, bytes, dataPointer, dataCount, 25, 0);
+  };
+  panel->vfpSet(0, 312, 0, 0x7FFF);
+  EXPECT_EQ(display({-30, -50, -40, -60}), 0);
+  ASSERT_EQ(traceLines().size(), 1U);
+  EXPECT_EQ(traceLines()[0].points.size(), 4U);
+  EXPECT_EQ(messages(), Messages{});
+  gdi.clear();
+  EXPECT_EQ(display(std::vector<float>(514, -50.0F)), 0);  // the picture stays, the record is stepped over
+  EXPECT_TRUE(traceLines().empty());
+  EXPECT_EQ(messages(),
+            (Messages{"SpectrumView::resultData()\rSubscript out of range",
+                      "SpectrumView::DisplayData() ... no data read for result type Spectrum\r"}));
+}
+
+TEST_F(SpectrumViewTest, TheReportIsOneFragmentWithSettingsReadingsAndPicture) {
+  panel->vfpSet(0, 314, 0, "A <&> \"B\"");
+  panel->vfpSet(0, 13, 0, 98e6);
+  panel->vfpSet(0, 14, 0, 2e6);
+  publish({-60, -30, -60});
+  panel->addMarker();
+  panel->markerToMax();
+  owner.png = {0x89, 0x50, 0x4E, 0x47};
+  EXPECT_EQ(panel->base().reportHtml(),
+            "<div class=\"front-panel\">\n<h2>A &lt;&amp;&gt; &quot;B&quot;</h2>\n<table>\n"
+            "<tr><th>Center</th><td>98 MHz</td></tr>\n<tr><th>Span</th><td>2 MHz</td></tr>\n"
+            "<tr><th>Start</th><td>97 MHz</td></tr>\n<tr><th>Stop</th><td>99 MHz</td></tr>\n"
+            "<tr><th>Reference level</th><td>-20 dBm</td></tr>\n"
+            "<tr><th>Scale</th><td>10 dB/div</td></tr>\n</table>\n<table>\n"
+            "<tr><th>Marker</th><th>Frequency</th><th>Level</th></tr>\n"
+            "<tr><td>1</td><td>98 MHz</td><td>-30 dBm</td></tr>\n</table>\n"
+            "<img alt=\"A &lt;&amp;&gt; &quot;B&quot;\" src=\"data:image/png;base64,iVBORw==\">\n</div>\n");
+}
+
+TEST_F(SpectrumViewTest, SavesHandOverTheFrequenciesAndLinksSayWhatTheyFind) {
+  panel->vfpSet(0, 315, 0, 5);
+  panel->vfpSet(0, 13, 0, 98e6);
+  owner.take();
+  EXPECT_EQ(panel->vfpOp(0, 9, {}), 0);
+  EXPECT_EQ(panel->vfpOp(0, 13, 77), 0);
+  EXPECT_EQ(panel->vfpOp(0, 13, "x"), -8);
+  EXPECT_EQ(owner.take(), (Messages{"saveDisplaySettings 5 0", "saveSetup 77 5 0"}));
+  EXPECT_EQ(owner.kept[owner.kept.size() - 2], (PanelSetting{13, 98e6}));
+  clsBaseVFP& base = panel->base();
+  Variant types;
+  EXPECT_EQ(base.measurementInfo(types), 0);
+  EXPECT_EQ(types, Variant(Variant::Int32s{25}));
+  EXPECT_EQ(base.initializeLinkValue(3, 13), Variant(98e6));
+  EXPECT_TRUE(base.actionEnabled(1) && base.actionEnabled(9));
+  clearMessages();
+  EXPECT_TRUE(base.initializeLinkValue(3, 16).isEmpty());
+  EXPECT_TRUE(base.initializeLinkValue(1, 13).isEmpty());
+  for (const std::int16_t type : {std::int16_t{1}, std::int16_t{2}, std::int16_t{3}, std::int16_t{4}})
+    base.frontPanelLink({type, 99, true, true, true});
+  base.frontPanelLink({2, 1, true, true, true});
+  const std::string name = "SpectrumView::";
+  EXPECT_EQ(messages(), (Messages{name + "initializeLinkValue() ... unhandled parameter\r",
+                                  name + "initializeLinkValue()...unsupported link type\r",
+                                  name + "frontPanelLink() ... unhandled result\r",
+                                  name + "frontPanelLink() ... unhandled action\r",
+                                  name + "frontPanelLink() ... unhandled parameter\r",
+                                  name + "frontPanelLink()...unrecognized link type\r",
+                                  "I don't know how to invoke close yet!\r"}));
+  panel->vfpSet(0, 322, 0, 1);
+  EXPECT_FALSE(base.actionEnabled(1));
 }
 
 TEST_F(SpectrumViewTest, OperationTenTakesOnlyTheNumberTen) {
