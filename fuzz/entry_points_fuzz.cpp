@@ -2,40 +2,69 @@
 // takes.
 #include <cstdint>
 #include <iterator>
+#include <memory>
 
 #include "framework/panel/base_vfp.h"
 #include "framework/panel/host_codes.h"
+#include "framework/panel/hosted_panel.h"
 #include "fuzz/fuzz_input.h"
 #include "fuzz/fuzz_variant.h"
 #include "fuzz/panel_under_test.h"
+#include "painters/multi_trace_painter.h"
+#include "platform/runtime_error.h"
 
 namespace frontpanels::fuzz {
 namespace {
 
-constexpr int kMaxCalls = 64;
+constexpr int kMaxCalls = 96;
 
 using Call = void (*)(PanelUnderTest& test, FuzzInput& input);
 
-void requireStatus(PanelUnderTest& test, bool closed, std::int32_t status) {
+// What an entry point answers; it must not come back with anything else than one of the three.
+template <class Entry>
+void enter(PanelUnderTest& test, Entry entry) {
+  const bool closed = test.panel().base().closing();
+  const std::int32_t status = entry();
   require(status == kStatusDone || status == kStatusUnknownOperation || status == kStatusUnusableParameter,
           "a status is one of three");
   require(!closed || status == kStatusDone, "a closed panel answers 0");
   require(!closed || test.panel().base().closing(), "a closed panel stays closed");
 }
 
-void vfpOp(PanelUnderTest& test, FuzzInput& input) {
-  const bool closed = test.panel().base().closing();
+// The panel's own entry points and the base's on the reverse path.
+template <auto entry, class Object>
+void operate(PanelUnderTest& test, Object& object, FuzzInput& input) {
   const auto hardwareId = input.number<std::int32_t>();
   const auto operation = input.number<std::int16_t>();
-  requireStatus(test, closed, test.panel().vfpOp(hardwareId, operation, takeVariant(input)));
+  const Variant parameter = takeVariant(input);
+  enter(test, [&] { return (object.*entry)(hardwareId, operation, parameter); });
 }
 
-void vfpSet(PanelUnderTest& test, FuzzInput& input) {
-  const bool closed = test.panel().base().closing();
+template <auto entry, class Object>
+void set(PanelUnderTest& test, Object& object, FuzzInput& input) {
   const auto hardwareId = input.number<std::int32_t>();
   const auto parameterType = input.number<std::int16_t>();
   const auto index = input.number<std::int16_t>();
-  requireStatus(test, closed, test.panel().vfpSet(hardwareId, parameterType, index, takeVariant(input)));
+  const Variant value = takeVariant(input);
+  enter(test, [&] { return (object.*entry)(hardwareId, parameterType, index, value); });
+}
+
+void displayData(PanelUnderTest& test, FuzzInput& input) {
+  const auto buffer = input.bytes(input.number<std::uint16_t>());
+  std::int32_t cursor = 0;
+  auto count = static_cast<std::int32_t>(buffer.size());
+  enter(test, [&] { return test.panel().displayData(Variant(), buffer, cursor, count, 0, 0); });
+}
+
+void displayParameter(PanelUnderTest& test, FuzzInput& input) {
+  const auto order = input.number<std::int16_t>();
+  const Variant value = takeVariant(input);
+  enter(test, [&] { return test.panel().displayParameter(order, value); });
+}
+
+void PopUp_Click(PanelUnderTest& test, FuzzInput& input) {
+  const auto subjectId = input.number<std::int32_t>();
+  test.panel().PopUp_Click(subjectId, input.number<std::int16_t>());
 }
 
 void publish(PanelUnderTest& test, FuzzInput& input) {
@@ -69,12 +98,60 @@ void call(PanelUnderTest& test, FuzzInput&) {
   (test.panel().*member)();
 }
 
+template <auto member>
+void baseCall(PanelUnderTest& test, FuzzInput&) {
+  static_cast<void>((test.panel().base().*member)());
+}
+
+// What automation can ask of the base and of the surface; a property may refuse its value.
+void askBase(PanelUnderTest& test, FuzzInput& input) {
+  clsBaseVFP& base = test.panel().base();
+  const auto small = input.number<std::int16_t>();
+  Variant types = takeVariant(input);
+  static_cast<void>(base.initializeLinkValue(small, small));
+  static_cast<void>(base.actionEnabled(small));
+  base.measurementInfo(types);
+  base.frontPanelLink({.linkType = small, .genericId = small});
+  bool cancel = false;
+  base.QueryUnload(cancel);
+}
+
+// A further trace, as panels with several kinds of results have them.
+void addTraceObject(PanelUnderTest& test, FuzzInput& input) {
+  test.panel().base().traceManager().addTraceObject(std::make_shared<clsMultiTracePainter>(test.gdi()),
+                                                    input.number<std::int16_t>());
+}
+
+void setSurface(PanelUnderTest& test, FuzzInput& input) {
+  HostedPanel& surface = test.panel().control();
+  const auto value = input.number<std::int16_t>();
+  try {
+    surface.ViewDrawWidth(value);
+    surface.ViewScaleMode(value);
+  } catch (const RuntimeError&) {  // the documented refusal
+  }
+}
+
+void setFlags(PanelUnderTest& test, FuzzInput& input) {
+  clsBaseVFP& base = test.panel().base();
+  const auto bits = input.number<std::uint8_t>();
+  base.windowOwner = (bits & 1) == 0;
+  base.warnOnUnhandledParameters = (bits & 2) != 0;
+  base.captionStatus = (bits & 4) == 0;
+  base.multipleMeasurementVfp = (bits & 8) != 0;
+  base.rightPanelVisible((bits & 16) == 0);
+  base.bottomPanelVisible((bits & 32) == 0);
+  test.view.shown = (bits & 64) != 0;
+  test.owner.obeys = (bits & 128) != 0 ? &test.panel() : nullptr;
+}
+
 using V = SpectrumView;
+using B = clsBaseVFP;
 
 // make_seeds writes the places of these rows.
 constexpr Call kCalls[] = {
-    vfpOp,
-    vfpSet,
+    [](PanelUnderTest& test, FuzzInput& input) { operate<&V::vfpOp>(test, test.panel(), input); },
+    [](PanelUnderTest& test, FuzzInput& input) { set<&V::vfpSet>(test, test.panel(), input); },
     publish,
     resize,
     call<&V::Paint>,
@@ -88,18 +165,24 @@ constexpr Call kCalls[] = {
     call<&V::addMarker>,
     call<&V::markerToMax>,
     call<&V::markerToMin>,
+    setFlags,
+    displayData,
+    displayParameter,
+    PopUp_Click,
+    [](PanelUnderTest& test, FuzzInput& input) { operate<&B::baseVfpOp>(test, test.panel().base(), input); },
+    [](PanelUnderTest& test, FuzzInput& input) { set<&B::baseVfpSet>(test, test.panel().base(), input); },
     [](PanelUnderTest& test, FuzzInput& input) { test.owner.status = input.number<std::int32_t>(); },
-    [](PanelUnderTest& test, FuzzInput& input) { test.view.shown = (input.number<std::uint8_t>() & 1) != 0; },
     [](PanelUnderTest& test, FuzzInput& input) {
       test.windowing.captured = WindowHandle{input.number<std::uint8_t>()};
     },
-    [](PanelUnderTest& test, FuzzInput&) { test.panel().base().closeVfp(); },
-    [](PanelUnderTest& test, FuzzInput& input) {
-      test.panel().base().rightPanelVisible((input.number<std::uint8_t>() & 1) != 0);
-    },
-    [](PanelUnderTest& test, FuzzInput& input) {
-      test.panel().base().bottomPanelVisible((input.number<std::uint8_t>() & 1) != 0);
-    },
+    call<&V::Activate>,
+    baseCall<&B::closeVfp>,
+    baseCall<&B::saveVfp>,
+    baseCall<&B::reportHtml>,
+    baseCall<&B::logIndicatorHandler>,
+    askBase,
+    setSurface,
+    addTraceObject,
 };
 
 void run(FuzzInput input) {

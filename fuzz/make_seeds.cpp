@@ -32,6 +32,20 @@ constexpr std::size_t kCountAt = 18;   // of its array
 
 void append(Bytes& bytes, const Bytes& more) { bytes.insert(bytes.end(), more.begin(), more.end()); }
 
+template <class T>
+Bytes raw(T value) {
+  Bytes bytes(sizeof(T));
+  std::memcpy(bytes.data(), &value, sizeof(T));
+  return bytes;
+}
+
+template <class... Parts>
+Bytes joined(const Parts&... parts) {
+  Bytes bytes;
+  (append(bytes, raw(parts)), ...);
+  return bytes;
+}
+
 // --- Result buffers
 
 void sweepRecord(ResultWriter& writer, std::size_t points) {
@@ -143,6 +157,24 @@ Seeds resultReaderSeeds() {
   return seeds;
 }
 
+// The bits of the first byte stand in display_data_fuzz.cpp.
+Seeds displayDataSeeds() {
+  constexpr std::uint8_t kResourceKnownTraceAdded = 3;
+  constexpr std::uint8_t kCursorGiven = 4;
+  constexpr std::uint8_t kTwice = 8;
+  Seeds seeds;
+  for (const Seed& seed : buffers()) {
+    Bytes plain{kResourceKnownTraceAdded};
+    append(plain, seed.bytes);
+    seeds.push_back({seed.name, plain});
+    Bytes placed{kCursorGiven | kTwice};
+    append(placed, joined(std::int32_t{0}, static_cast<std::int32_t>(seed.bytes.size())));
+    append(placed, seed.bytes);
+    seeds.push_back({seed.name + "_placed", placed});
+  }
+  return seeds;
+}
+
 // Calls by their places in the table of entry_points_fuzz.cpp, values by theirs in fuzz_variant.cpp.
 enum class Call : std::uint8_t { vfpOp, vfpSet, Publish, Resize, Paint, MouseDown, MouseMove, MouseUp };
 enum class Kind : std::uint8_t { Empty = 0, Boolean = 2, Int16 = 4, Double = 8, Text = 9, Singles = 17 };
@@ -150,26 +182,18 @@ constexpr std::uint8_t kKeyDown = 11;
 constexpr std::uint8_t kAddMarker = 12;
 constexpr std::uint8_t kMarkerToMax = 13;
 constexpr std::uint8_t kMarkerToMin = 14;
-constexpr std::uint8_t kShown = 16;
+constexpr std::uint8_t kFlags = 15;
+constexpr std::uint8_t kShown = 64;  // one of them
+constexpr std::uint8_t kObeys = 128;
+constexpr std::uint8_t kDisplayData = 16;
+constexpr std::uint8_t kPopUpClick = 18;
+constexpr std::uint8_t kAddTraceObject = 30;  // the last
 constexpr std::uint8_t kKinds = 20;
+constexpr std::int16_t kButtons[] = {1, 9, 21, 900, 901, 1002};
 
 constexpr std::int16_t kParameterCodes[] = {11,  13,  14,  15,  18,  43,  44,  45,  312, 314, 315, 322,
                                             700, 701, 702, 703, 704, 705, 706, 714, 716, 717, 719, 722,
                                             726, 727, 735, 736, 737, 740, 741, 742, 743, 744, 799, 810};
-
-template <class T>
-Bytes raw(T value) {
-  Bytes bytes(sizeof(T));
-  std::memcpy(bytes.data(), &value, sizeof(T));
-  return bytes;
-}
-
-template <class... Parts>
-Bytes joined(const Parts&... parts) {
-  Bytes bytes;
-  (append(bytes, raw(parts)), ...);
-  return bytes;
-}
 
 Bytes operation(std::int16_t code, const Bytes& parameter) {
   Bytes bytes = joined(Call::vfpOp, kHardwareId, code);
@@ -189,7 +213,7 @@ Bytes mouse(Call event, std::int16_t xTwips, std::int16_t yTwips) {
 
 // A panel with a trace and levels in it.
 Bytes running() {
-  Bytes bytes = joined(kShown, std::uint8_t{1});
+  Bytes bytes = joined(kFlags, kShown);
   append(bytes, operation(10, joined(Kind::Int16, std::int16_t{10})));
   append(bytes, operation(12, joined(Kind::Empty)));
   append(bytes, joined(Call::Publish, Kind::Singles, std::uint8_t{16}));
@@ -204,6 +228,21 @@ Bytes session(std::initializer_list<Bytes> calls) {
   return bytes;
 }
 
+// Three traces, and the pointer taken down the view: the bar between them is under it somewhere.
+Bytes draggedBar() {
+  const Bytes traces[] = {joined(kAddTraceObject, std::int16_t{26}),
+                          joined(kAddTraceObject, std::int16_t{27}), joined(Call::Paint)};
+  Bytes bytes = running();
+  for (const Bytes& call : traces) append(bytes, call);
+  for (std::int16_t y = 900; y < 1800; y = static_cast<std::int16_t>(y + 60)) {
+    append(bytes, mouse(Call::MouseMove, 1800, y));
+    append(bytes, mouse(Call::MouseDown, 1800, y));
+    append(bytes, mouse(Call::MouseMove, 1800, static_cast<std::int16_t>(y + 300)));
+    append(bytes, mouse(Call::MouseUp, 1800, static_cast<std::int16_t>(y + 300)));
+  }
+  return bytes;
+}
+
 Seeds entryPointSeeds() {
   const Bytes one = joined(Kind::Int16, std::int16_t{1});
   Seeds seeds{
@@ -211,6 +250,13 @@ Seeds entryPointSeeds() {
                            joined(kKeyDown, std::int16_t{39}, std::int8_t{0})})},
       {"drag", session({joined(kAddMarker), mouse(Call::MouseDown, 1800, 1300),
                         mouse(Call::MouseMove, 900, 1300), mouse(Call::MouseUp, 900, 1300)})},
+      {"markers_by_code",
+       session({parameter(740, one), parameter(741, joined(Kind::Boolean, std::uint8_t{1})),
+                parameter(744, one), parameter(743, one), parameter(742, one), parameter(735, one),
+                parameter(737, one)})},
+      {"saving",
+       session({joined(kFlags, std::uint8_t{kShown | kObeys}), operation(9, one), operation(13, one)})},
+      {"bar", draggedBar()},
       {"two_traces", session({running(), joined(Call::Resize, std::int16_t{320}, std::int16_t{200})})}};
   for (std::int16_t code = 0; code <= 22; ++code)
     seeds.push_back({"operation_" + std::to_string(code), session({operation(code, one)})});
@@ -219,6 +265,17 @@ Seeds entryPointSeeds() {
     seeds.push_back({name + "_number", session({parameter(code, joined(Kind::Double, 2.5))})});
     seeds.push_back({name + "_text", session({parameter(code, joined(Kind::Text, std::uint8_t{2}, '1', '2')),
                                               parameter(code, joined(Kind::Boolean, std::uint8_t{1}))})});
+  }
+  for (const std::int16_t button : kButtons)
+    seeds.push_back(
+        {"button_" + std::to_string(button),
+         session({joined(kFlags, std::uint8_t{kShown | kObeys}), joined(kPopUpClick, kHardwareId, button)})});
+  for (std::uint8_t call = 0; call <= kAddTraceObject; ++call)
+    seeds.push_back({"call_" + std::to_string(call), session({joined(call, 0, 0, 0, 0)})});
+  for (const Seed& seed : wholeBuffers()) {
+    Bytes call = joined(kDisplayData, static_cast<std::uint16_t>(seed.bytes.size()));
+    append(call, seed.bytes);
+    seeds.push_back({"display_" + seed.name, session({call})});
   }
   for (std::uint8_t kind = 0; kind < kKinds; ++kind) {
     Bytes value{kind};
@@ -249,6 +306,7 @@ int main(int argc, char** argv) {
   }
   const std::filesystem::path corpus(argv[1]);
   const bool written = write(corpus / "result_reader_fuzz", resultReaderSeeds()) &&
+                       write(corpus / "display_data_fuzz", displayDataSeeds()) &&
                        write(corpus / "entry_points_fuzz", entryPointSeeds());
   return written ? 0 : 1;
 }

@@ -9,26 +9,28 @@ namespace frontpanels::fuzz {
 namespace {
 
 // One for all inputs: looking for fonts takes longer than anything that a panel does.
-RasterGdi& gdi() {
-  static RasterGdi drawing;
-  return drawing;
+RasterGdi& drawing() {
+  static RasterGdi gdi;
+  return gdi;
 }
 
 DcHandle screen() {
-  static const DcHandle dc = gdi().createScreen(PanelUnderTest::kViewPx);
+  static const DcHandle dc = drawing().createScreen(PanelUnderTest::kViewPx);
   return dc;
 }
 
-std::size_t objects() { return gdi().liveObjects() + gdi().liveDcs(); }
+std::size_t objects() { return drawing().liveObjects() + drawing().liveDcs(); }
 
 }  // namespace
 
 PanelUnderTest::PanelUnderTest() : view(screen(), kViewPx), objectsBefore_(objects()) {
   messageLog().clear();
-  panel_ = std::make_unique<SpectrumView>(PanelEnvironment{gdi(), windowing, view, hub, ScreenMetrics{}, ""},
-                                          owner, owner);
+  panel_ = std::make_unique<SpectrumView>(
+      PanelEnvironment{drawing(), windowing, view, hub, ScreenMetrics{}, ""}, owner, owner);
   panel_->Form_Resize();
 }
+
+Gdi& PanelUnderTest::gdi() noexcept { return drawing(); }
 
 PanelUnderTest::~PanelUnderTest() {
   panel_.reset();

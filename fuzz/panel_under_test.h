@@ -24,7 +24,7 @@ class FuzzView : public GraphView {
   FuzzView(DcHandle dc, Size size) : sizePx(size), dc_(dc) {}
 
   [[nodiscard]] DcHandle hdc() override { return dc_; }
-  [[nodiscard]] WindowHandle hwnd() override { return {}; }
+  [[nodiscard]] WindowHandle hwnd() override { return WindowHandle{77}; }
   [[nodiscard]] Size clientSizePx() override { return sizePx; }
   [[nodiscard]] MousePointer mousePointer() override { return pointer_; }
   void mousePointer(MousePointer pointer) override { pointer_ = pointer; }
@@ -37,23 +37,29 @@ class FuzzView : public GraphView {
   MousePointer pointer_ = MousePointer::Default;
 };
 
-// Host and container, answering every request with the same status.
+// Host and container. It answers every request with the same status, and may first do to the panel what the
+// panel has asked for, as hosts do.
 class FuzzOwner : public PanelHost, public PanelContainer {
  public:
   std::int32_t status = 0;
+  SpectrumView* obeys = nullptr;  // the panel, while the host does as it asks
 
-  std::int32_t frontPanelOp(std::int32_t, std::int32_t, std::int16_t, const Variant&) override {
+  std::int32_t frontPanelOp(std::int32_t hwId, std::int32_t, std::int16_t operation,
+                            const Variant& argument) override {
+    if (obeys != nullptr) obeys->vfpOp(hwId, operation, argument);
     return status;
   }
-  std::int32_t frontPanelSet(std::int32_t, std::int32_t, std::int16_t, std::int16_t,
-                             const Variant&) override {
+  std::int32_t frontPanelSet(std::int32_t hwId, std::int32_t, std::int16_t parameterType, std::int16_t index,
+                             const Variant& value) override {
+    if (obeys != nullptr) obeys->vfpSet(hwId, parameterType, index, value);
     return status;
   }
-  std::int32_t saveDisplaySettings(std::int32_t, std::int32_t, const PanelSettings&) override {
-    return status;
+  std::int32_t saveDisplaySettings(std::int32_t hwId, std::int32_t, const PanelSettings& settings) override {
+    return restored(hwId, settings);
   }
-  std::int32_t saveSetup(std::int32_t, std::int32_t, std::int32_t, const PanelSettings&) override {
-    return status;
+  std::int32_t saveSetup(std::int32_t, std::int32_t resourceId, std::int32_t,
+                         const PanelSettings& settings) override {
+    return restored(resourceId, settings);
   }
   void caption(std::string_view) override {}
   void visible(bool) override {}
@@ -62,10 +68,17 @@ class FuzzOwner : public PanelHost, public PanelContainer {
   void top(float) override {}
   void width(float) override {}
   void height(float) override {}
-  std::vector<std::uint8_t> picturePng() override { return {}; }
+  std::vector<std::uint8_t> picturePng() override { return {0x89, 'P', 'N', 'G'}; }
+
+ private:
+  std::int32_t restored(std::int32_t hwId, const PanelSettings& settings) {
+    for (const PanelSetting& setting : settings)
+      if (obeys != nullptr) obeys->vfpSet(hwId, setting.parameterType, 0, setting.value);
+    return status;
+  }
 };
 
-// One window, which may or may not get the capture.
+// The capture is the view's window's, another's or nobody's.
 class FuzzWindowing : public Windowing {
  public:
   WindowHandle captured{77};
@@ -87,6 +100,7 @@ class PanelUnderTest {
   PanelUnderTest& operator=(const PanelUnderTest&) = delete;
 
   [[nodiscard]] SpectrumView& panel() noexcept { return *panel_; }
+  [[nodiscard]] Gdi& gdi() noexcept;
 
   FuzzView view;
   FuzzOwner owner;

@@ -1,0 +1,68 @@
+// Any bytes as a result buffer for a panel, from any cursor and count, its view hidden. The input is how the
+// panel is set up, how often it gets the buffer, how the cursor stands, and the buffer.
+#include <cstdint>
+#include <vector>
+
+#include "framework/panel/base_vfp.h"
+#include "framework/panel/host_codes.h"
+#include "fuzz/fuzz_input.h"
+#include "fuzz/panel_under_test.h"
+
+namespace frontpanels::fuzz {
+namespace {
+
+// The ids that make_seeds writes.
+constexpr std::int32_t kHardwareId = 7;
+constexpr std::int32_t kMeasurementId = 100;
+
+// The bits of the first byte.
+enum SetUp : std::uint8_t { kResourceKnown = 1, kTraceAdded = 2, kCursorGiven = 4, kTwice = 8 };
+
+void setUp(SpectrumView& panel, std::uint8_t bits) {
+  panel.vfpSet(kHardwareId, PARM_MEASUREMENT_ID, 0, kMeasurementId);
+  if ((bits & kResourceKnown) != 0) panel.vfpSet(kHardwareId, PARM_RESOURCE_ID, 0, kHardwareId);
+  if ((bits & kTraceAdded) != 0) panel.vfpOp(kHardwareId, kAddTraceOperation, kAddTraceOperation);
+}
+
+void display(SpectrumView& panel, const std::vector<std::uint8_t>& buffer, std::int32_t cursor,
+             std::int32_t count) {
+  const std::int32_t cursorBefore = cursor;
+  const std::int32_t countBefore = count;
+  const auto size = static_cast<std::int64_t>(buffer.size());
+  const bool inside = cursor >= 0 && count >= 0 && std::int64_t{cursor} + count <= size;
+  const std::int32_t status = panel.displayData(Variant(), buffer, cursor, count, 0, 0);
+  require(status == kStatusDone || status == kStatusUnusableParameter, "a status is done or unusable");
+  if (!inside) {
+    require(status == kStatusUnusableParameter, "a cursor outside the buffer is refused");
+    require(cursor == cursorBefore && count == countBefore, "and stays as it was");
+    return;
+  }
+  require(cursor >= cursorBefore && count >= 0, "the cursor never goes back nor the count below 0");
+  require(std::int64_t{cursor} + count == std::int64_t{cursorBefore} + countBefore,
+          "cursor and count stay inside the buffer");
+}
+
+void run(FuzzInput input) {
+  const auto bits = input.number<std::uint8_t>();
+  std::int32_t cursor = 0;
+  std::int32_t count = 0;
+  if ((bits & kCursorGiven) != 0) {
+    cursor = input.number<std::int32_t>();
+    count = input.number<std::int32_t>();
+  }
+  const auto rest = input.rest();
+  const std::vector<std::uint8_t> buffer(rest.begin(), rest.end());  // of exactly this size
+  if ((bits & kCursorGiven) == 0) count = static_cast<std::int32_t>(buffer.size());
+  PanelUnderTest test;
+  setUp(test.panel(), bits);
+  display(test.panel(), buffer, cursor, count);
+  if ((bits & kTwice) != 0) display(test.panel(), buffer, cursor, count);
+}
+
+}  // namespace
+}  // namespace frontpanels::fuzz
+
+extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
+  frontpanels::fuzz::run(frontpanels::fuzz::FuzzInput({data, size}));
+  return 0;
+}
