@@ -106,6 +106,7 @@ Seeds wholeBuffers() {
           {"no_level", buffer(1, 1, 1, sweep(0))},
           {"whole_sweep", buffer(1, 1, 1, sweep(513))},
           {"one_level_too_many", buffer(1, 1, 1, sweep(514))},
+          {"twice_the_levels", buffer(1, 1, 1, sweep(1026))},  // beyond the panel's own object
           {"mixed", buffer(1, 1, 1, mixedRecord)},
           {"several_records", buffer(1, 1, 3, both)},
           {"nested", buffer(2, 2, 2, both)}};
