@@ -3,53 +3,37 @@
 #include <gtest/gtest.h>
 
 #include <limits>
-#include <vector>
+#include <string>
 
 #include "platform/runtime_error.h"
 
 namespace frontpanels {
 namespace {
 
-struct FormatCase {
-  double number;
-  const char* format;
-  const char* text;
-};
+// Each number by the format, a blank behind it.
+std::string texts(const char* format, std::initializer_list<double> numbers) {
+  std::string text;
+  for (const double number : numbers) {
+    appendNumber(text, number, format);
+    text += ' ';
+  }
+  return text;
+}
 
 TEST(NumberFormatTest, RoundsHalvesAwayFromZeroOnTheDecimalText) {
-  const std::vector<FormatCase> cases = {
-      {12, "0.##", "12"},
-      {12.5, "0.##", "12.5"},
-      {-43.219, "0.##", "-43.22"},
-      {0.125, "0.##", "0.13"},  // a half-even rounding would give 0.12
-      {-0.125, "0.##", "-0.13"},
-      {1.005, "0.##", "1.01"},  // the double is a little below: its 15 digits are 1.005
-      {2.5, "0", "3"},
-      {0.5, "0", "1"},
-      {0.49, "0", "0"},
-      {0.05, "0.#", "0.1"},
-      {0.04, "0.#", "0"},
-      {9.996, "0.##", "10"},   // the carry makes a digit
-      {1.096, "0.##", "1.1"},  // the carry passes a nine and stops at a zero
-      {1.059, "0.##", "1.06"},
-      {999.995, "0.##", "1000"},
-      {0.0004, "0.##", "0"},
-      {-0.0004, "0.##", "0"},  // zero has no sign
-      {0, "0.00", "0.00"},
-      {1.5, "0.00", "1.50"},
-      {1.5, "0.0#", "1.5"},
-      {0.25, "#.##", ".25"},
-      {7, "000", "007"},
-      {1e20, "0.##", "100000000000000000000"},
-      {97.5000001, "0.##############", "97.5000001"},
-      {2.0 / 3, "0.##################", "0.666666666666667"},  // 15 significant digits
-      {1e-9, "0.##########", "0.000000001"},
-  };
-  for (const FormatCase& c : cases) {
-    std::string text;
-    appendNumber(text, c.number, c.format);
-    EXPECT_EQ(text, c.text) << c.number << " by " << c.format;
-  }
+  EXPECT_EQ(texts("0.##", {12, 12.5, -43.219}), "12 12.5 -43.22 ");
+  // A half-even rounding would give 0.12; the double 1.005 is a little below, but its 15 digits are 1.005.
+  EXPECT_EQ(texts("0.##", {0.125, -0.125, 1.005}), "0.13 -0.13 1.01 ");
+  EXPECT_EQ(texts("0", {2.5, 0.5, 0.49}), "3 1 0 ");
+  EXPECT_EQ(texts("0.#", {0.05, 0.04}), "0.1 0 ");
+  // The carry makes a digit, passes a nine, stops at a zero.
+  EXPECT_EQ(texts("0.##", {9.996, 999.995, 1.096, 1.059}), "10 1000 1.1 1.06 ");
+  EXPECT_EQ(texts("0.##", {0.0004, -0.0004, 1e20}), "0 0 100000000000000000000 ");  // zero has no sign
+  EXPECT_EQ(texts("0.00", {0, 1.5}) + texts("0.0#", {1.5}), "0.00 1.50 1.5 ");
+  EXPECT_EQ(texts("#.##", {0.25}) + texts("000", {7}), ".25 007 ");
+  // 15 significant digits.
+  EXPECT_EQ(texts("0.##################", {97.5000001, 2.0 / 3, 1e-9}),
+            "97.5000001 0.666666666666667 0.000000001 ");
 }
 
 TEST(NumberFormatTest, AFormatThatIsNoneIsRefusedAndTheTextStays) {
@@ -61,26 +45,15 @@ TEST(NumberFormatTest, AFormatThatIsNoneIsRefusedAndTheTextStays) {
 }
 
 TEST(NumberFormatTest, DecimalsFollowAStep) {
-  struct StepCase {
-    double step;
-    const char* forStep;
-    const char* noFiner;
+  const auto formats = [](double step) {
+    return std::string(formatForStep(step)) + " " + std::string(formatNoFinerThan(step));
   };
-  const std::vector<StepCase> cases = {
-      {20, "0", "0"},
-      {10, "0", "0"},
-      {2.5, "0.#", "0"},
-      {0.5, "0.##", "0.#"},
-      {0.02, "0.###", "0.##"},
-      {0, "0", "0"},
-      {-1, "0", "0"},
-      {std::numeric_limits<double>::quiet_NaN(), "0", "0"},
-      {1e-300, "0.###############", "0.###############"},
-  };
-  for (const StepCase& c : cases) {
-    EXPECT_EQ(formatForStep(c.step), c.forStep) << c.step;
-    EXPECT_EQ(formatNoFinerThan(c.step), c.noFiner) << c.step;
-  }
+  for (const double whole : {20.0, 10.0, 0.0, -1.0, std::numeric_limits<double>::quiet_NaN()})
+    EXPECT_EQ(formats(whole), "0 0") << whole;
+  EXPECT_EQ(formats(2.5), "0.# 0");
+  EXPECT_EQ(formats(0.5), "0.## 0.#");
+  EXPECT_EQ(formats(0.02), "0.### 0.##");
+  EXPECT_EQ(formats(1e-300), "0.############### 0.###############");
 }
 
 }  // namespace

@@ -5,6 +5,7 @@
 #include <filesystem>
 #include <fstream>
 #include <iterator>
+#include <numeric>
 #include <set>
 #include <sstream>
 #include <vector>
@@ -23,13 +24,11 @@ constexpr const char* kAllMissing = "2020-01-01,00:00:10,100000000,102000000,100
 
 class RenderTest : public ::testing::Test {
  protected:
-  void SetUp() override {
-    const auto* const test = ::testing::UnitTest::GetInstance()->current_test_info();
-    folder = fs::temp_directory_path() / ("fp-render-" + std::string(test->name()));
+  RenderTest() {
     fs::remove_all(folder);
     fs::create_directories(folder);
   }
-  void TearDown() override { fs::remove_all(folder); }
+  ~RenderTest() override { fs::remove_all(folder); }
 
   int run(std::vector<const char*> arguments) {
     output.str("");
@@ -38,23 +37,26 @@ class RenderTest : public ::testing::Test {
   }
   int draw(const std::string& content, std::vector<const char*> more = {}) {
     files.contents["van/a.csv"] = content;
-    const std::string directory = (folder / "out").string();
-    std::vector<const char*> arguments = {"van/a.csv", "-o", directory.c_str()};
+    std::vector<const char*> arguments = {"van/a.csv", "-o", out.c_str()};
     arguments.insert(arguments.end(), more.begin(), more.end());
     return run(arguments);
   }
-  std::set<std::string> pictures() const {
+  // The names of the pictures, a blank behind each.
+  std::string pictures() const {
     std::set<std::string> names;
-    for (const auto& entry : fs::directory_iterator(folder / "out"))
-      names.insert(entry.path().filename().string());
-    return names;
+    for (const auto& entry : fs::directory_iterator(out))
+      names.insert(entry.path().filename().string() + " ");
+    return std::accumulate(names.begin(), names.end(), std::string());
   }
   std::string bytes(const char* name) const {
-    std::ifstream file(folder / "out" / name, std::ios::binary);
+    std::ifstream file(fs::path(out) / name, std::ios::binary);
     return {std::istreambuf_iterator<char>(file), {}};
   }
 
-  fs::path folder;
+  fs::path folder =
+      fs::temp_directory_path() /
+      ("fp-render-" + std::string(::testing::UnitTest::GetInstance()->current_test_info()->name()));
+  std::string out = (folder / "out").string();
   testing::MemoryTextFiles files;
   std::ostringstream output;
   std::ostringstream errors;
@@ -62,38 +64,30 @@ class RenderTest : public ::testing::Test {
 
 TEST_F(RenderTest, DrawsAPictureASweepIntoAFolderThatItMakes) {
   EXPECT_EQ(draw(kTwoSweeps), 0);
-  EXPECT_EQ(pictures(), (std::set<std::string>{"a-sweep-0001.png", "a-sweep-0002.png"}));
+  EXPECT_EQ(pictures(), "a-sweep-0001.png a-sweep-0002.png ");
   EXPECT_TRUE(bytes("a-sweep-0001.png").starts_with("\x89PNG\r\n\x1a\n"));
-  EXPECT_NE(bytes("a-sweep-0001.png"), bytes("a-sweep-0002.png"));
-  const std::string out = (folder / "out").string();
+  const std::string second = bytes("a-sweep-0002.png");
+  EXPECT_NE(bytes("a-sweep-0001.png"), second);
   EXPECT_EQ(output.str(), out + "/a-sweep-0001.png  2020-01-01 00:00:10  100 to 103 MHz, 3 bins\n" + out +
                               "/a-sweep-0002.png  2020-01-01 00:00:11  100 to 103 MHz, 3 bins\n"
                               "2 pictures of a recording of rtl_power\n");
   EXPECT_EQ(errors.str(), "");
-}
 
-TEST_F(RenderTest, DrawsAChosenSweepAsItDrawsItAmongAll) {
-  ASSERT_EQ(draw(kTwoSweeps), 0);
-  const std::string amongAll = bytes("a-sweep-0002.png");
-  fs::remove_all(folder / "out");
+  fs::remove_all(out);  // a chosen sweep is drawn as it is among all
   EXPECT_EQ(draw(kTwoSweeps, {"--sweep", "2"}), 0);
-  EXPECT_EQ(pictures(), std::set<std::string>{"a-sweep-0002.png"});
-  EXPECT_EQ(bytes("a-sweep-0002.png"), amongAll);
+  EXPECT_EQ(pictures(), "a-sweep-0002.png ");
+  EXPECT_EQ(bytes("a-sweep-0002.png"), second);
 }
 
-TEST_F(RenderTest, KeepsTheGoodRowsAndNamesTheBadOnes) {
-  EXPECT_EQ(draw(std::string(kTwoSweeps) + "what is this\n" + kTwoSweeps), 0);
-  EXPECT_EQ(pictures().size(), 4U);
+TEST_F(RenderTest, KeepsTheGoodRowsNamesTheBadOnesAndDrawsNothingForASweepWithoutLevels) {
+  EXPECT_EQ(draw(std::string(kAllMissing) + "what is this\n" + kTwoSweeps + kAllMissing), 0);
+  EXPECT_EQ(pictures(), "a-sweep-0002.png a-sweep-0003.png ");
   EXPECT_EQ(errors.str(),
             "van/a.csv: 1 row could not be read, 1 row out of order\n"
-            "  line 3: does not begin with a date and a time: \"what is this\"\n"
-            "  line 4: its sweep is older than the one before\n");
-}
-
-TEST_F(RenderTest, DrawsNothingForASweepWithoutLevels) {
-  EXPECT_EQ(draw(std::string(kAllMissing) + kTwoSweeps), 0);
-  EXPECT_EQ(pictures(), (std::set<std::string>{"a-sweep-0002.png", "a-sweep-0003.png"}));
-  EXPECT_EQ(errors.str(), "van/a.csv: sweep 1: every level is missing, no picture\n");
+            "  line 2: does not begin with a date and a time: \"what is this\"\n"
+            "  line 5: its sweep is older than the one before\n"
+            "van/a.csv: sweep 1: every level is missing, no picture\n"
+            "van/a.csv: sweep 4: every level is missing, no picture\n");
 }
 
 TEST_F(RenderTest, AnswersOneAndSaysWhyWhenNothingCanBeDrawn) {
@@ -105,21 +99,18 @@ TEST_F(RenderTest, AnswersOneAndSaysWhyWhenNothingCanBeDrawn) {
   EXPECT_EQ(errors.str(), "van/a.csv: every level is missing, there is nothing to draw\n");
   EXPECT_EQ(draw(kTwoSweeps, {"--sweep", "3"}), 1);
   EXPECT_EQ(errors.str(), "van/a.csv: has 2 sweeps, no sweep 3\n");
-  EXPECT_FALSE(fs::exists(folder / "out"));
+  EXPECT_FALSE(fs::exists(out));
 }
 
 TEST_F(RenderTest, LeavesNoHalfPictureWhereItCannotWrite) {
-  fs::create_directories(folder / "out" / "a-sweep-0001.png" / "in the way");
+  fs::create_directories(out + "/a-sweep-0001.png/in the way");
   EXPECT_EQ(draw(kTwoSweeps), 1);
-  EXPECT_EQ(pictures(), std::set<std::string>{"a-sweep-0001.png"});
-  const std::string picture = (folder / "out" / "a-sweep-0001.png").string();
-  EXPECT_EQ(errors.str(), "fp-render: " + picture + ": cannot be written: Is a directory\n");
-
-  fs::remove_all(folder / "out");
-  std::ofstream(folder / "out") << "a file, not a folder";
+  EXPECT_EQ(pictures(), "a-sweep-0001.png ");
+  EXPECT_EQ(errors.str(), "fp-render: " + out + "/a-sweep-0001.png: cannot be written: Is a directory\n");
+  fs::remove_all(out);
+  std::ofstream(out) << "a file, not a folder";
   EXPECT_EQ(draw(kTwoSweeps), 1);
-  EXPECT_EQ(errors.str(),
-            "fp-render: " + (folder / "out").string() + ": cannot be created: Not a directory\n");
+  EXPECT_EQ(errors.str(), "fp-render: " + out + ": cannot be created: Not a directory\n");
 }
 
 TEST_F(RenderTest, ExplainsItself) {

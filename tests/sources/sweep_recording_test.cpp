@@ -5,8 +5,8 @@
 #include <algorithm>
 #include <cmath>
 
-#include "platform/runtime_error.h"
 #include "tests/support/memory_text_files.h"
+#include "tests/support/raised.h"
 
 namespace frontpanels {
 namespace {
@@ -44,12 +44,7 @@ class SweepRecordingTest : public ::testing::Test {
     return all;
   }
   std::string refusal(std::string content) {
-    try {
-      open(std::move(content));
-    } catch (const RuntimeError& error) {
-      return error.description();
-    }
-    return "opened";
+    return testing::raised([&] { return open(std::move(content)); });
   }
 
   MemoryTextFiles files;
@@ -106,47 +101,35 @@ TEST_F(SweepRecordingTest, PutsTheInterleavedRowsOfHackrfSweepInOrder) {
   EXPECT_EQ(open(row(0, 100, "1"))->format(), SweepFormat::RtlPower);
 }
 
-TEST_F(SweepRecordingTest, TellsASweepsNumberTimeAndRows) {
-  recording = open(row(0, 100, "1,2") + row(1, 120, "3") + row(2, 100, "4"));
+TEST_F(SweepRecordingTest, TellsASweepsNumberTimeAndRowsAndBeginsAnewAfterRewind) {
+  recording = open("heading\n" + row(0, 100, "1,2") + row(1, 120, "3") + row(2, 100, "4"));
   Sweep sweep;
-  ASSERT_TRUE(recording->next(sweep));
-  EXPECT_EQ(sweep.number, 1U);
-  EXPECT_EQ(sweep.time, "2020-01-01 00:00:10");
+  const auto next = [&] {
+    if (!recording->next(sweep)) return std::string("none");
+    return std::to_string(sweep.number) + " " + sweep.time + " " + std::to_string(sweep.rows);
+  };
+  EXPECT_EQ(next(), "1 2020-01-01 00:00:10 2");
   EXPECT_EQ(sweep.stepHz, 10);
-  EXPECT_EQ(sweep.rows, 2U);
-  EXPECT_LT(recording->positionBytes(), recording->sizeBytes() + 1);
-  ASSERT_TRUE(recording->next(sweep));
-  EXPECT_EQ(sweep.number, 2U);
-  EXPECT_EQ(sweep.time, "2020-01-01 00:00:12");
-  EXPECT_FALSE(recording->next(sweep));
+  EXPECT_EQ(next(), "2 2020-01-01 00:00:12 1");
+  EXPECT_EQ(next(), "none");
   EXPECT_EQ(recording->positionBytes(), recording->sizeBytes());
-}
-
-TEST_F(SweepRecordingTest, BeginsAnewAfterRewind) {
-  recording = open("heading\n" + row(0, 100, "1") + row(1, 100, "2"));
-  Sweep sweep;
-  while (recording->next(sweep)) {
-  }
   recording->rewind();
-  ASSERT_TRUE(recording->next(sweep));
-  EXPECT_EQ(sweep.number, 1U);
-  EXPECT_EQ(text(sweep), "100: 1");
+  EXPECT_EQ(next(), "1 2020-01-01 00:00:10 2");
+  EXPECT_EQ(text(sweep), "100: 1 2 3");
   EXPECT_EQ(recording->unreadableRows(), 1U);
 }
 
 TEST_F(SweepRecordingTest, CountsWhatItCannotReadAndNamesTheFirstLines) {
-  std::string content = row(0, 100, "1");
-  for (int i = 0; i < 4; ++i) content += "x\n";
-  content += "2020-01-01,00:00:10,110,120,10.00,1,?\n" + row(0, 120, "3") + "y\n";
-  EXPECT_EQ(sweeps(content), "100: 1 gap 3");
+  EXPECT_EQ(sweeps(row(0, 100, "1") + "x\n" + row(0, 110, "?") + "x\nx\nx\n" + row(0, 120, "3") + "x\n"),
+            "100: 1 gap 3");
   EXPECT_EQ(recording->unreadableRows(), 6U);
   EXPECT_EQ(recording->problemReport(),
             "a.csv: 6 rows could not be read\n"
             "  line 2: does not begin with a date and a time: \"x\"\n"
-            "  line 3: does not begin with a date and a time: \"x\"\n"
+            "  line 3: its value 1 is \"?\"\n"
             "  line 4: does not begin with a date and a time: \"x\"\n"
             "  line 5: does not begin with a date and a time: \"x\"\n"
-            "  line 6: its value 1 is \"?\"\n"
+            "  line 6: does not begin with a date and a time: \"x\"\n"
             "  ...");
 }
 
@@ -171,12 +154,8 @@ TEST_F(SweepRecordingTest, RefusesWhatIsNoRecordingAndSaysWhy) {
                                 "2\0000\0",
                                 6)),
             "a.csv: UTF-16 text; save it as UTF-8 or plain text");
-  try {
-    (void)SweepRecording::open(files, "absent.csv");
-    FAIL();
-  } catch (const RuntimeError& error) {
-    EXPECT_EQ(error, RuntimeError(53, "absent.csv: File not found"));
-  }
+  EXPECT_EQ(testing::raised([&] { return SweepRecording::open(files, "absent.csv"); }),
+            "absent.csv: File not found");
 }
 
 TEST_F(SweepRecordingTest, ReadsNoFalseLevelFromAFileCutAnywhere) {

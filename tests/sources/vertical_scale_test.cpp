@@ -22,9 +22,7 @@ TEST(VerticalScale, HoldsAllLevelsOnTheFinestOfOneTwoFive) {
   for (const auto& testCase : kCases) {
     LevelRange range;
     range.add(testCase.levelsDb);
-    const VerticalScale scale = verticalScaleFor(range);
-    EXPECT_EQ(scale.topDb, testCase.scale.topDb);
-    EXPECT_EQ(scale.dbPerDivision, testCase.scale.dbPerDivision);
+    EXPECT_EQ(verticalScaleFor(range), testCase.scale) << testCase.scale.topDb;
   }
 }
 
