@@ -2,6 +2,8 @@
 #include "painters/multi_trace_painter.h"
 
 #include <array>
+#include <sstream>
+#include <tuple>
 
 #include "tests/painters/painter_fixture.h"
 
@@ -17,30 +19,32 @@ constexpr float kInfinite = std::numeric_limits<float>::infinity();
 
 class MultiTracePainterTest : public testing::PainterTest {
  protected:
-  // The PN of each slot / the trace ids, the least recently used first.
+  // PN and value of each slot, "*" where a newer trace took it over / trace ids, the least recently used
+  // first.
   [[nodiscard]] std::string slots() const {
-    std::string text;
-    for (std::int16_t i = 0; i < painter.numberOfTraces(); ++i)
-      text += std::to_string(painter.pnOffset(i)) + " ";
-    text += "/";
-    for (const std::int16_t id : painter.leastRecentlyUsed()) text += " " + std::to_string(id);
-    return text;
+    std::ostringstream text;
+    for (std::int16_t i = 0; i < painter.numberOfTraces(); ++i) {
+      const bool replaced = painter.traceOrientation(i) == TraceOrientation::Replaced;
+      text << painter.pnOffset(i) << "=" << painter.traceValue(i) << (replaced ? "* " : " ");
+    }
+    text << "/";
+    for (const std::int16_t id : painter.leastRecentlyUsed()) text << " " << id;
+    return text.str();
+  }
+  void divisions(std::int32_t vertical, std::int32_t horizontal) {
+    painter.numberOfVerticalDivisions(vertical);
+    painter.numberOfHorizontalDivisions(horizontal);
   }
 };
 
 TEST_F(MultiTracePainterTest, ATraceIsAppendedUntilThePainterIsFullThenTheLeastRecentlyUsedGoes) {
   for (std::int16_t pn = 1; pn <= 5; ++pn) EXPECT_EQ(painter.addATrace(0, pn, pn * 0.5, 10), pn - 1);
   EXPECT_EQ(painter.addATrace(0, 1, 3, 8), 0);  // is there and refilled in its slot
-  EXPECT_EQ(painter.traceValue(0), 3);
   EXPECT_EQ(painter.traceSize(), 8);
-  EXPECT_EQ(painter.traceOrientation(0), TraceOrientation::FromLeft);
-  EXPECT_EQ(slots(), "1 2 3 4 5 / 0 1 2 3 4");
-
+  EXPECT_EQ(slots(), "1=3 2=1 3=1.5 4=2 5=2.5 / 0 1 2 3 4");
   EXPECT_EQ(painter.addATrace(0, 6, 9.5, 20, std::int16_t{77}), 0);
-  EXPECT_EQ(painter.traceValue(0), 9.5);
-  EXPECT_EQ(painter.traceOrientation(0), TraceOrientation::Replaced);
   EXPECT_EQ(painter.addATrace(0, 7, 0, 20), 1);  // keeps the slot's trace id
-  EXPECT_EQ(slots(), "6 7 3 4 5 / 2 3 4 77 1");
+  EXPECT_EQ(slots(), "6=9.5* 7=0* 3=1.5 4=2 5=2.5 / 2 3 4 77 1");
 }
 
 TEST_F(MultiTracePainterTest, SomePnsGoUnderAnotherByTheMode) {
@@ -61,11 +65,9 @@ TEST_F(MultiTracePainterTest, SomePnsGoUnderAnotherByTheMode) {
 }
 
 TEST_F(MultiTracePainterTest, ATraceIdRefillsItsSlots) {
-  painter.addNewTraceAtEnd(1, 0, 5, std::int16_t{40});
-  painter.addNewTraceAtEnd(2, 0, 5, std::int16_t{50});
-  painter.addNewTraceAtEnd(3, 0, 5, std::int16_t{40});
+  for (const auto id : std::array<std::int16_t, 3>{40, 50, 40}) painter.addNewTraceAtEnd(2, 0, 5, id);
   painter.addATrace(7, 106, 2.5, 6, std::int16_t{40});  // the alias rule is for look-ups by PN
-  EXPECT_EQ(slots(), "106 2 106 / 40 50 40");
+  EXPECT_EQ(slots(), "106=2.5 2=0 106=2.5 / 40 50 40");
   EXPECT_EQ(painter.findATrace(106), 2);  // the last one that has it
   EXPECT_EQ(painter.findATrace(9), -1);
 }
@@ -78,7 +80,7 @@ TEST_F(MultiTracePainterTest, RemovingATraceTakesItsMarkersAndItsPlaceInTheUsage
   painter.selectedTraceIndex(2);
 
   painter.removeATrace(1);
-  EXPECT_EQ(slots(), "1 3 / 0 2");
+  EXPECT_EQ(slots(), "1=0 3=0 / 0 2");
   EXPECT_EQ(painter.activeMarker(), nullptr);
   EXPECT_EQ(painter.selectedTraceIndex(), 1);
   EXPECT_EQ(painter.findTraceByMarker(kept), 1);
@@ -110,9 +112,9 @@ TEST_F(MultiTracePainterTest, BadInputIsReportedAndChangesNothing) {
   painter.gridScaleTop(std::numeric_limits<double>::infinity());
   painter.verticalResolution(0);
   painter.numberOfVerticalDivisions(1001);
-  EXPECT_EQ(painter.gridScaleTop(), -20);
-  EXPECT_EQ(painter.verticalResolution(), 10);
-  EXPECT_EQ(painter.numberOfVerticalDivisions(), 0);
+  EXPECT_EQ(
+      std::tuple(painter.gridScaleTop(), painter.verticalResolution(), painter.numberOfVerticalDivisions()),
+      std::tuple(-20, 10, 0));
   EXPECT_EQ(messages().size(), 3U);
 }
 
@@ -203,14 +205,15 @@ TEST_F(MultiTracePainterTest, WhatCannotBeDrawnIsReportedAndTheNextPaintTriesAga
 TEST_F(MultiTracePainterTest, TheRangeOfTheDataCanTakeThePlaceOfTheAxisAndNeedsAnExtent) {
   painter.calcMinMax(true);
   EXPECT_EQ(painted({-30, -70, -50}), "15,24 25,64 35,44");
-  EXPECT_EQ(painter.activeTraceMaximumValue(), -30);
-  EXPECT_EQ(painter.activeTraceMaximumIndex(), 0);
+  const auto maximum = [&] {
+    return std::pair(painter.activeTraceMaximumValue(), painter.activeTraceMaximumIndex());
+  };
+  EXPECT_EQ(maximum(), std::pair(-30.0, 0.0));
   painter.activeTraceMaximumValue(5);
   painter.activeTraceMaximumIndex(2);
-  EXPECT_EQ(painter.activeTraceMaximumValue(), 5);
-  EXPECT_EQ(painter.activeTraceMaximumIndex(), 2);
+  EXPECT_EQ(maximum(), std::pair(5.0, 2.0));
   give({-30, -20});  // new values are searched anew
-  EXPECT_EQ(painter.activeTraceMaximumValue(), -20);
+  EXPECT_EQ(maximum(), std::pair(-20.0, 1.0));
 
   EXPECT_EQ(painted({-50, -50}), "");  // the largest value equals the smallest
   painter.calcMinMax(false);
@@ -231,10 +234,10 @@ TEST_F(MultiTracePainterTest, EachTraceHasItsColourAndTheSelectedOneGivesItsOwn)
   }
   painter.selectedTraceIndex(1);
   paint();
-  std::vector<Color> colors;
-  for (const testing::Call& line : gdi.polylines()) colors.push_back(line.pen.color);
-  EXPECT_EQ(colors, (std::vector<Color>{kGreen, kRed, rgb(0, 0, 255), rgb(255, 255, 0), rgb(255, 255, 255),
-                                        rgb(0, 255, 255), rgb(255, 0, 255), rgb(0, 0, 0), kGreen}));
+  const Color expected[] = {
+      kGreen,           kRed,         rgb(0, 0, 255), rgb(255, 255, 0), rgb(255, 255, 255), rgb(0, 255, 255),
+      rgb(255, 0, 255), rgb(0, 0, 0), kGreen};
+  for (std::size_t i = 0; i < 9; ++i) EXPECT_EQ(gdi.polylines().at(i).pen.color, expected[i]) << i;
   EXPECT_EQ(painter.activeTraceColor(), kRed);
 }
 
@@ -253,7 +256,6 @@ TEST_F(MultiTracePainterTest, AutoScaleFitsAllTracesAndWritesTheAxis) {
   painter.trace(0, Variant(Singles{-14, -3, kGap}));
   painter.trace(1, Variant(Doubles{-1e30 * 1e300, 3, -2}));
   EXPECT_EQ(painter.gridScaleTop(), std::nullopt);
-
   paint();
   // 17 / 0.85 = 20, 2 a division; (3 - 14 + 20) / 2 = 4.5 is 2.25 tenths of 20: 4.
   EXPECT_EQ(painter.gridScaleTop(), 4);
@@ -302,8 +304,7 @@ TEST_F(MultiTracePainterTest, LabelsFollowTheirStyleAndDivisions) {
 }
 
 TEST_F(MultiTracePainterTest, TheGridDrawsBothOuterEdgesAndNeedsTheSurfaceThatItIsToStyle) {
-  painter.numberOfVerticalDivisions(3);
-  painter.numberOfHorizontalDivisions(2);
+  divisions(3, 2);
   painter.setGridLineDrawingStyle(PenStyle::Dot);
   painter.setGridDrawColor(kRed);
   // y = 24 + 40 i / 3 (37.33, 50.67); x = 15 + 80 j / 2
@@ -312,8 +313,7 @@ TEST_F(MultiTracePainterTest, TheGridDrawsBothOuterEdgesAndNeedsTheSurfaceThatIt
       "15,24 95,24 | 15,37 95,37 | 15,51 95,51 | 15,64 95,64 | 15,24 15,64 | 55,24 55,64 | 95,24 95,64");
   EXPECT_EQ(gdi.polylines().front().pen, (testing::PenValue{PenStyle::Dot, 1, kRed}));
 
-  painter.numberOfVerticalDivisions(0);
-  painter.numberOfHorizontalDivisions(0);
+  divisions(0, 0);
   painter.multiBand(true);
   painter.numberOfBands(4);
   EXPECT_EQ(painted(), "35,24 35,64 | 55,24 55,64 | 75,24 75,64");
@@ -349,8 +349,7 @@ TEST_F(MultiTracePainterTest, TheClipIsRoundedHalfToEvenAndUndone) {
 }
 
 TEST_F(MultiTracePainterTest, WhicheverCallFailsNothingLeaksAndTheNextPaintIsWhole) {
-  painter.numberOfVerticalDivisions(2);
-  painter.numberOfHorizontalDivisions(2);
+  divisions(2, 2);
   painter.topLabel("top");
   give({0, -50, kGap, -100});
   painter.activeMarker(addMarker("1", 1));

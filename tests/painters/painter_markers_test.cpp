@@ -103,11 +103,8 @@ TEST_F(PainterMarkersTest, MarkersAreDrawnOnTheirPointsInTheTraceColour) {
   addMarker("3", 9);  // no such point
   paint();
   EXPECT_EQ(drawnIds(), "1 ");
-  EXPECT_EQ(marker->positionX, 25);
-  EXPECT_EQ(marker->positionY, 44);
-  const auto created = gdi.succeeded("createPen");
-  ASSERT_EQ(created.size(), 1U);
-  EXPECT_EQ(created[0].pen, (testing::PenValue{PenStyle::Solid, 1, kGreen}));
+  EXPECT_EQ((Point{marker->positionX, marker->positionY}), (Point{25, 44}));
+  EXPECT_EQ(gdi.succeeded("createPen").at(0).pen, (testing::PenValue{PenStyle::Solid, 1, kGreen}));
 }
 
 TEST_F(PainterMarkersTest, AMarkerOnACountedPointThatIsNotDrawnStaysOnTheLastOneThatIs) {
@@ -187,15 +184,14 @@ TEST_F(PainterMarkersTest, MarkersReturnToTheirFrequencyAfterTheAxisMoved) {
   const MarkerPointer outside = addMarker("2", 9);
   paint();
   painter.updateMarkerDisplay(dc, {});
-  painter.xStart(102e6);
-  painter.xStop(106.5e6);  // 0.5 MHz a point
-  painter.ResetMarkers();
-  EXPECT_EQ(inside->point, 4);
-  EXPECT_EQ(outside->point, 9);
-  painter.xStart(103e6);
-  painter.xStop(112e6);
-  painter.ResetMarkers();
-  EXPECT_EQ(inside->point, 1);
+  const auto points = [&](double startHz, double stopHz) {
+    painter.xStart(startHz);
+    painter.xStop(stopHz);
+    painter.ResetMarkers();
+    return std::pair(inside->point, outside->point);
+  };
+  EXPECT_EQ(points(102e6, 106.5e6), std::pair(4, 9));  // 0.5 MHz a point: 104 and, at the end, 106.5 MHz
+  EXPECT_EQ(points(103e6, 112e6), std::pair(1, 6));
   painter.span(0);
   painter.ResetMarkers();
   EXPECT_EQ(said(), "ResetMarkers() failed...divide-by-zero error\rDivision by zero");

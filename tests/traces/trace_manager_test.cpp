@@ -223,10 +223,8 @@ TEST_F(TraceManagerTest, TracesShareTheSurfaceWithTheActiveOneBelowAndSplittersA
   EXPECT_EQ(right->panel, (PanelArea{0, 80, 400, 120}));
   EXPECT_EQ(left->panel, (PanelArea{0, 0, 400, 80}));
   // The second and fourth font are the active panel's, the first and third the small panels'.
-  EXPECT_EQ(right->labelFonts.axis, fonts[1]);
-  EXPECT_EQ(right->labelFonts.corner, fonts[3]);
-  EXPECT_EQ(left->labelFonts.axis, fonts[0]);
-  EXPECT_EQ(left->labelFonts.corner, fonts[2]);
+  EXPECT_EQ(std::pair(right->labelFonts.axis, right->labelFonts.corner), std::pair(fonts[1], fonts[3]));
+  EXPECT_EQ(std::pair(left->labelFonts.axis, left->labelFonts.corner), std::pair(fonts[0], fonts[2]));
 
   const auto active = add(3);
   gdi.clear();
