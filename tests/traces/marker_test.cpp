@@ -66,6 +66,7 @@ TEST_F(MarkerTest, ActiveMarkerHasAPenOfItsOwnTwoPixelsWide) {
   gdi.failAlways("createPen");
   EXPECT_EQ(drawn().size(), 4U);
   EXPECT_TRUE(gdi.violations().empty());
+  gdi.failNothing();
   marker.active = false;
   drawn();
   EXPECT_TRUE(gdi.succeeded("createPen").empty());
