@@ -7,6 +7,7 @@
 
 #include "activex/base_object.h"
 #include "activex/connections_part.h"
+#include "activex/constituent_object.h"
 #include "activex/control_core.h"
 #include "activex/dispatch.h"
 #include "activex/panel_events.h"
@@ -147,6 +148,13 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
     return give(base, [&] {
       baseObject_.AddRef();
       return static_cast<IDispatch*>(&baseObject_);
+    });
+  }
+  HRESULT STDMETHODCALLTYPE Constituent(BSTR name, IDispatch** field) override {
+    return give(field, [&]() -> IDispatch* {
+      ControlSet* const controls = panel().controls();
+      if (controls == nullptr) raiseInvalidProcedureCall();
+      return new ConstituentObject(this->outer(), controls->control(fromBstr(name)));
     });
   }
   HRESULT STDMETHODCALLTYPE get_Settings(VARIANT* settings) override {
@@ -395,7 +403,7 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
     ULONG STDMETHODCALLTYPE Release() override { return control_.outer()->Release(); }
 
    private:
-    clsBaseVFP& base() override { return control_.base(); }
+    clsBaseVFP& self() override { return control_.base(); }
     FrontPanelControl& control_;
   };
 

@@ -8,6 +8,7 @@
 #include "framework/panel/panel_control.h"
 #include "framework/panel/panel_environment.h"
 #include "framework/panel/panel_host.h"
+#include "platform/control_set.h"
 
 namespace frontpanels {
 
@@ -74,6 +75,9 @@ class HostedPanel : public PanelControl {
   [[nodiscard]] float InvisibleWidthMarkX1() const noexcept { return invisibleWidthMarkX1_; }
   void InvisibleHeightMarkY1(float y) override { invisibleHeightMarkY1_ = y; }
   [[nodiscard]] float InvisibleHeightMarkY1() const noexcept { return invisibleHeightMarkY1_; }
+
+  // The panel's fields; null when it has none.
+  [[nodiscard]] virtual ControlSet* controls() { return nullptr; }
 
   // Requests to the host
   std::int32_t frontPanelOp(std::int32_t hwId, std::int32_t vfpId, std::int16_t operation,
