@@ -1,52 +1,58 @@
-// A numeric entry in a field, as a user meets it: a text box, a spin button and a label, with a window behind
-// the box that keeps what it is told.
+// A numeric entry in a field, as a user meets it: text box, spin button and label, with a window behind the
+// box that keeps what it is told.
 #pragma once
 
-#include <functional>
 #include <string>
 #include <vector>
 
 #include "entry/entry_binding.h"
-#include "tests/support/listed_records.h"
 #include "tests/support/reporting_fixture.h"
 
 namespace frontpanels::testing {
 
+// Rows of a table, "before -> after", and the same rows with what is found in place of what they say.
+using Rows = std::vector<std::string>;
+template <class After>
+Rows found(Rows rows, After after) {
+  for (std::string& row : rows)
+    row.replace(row.find(" -> ") + 4, row.npos, after(row.substr(0, row.find(" -> "))));
+  return rows;
+}
+
 class EntryField : public ControlPeer {
  public:
   EntryField() {
-    bindEntry(entry, &box, &spin, [this] { told += " " + numberToText(entry.value()); });
+    bindEntry(entry, &box, &spin, [this] { heard += " told " + numberToText(entry.value()); });
     entry.Label(&label);
     box.peer(this);
   }
   ~EntryField() override { box.peer(nullptr); }
 
-  // The user enters the field, puts a text in it and presses Enter, or goes elsewhere, or types one key more.
-  void type(std::string text) {
+  // The user enters the field, puts a text in it, and presses a key or goes elsewhere.
+  void key(std::string text, std::int16_t character) {
     box.focusChanged(true);
     box.userText(std::move(text));
-  }
-  void enter(std::string text) {
-    type(std::move(text));
-    box.userKey(13);
-  }
-  void leave(std::string text) {
-    type(std::move(text));
-    box.focusChanged(false);
-  }
-  void key(std::string text, char character) {
-    type(std::move(text));
     box.userKey(character);
   }
+  void leave(std::string text) {
+    box.focusChanged(true);
+    box.userText(std::move(text));
+    box.focusChanged(false);
+  }
 
-  // Text and value.
-  [[nodiscard]] std::string state() const { return box.Text() + " = " + numberToText(entry.value()); }
-  // So many clicks up, or down where the count is negative: the text after each.
-  [[nodiscard]] std::string clicks(int count) {
+  // Text and value, and what the panel was told and the user heard since it was asked last.
+  std::string state() { return box.Text() + " = " + numberToText(entry.value()) + std::exchange(heard, {}); }
+  // The chosen range and the limits in force.
+  [[nodiscard]] std::string limits() const {
+    return std::to_string(entry.range()) + ": " + numberToText(entry.MINIMUM()) + ".." +
+           numberToText(entry.MAXIMUM());
+  }
+  // So many clicks: the text after each.
+  std::string clicks(int count, bool up) {
     std::string texts;
-    for (int i = 0; i < std::abs(count); ++i) {
-      spin.press(count > 0);
-      texts += (i == 0 ? "" : ", ") + box.Text();
+    for (; count > 0; --count) {
+      spin.press(up);
+      texts += (texts.empty() ? "" : ", ") + box.Text();
     }
     return texts;
   }
@@ -55,15 +61,25 @@ class EntryField : public ControlPeer {
   SpinButton spin{"SpanSpinButton"};
   frontpanels::Label label{"SpanLabel"};
   clsNumericEntry entry;
-  std::string told;  // the values that the panel has heard of
-  int beeps = 0;
 
  private:
   void changed(ControlChange) override {}
   void takeFocus() override { box.focusChanged(true); }
-  void beep() override { ++beeps; }
+  void beep() override { heard += " beep"; }
+
+  std::string heard;
 };
 
-class EntryFieldTest : public ReportingTest, public EntryField {};
+class EntryFieldTest : public ReportingTest, public EntryField {
+ protected:
+  // What is done, one after the other, and the state after each.
+  using Story = std::vector<std::pair<std::function<void()>, const char*>>;
+  void play(const Story& story, bool withLimits = false) {
+    for (const auto& [action, expected] : story) {
+      action();
+      EXPECT_EQ(state() + (withLimits ? " in " + limits() : ""), expected);
+    }
+  }
+};
 
 }  // namespace frontpanels::testing

@@ -36,6 +36,7 @@ TEST_F(NumericEntryTest, ShowsValuesInTheUnitWhoseLimitsHoldThem) {
               {&Entry::percentSuffix, {40}, "40 %|"},
               {&Entry::chipSuffix, {64}, "64 chips|"},
               {&Entry::degreeSuffix, {90}, "90 deg|"},
+              {&Entry::offsetSuffix, {12}, "12 PN|"},
               {&Entry::meterPerSecSuffix, {3}, "3 m/s|"},
               {&Entry::milePerHourSuffix, {60}, "60 MPH|"},
               {&Entry::kmPerHourSuffix, {100}, "100 KPH|"},
