@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <limits>
 #include <span>
 
 #include "entry/number_format.h"
@@ -82,7 +83,7 @@ double nearestInSequence(double value, const StepSequence& sequence) {
   if (value == 0) return 0;
   const double magnitude = std::fabs(value);
   const double higher = steps.above(magnitude);
-  const double lower = steps.below(higher);
+  const double lower = steps.below(std::min(higher, std::numeric_limits<double>::max()));
   return std::copysign(magnitude / lower <= higher / magnitude ? lower : higher, value);
 }
 

@@ -121,7 +121,7 @@ std::optional<double> parseEntryText(std::string_view text, const SuffixTable& s
     if (unit == nullptr) return std::nullopt;
     scale = unit->scale;
   }
-  // "0.57 k" is 570 and no bit more or less, though no double is 0.57.
+  // "2.01 k" is 2010 and no bit less.
   const double value = scale == 1 ? number : toSignificantDigits(number * scale);
   if (scale == 0 || !std::isfinite(value)) return std::nullopt;
   return value;

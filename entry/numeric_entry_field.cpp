@@ -196,9 +196,7 @@ void clsNumericEntry::click(const char* message, StepDirection direction) noexce
       errorHandler().Assert(message);
       return;
     }
-    const Entered entered = setValue(stepped(*from, direction), autoChoose_);
-    changed = entered == Entered::Changed;
-    if (entered == Entered::Refused) return;
+    changed = setValue(stepped(*from, direction), autoChoose_) == Entered::Changed;
     if (textBox_ != nullptr) textBox_->SetFocus();
     selectText();
   });

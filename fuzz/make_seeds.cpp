@@ -286,6 +286,28 @@ Seeds entryPointSeeds() {
   return seeds;
 }
 
+// Steps by their places in the table of entry_parser_fuzz.cpp.
+Seeds entryParserSeeds() {
+  constexpr std::uint8_t kLeave = 0;
+  constexpr std::uint8_t kKey = 1;
+  constexpr std::uint8_t kMaximum = 7;
+  constexpr std::uint8_t kFirstOfClicks = 19;
+  constexpr std::uint8_t kFirstOfUnits = 24;
+  Seeds seeds;
+  for (const std::string text : {"98.1", "900k", "1.6 GHz", "-5e3 m", "1,5", "1e400", "nan", "k", ""})
+    for (std::uint8_t units = kFirstOfUnits; units < kFirstOfUnits + 5; ++units) {
+      Bytes steps = joined(units, kMaximum, 1e9);
+      for (const std::uint8_t way : {kLeave, kKey}) {
+        append(steps, joined(way, static_cast<std::uint8_t>(text.size())));
+        steps.insert(steps.end(), text.begin(), text.end());
+        if (way == kKey) append(steps, joined(std::int16_t{13}));
+      }
+      append(steps, joined(kFirstOfClicks, std::uint8_t{kFirstOfClicks + 1}));
+      seeds.push_back({"typed_" + std::to_string(seeds.size()), steps});
+    }
+  return seeds;
+}
+
 bool write(const std::filesystem::path& folder, const Seeds& seeds) {
   std::filesystem::create_directories(folder);
   return std::ranges::all_of(seeds, [&folder](const Seed& seed) {
@@ -308,6 +330,7 @@ int main(int argc, char** argv) {
   const std::filesystem::path corpus(argv[1]);
   const bool written = write(corpus / "result_reader_fuzz", resultReaderSeeds()) &&
                        write(corpus / "display_data_fuzz", displayDataSeeds()) &&
-                       write(corpus / "entry_points_fuzz", entryPointSeeds());
+                       write(corpus / "entry_points_fuzz", entryPointSeeds()) &&
+                       write(corpus / "entry_parser_fuzz", entryParserSeeds());
   return written ? 0 : 1;
 }

@@ -35,7 +35,7 @@ TEST_F(EntryEventsTest, ClicksGoThroughDecadesUnitsAndSteps) {
         "-2 down -> -5, -10, -20", "3 up -> 5", "3 down -> 2", "0 down -> -1, -2"}},
       {[](Entry& e) { e.timeSuffix(), sequence(2, 5)(e); }, {"0 up -> 2 ns, 5 ns"}},
       {[](Entry& e) { e.step(1), sequence(1, 3, 10)(e); }, {"1 up -> 3, 10, 30"}},  // before the step
-      {sequence(1.25, 4.7), {"0.0047 up -> 0.0125, 0.047", "470 up -> 1250, 4700"}},
+      {sequence(1.06, 4.7), {"0.0047 up -> 0.0106, 0.047", "10.6 up -> 47, 106"}},  // 1.06 * 10 is a bit more
       {[](Entry& e) { e.power(2); }, {"1 down -> 0.5, 0.25", "8 up -> 16, 32"}},
       // Neither sequence nor step: one of the unit, of the next one at a limit going up, of the one before
       // going down. In the gap from 1 to 10 GHz it is the unit that is shown, at its lower end GHz.
