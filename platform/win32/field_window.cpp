@@ -132,6 +132,9 @@ class TextField final : public FieldWindow {
         box_.SetFocus();
         if (!gone()) box_.selectAll();
         return 0;
+      case WM_LBUTTONUP:
+        box_.userClick();
+        break;
       case WM_GETDLGCODE:
         return original(message, wide, extra) | (wide == VK_RETURN ? DLGC_WANTMESSAGE : 0);
       default:

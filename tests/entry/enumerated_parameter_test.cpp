@@ -2,7 +2,6 @@
 
 #include <vector>
 
-#include "framework/support/enumerated_tables.h"
 #include "tests/support/listed_records.h"
 #include "tests/support/reporting_fixture.h"
 
@@ -22,137 +21,109 @@ class EnumeratedParameterTest : public testing::ReportingTest {
     parameter.ComboBox(&list);
     parameter.parameterType(500);
   }
-  [[nodiscard]] std::vector<std::int32_t> data() const {
-    std::vector<std::int32_t> values;
-    for (std::int32_t index = 0; index < list.ListCount(); ++index) values.push_back(list.item(index).data);
-    return values;
+  // The items' data, the selected one in brackets.
+  [[nodiscard]] std::string items() const {
+    std::string all;
+    for (std::int32_t index = 0; index < list.ListCount(); ++index) {
+      const std::string data = std::to_string(list.item(index).data);
+      all += (index == 0 ? "" : " ") + (index == list.ListIndex() ? "[" + data + "]" : data);
+    }
+    return all;
   }
 
   ItemList list{ControlKind::ComboBox, "AverageTypeCombo"};
-  Control label{ControlKind::Label, "AverageTypeLabel"};
+  Label label{"AverageTypeLabel"};
   clsEnumeratedParameter parameter;
 };
-
-using Data = std::vector<std::int32_t>;
 
 TEST_F(EnumeratedParameterTest, FillsTheListInTableOrderWhicheverComesFirst) {
   parameter.parameterType(500);
   parameter.value(1);
+  parameter.Label(&label);
   parameter.ComboBox(&list);
-  EXPECT_EQ(data(), (Data{32, 0, 1, 2, 3}));
-  EXPECT_EQ(list.item(2), (ItemList::Item{"Exponential", 1}));
-  EXPECT_EQ(list.ListIndex(), 2);
-
+  EXPECT_EQ(items(), "32 0 [1] 2 3");
+  EXPECT_EQ(list.Text(), "Exponential");
   parameter.parameterType(17);
-  EXPECT_EQ(data(), (Data{0, 1}));
-  EXPECT_EQ(list.ListIndex(), 1);
-
+  EXPECT_EQ(items(), "0 [1]");
+  parameter.value(0);
+  parameter.parameterType(17);
+  EXPECT_EQ(items(), "[0] 1");
   parameter.parameterType(0);
-  EXPECT_EQ(data(), Data{});
-  EXPECT_EQ(list.ListIndex(), -1);
+  EXPECT_EQ(items(), "");
+  parameter.Enabled(false);
+  parameter.Visible(false);
+  EXPECT_FALSE(parameter.Enabled() || label.Enabled() || parameter.Visible() || label.Visible());
   EXPECT_EQ(messages(), Messages{});
 }
 
 TEST_F(EnumeratedParameterTest, ValueAndSelectionFollowEachOther) {
   bind();
   parameter.value(3);
-  EXPECT_EQ(list.ListIndex(), 4);
+  EXPECT_EQ(items(), "32 0 1 2 [3]");
   EXPECT_FALSE(parameter.newValue());  // the program's doing, though the list clicks
-
   list.userChoice(0);
   EXPECT_EQ(parameter.value(), 32);
   EXPECT_TRUE(parameter.newValue());
   EXPECT_TRUE(parameter.newValue());  // reading does not clear it
-
   list.userChoice(0);
   EXPECT_FALSE(parameter.newValue());
 
   parameter.value(9);
-  EXPECT_EQ(messages(), (Messages{"clsEnumeratedParameter::value() ... could not find value (9) for "
-                                  "ParameterType 500\r"}));
-  EXPECT_EQ(list.ListIndex(), 0);
-  EXPECT_EQ(parameter.value(), 9);
-
+  EXPECT_EQ(items(), "[32] 0 1 2 3");
   list.AddItem("out of 16 bits", 40000);
-  clearMessages();
   list.userChoice(5);
-  EXPECT_EQ(messages(), Messages{"clsEnumeratedParameter::Change()...\rOverflow"});
   EXPECT_EQ(parameter.value(), 9);
-
   list.AddItem("twice", 2);  // of two items with one value the last is selected
   parameter.value(2);
-  EXPECT_EQ(list.ListIndex(), 6);
+  EXPECT_EQ(items(), "32 0 1 2 3 40000 [2]");
+  EXPECT_EQ(messages(), (Messages{"clsEnumeratedParameter::value() ... could not find value (9) for "
+                                  "ParameterType 500\r",
+                                  "clsEnumeratedParameter::Change()...\rOverflow"}));
 }
 
 TEST_F(EnumeratedParameterTest, ASubsetHoldsWhatIsAddedToIt) {
   parameter.subset(true);
   bind();
-  EXPECT_EQ(data(), Data{});
   parameter.Add(32);
   parameter.Add(7);
   parameter.Add(32);
-  EXPECT_EQ(data(), (Data{32, 7}));
-  EXPECT_EQ(list.item(1).text, "7");
-
+  EXPECT_EQ(items() + " " + list.item(1).text, "32 7 7");
   parameter.Limits(ListedRecords({{{"[Order]", 0}, {"[Minimum]", 0}, {"[Maximum]", "1"}},
                                   {{"[Order]", 1}, {"[Minimum]", 6}, {"[Maximum]", 8}},
                                   {{"[Order]", 2}, {"[Minimum]", 20}, {"[Maximum]", 19}},
                                   {{"[Order]", 3}, {"[Minimum]", "low"}, {"[Maximum]", 40}}}));
-  EXPECT_EQ(data(), (Data{32, 7, 0, 1, 6, 8}));
-  EXPECT_EQ(list.ListIndex(), -1);
+  EXPECT_EQ(items(), "32 7 0 1 6 8");
   parameter.Update();  // the value is 0
-  EXPECT_EQ(list.ListIndex(), 2);
-
   parameter.Remove(32);
   parameter.Remove(99);
-  EXPECT_EQ(data(), (Data{7, 0, 1, 6, 8}));
-  EXPECT_EQ(list.ListIndex(), 1);
-  parameter.Update();
+  EXPECT_EQ(items(), "7 [0] 1 6 8");
   EXPECT_EQ(messages(), Messages{});
-
   parameter.Limits(ListedRecords({{{"[Minimum]", -32768}, {"[Maximum]", 32767}}}));
   EXPECT_EQ(list.ListCount(), 65536);
 }
 
-TEST_F(EnumeratedParameterTest, BadLimitsAndAMissingListAreReportedAndChangeNothing) {
+TEST_F(EnumeratedParameterTest, WhatCannotBeIsReportedAndChangesNothing) {
+  ItemList simple(ControlKind::ComboBox, "SimpleCombo", ListStyle::SimpleCombo);
+  parameter.ComboBox(&simple);
   bind();
   parameter.Limits(ListedRecords({{{"[Minimum]", 10}, {"[Maximum]", 12}}, {{"[Minimum]", 10}}}));
   parameter.Limits(ListedRecords({{{"[Minimum]", 10}, {"[Maximum]", 40000}}}));
-  EXPECT_EQ(data(), (Data{32, 0, 1, 2, 3}));
-
+  EXPECT_EQ(items(), "32 [0] 1 2 3");
   parameter.ComboBox(nullptr);
   parameter.Add(5);
   parameter.Remove(5);
   parameter.Update();
   parameter.Click();
   parameter.value(2);  // kept for the list to come
+  parameter.ComboBox(&list);
+  EXPECT_EQ(items(), "32 0 1 [2] 3");
   EXPECT_EQ(
       messages(),
-      (Messages{"clsEnumeratedParameter::Limits()...\rInvalid procedure call or argument",
+      (Messages{"clsEnumeratedParameter::ComboBox() expects a drop down list\r",
+                "clsEnumeratedParameter::Limits()...\rInvalid procedure call or argument",
                 "clsEnumeratedParameter::Limits()...\rOverflow",
                 "clsEnumeratedParameter::Add()...\rObject variable or With block variable not set",
                 "clsEnumeratedParameter::Remove()...\rObject variable or With block variable not set"}));
-  parameter.ComboBox(&list);
-  EXPECT_EQ(list.ListIndex(), 3);
-}
-
-TEST_F(EnumeratedParameterTest, AnotherKindOfListIsReportedAndWorks) {
-  ItemList simple(ControlKind::ComboBox, "SimpleCombo", ListStyle::SimpleCombo);
-  parameter.parameterType(500);
-  parameter.ComboBox(&simple);
-  EXPECT_EQ(messages(), Messages{"clsEnumeratedParameter::ComboBox() expects a drop down list\r"});
-  EXPECT_EQ(simple.ListCount(), 5);
-}
-
-TEST_F(EnumeratedParameterTest, EnabledAndVisibleReachListAndLabel) {
-  parameter.Label(&label);
-  EXPECT_FALSE(parameter.Enabled());
-  parameter.ComboBox(&list);
-  EXPECT_TRUE(parameter.Enabled());
-  parameter.Enabled(false);
-  parameter.Visible(false);
-  EXPECT_FALSE(parameter.Enabled() || list.Enabled() || label.Enabled());
-  EXPECT_FALSE(parameter.Visible() || list.Visible() || label.Visible());
 }
 
 }  // namespace

@@ -3,51 +3,12 @@
 #include <gtest/gtest.h>
 
 #include "platform/constituent.h"
+#include "tests/support/sample_panel.h"
 
 namespace frontpanels {
 namespace {
 
 using Kind = ControlKind;
-
-constexpr ControlRow kRows[] = {
-    {"SideArea", Kind::Picture, "", "", {}},
-    {"FrequencyFrame", Kind::Frame, "SideArea", "&Frequency", {}, 0},
-    {"CenterLabel", Kind::Label, "FrequencyFrame", "&Center", {}, 1},
-    {"CenterTextBox", Kind::TextBox, "FrequencyFrame", "", {}, 2},
-    {"CenterSpinButton", Kind::SpinButton, "FrequencyFrame", "", {}},
-    {"TimeOption", Kind::OptionButton, "SideArea", "&Time", {}, 4},
-    {"UplinkOption", Kind::OptionButton, "FrequencyFrame", "&Uplink", {}, 7},
-    {"DownlinkOption", Kind::OptionButton, "FrequencyFrame", "&Downlink", {}, 6},
-    {"TypeCombo", Kind::ComboBox, "SideArea", "", {}, 8},
-    {"AutoBox", Kind::CheckBox, "SideArea", "A&utoScale && more", {}, 9},
-    {"SingleButton", Kind::PushButton, "SideArea", "&Single", {}, 10},
-    {"HiddenButton", Kind::PushButton, "SideArea", "&Single", {}, 11, false},
-};
-
-class ControlSetTest : public ::testing::Test {
- protected:
-  ControlSetTest() {
-    for (const auto& control : set.controls()) {
-      const auto log = [this, name = control->name()](const char* what) {
-        return [this, name, what] { events.push_back(name + " " + what); };
-      };
-      control->GotFocus = log("got");
-      control->LostFocus = log("lost");
-      control->Click = log("click");
-    }
-    box.Change = [this] { events.push_back("Change " + box.Text()); };
-    set.list("TypeCombo").AddItem("Off", 32);
-    set.list("TypeCombo").AddItem("Linear", 0);
-  }
-  [[nodiscard]] std::string focus() const { return set.focused() == nullptr ? "" : set.focused()->name(); }
-  std::vector<std::string> taken() { return std::exchange(events, {}); }
-
-  ControlSet set{kRows};
-  TextBox& box = set.textBox("CenterTextBox");
-  std::vector<std::string> events;
-};
-
-using Events = std::vector<std::string>;
 
 int errorNumber(const std::function<void()>& action) {
   try {
@@ -58,187 +19,105 @@ int errorNumber(const std::function<void()>& action) {
   return 0;
 }
 
-TEST_F(ControlSetTest, ReadsTheTableAndRefusesAFaultyOne) {
-  EXPECT_EQ(&set.spinButton("CENTERSPINBUTTON"), &set.control("CenterSpinButton"));
-  EXPECT_EQ(set.spinButton("CenterSpinButton").buddy(), &box);
-  EXPECT_EQ(box.parent(), &set.frame("FrequencyFrame"));
-  EXPECT_EQ(set.label("CenterLabel").Caption(), "&Center");
-  EXPECT_FALSE(set.pushButton("HiddenButton").Visible());
-  EXPECT_EQ(errorNumber([this] { static_cast<void>(set.textBox("StopTextBox")); }), 5);
-  EXPECT_EQ(errorNumber([this] { static_cast<void>(set.textBox("AutoBox")); }), 13);
+TEST(ControlSetTest, PlaysTheScriptOnModelsAlone) {
+  testing::SamplePanel panel;
+  for (const testing::Step& step : testing::kScript)
+    EXPECT_EQ(panel.play(step), std::pair(std::string(step.events), std::string(step.value))) << step.actions;
+  panel.set.picture("Area").Enabled(false);
+  EXPECT_EQ(panel.set.focused(), &panel.set.control("Single"));
+  panel.set.control("Single").LostFocus = [&] { panel.set.control("Single").Enabled(false); };
+  panel.set.control("Single").Visible(false);  // Close is all that is left
+  EXPECT_EQ(panel.set.focused(), &panel.set.control("Close"));
+  panel.set.control("Close").Enabled(false);
+  EXPECT_EQ(panel.set.focused(), nullptr);
+  panel.set.control("Close").SetFocus();
+  EXPECT_FALSE(panel.set.tab(true) || panel.set.accessKey(U'l') || panel.set.accessKey(0));
+}
 
+TEST(ControlSetTest, WhatIsLeftMaySendTheFocusElsewhere) {
+  ControlSet set(testing::kSampleRows);
+  set.control("Span").SetFocus();
+  set.control("Span").LostFocus = [&] { set.control("Auto").SetFocus(); };
+  set.control("Center").SetFocus();
+  EXPECT_EQ(set.focused(), &set.control("Auto"));
+  set.control("Chan").SetFocus();  // of the group without a choice, but not the one that it is entered by
+  EXPECT_TRUE(set.tab(true) && set.control("Time").hasFocus());
+}
+
+TEST(ControlSetTest, ReadsTheTableAndRefusesAFaultyOne) {
+  const ControlSet set(testing::kSampleRows);
+  EXPECT_EQ(&set.spinButton("CENTERSPIN"), &set.control("CenterSpin"));
+  EXPECT_EQ(set.spinButton("CenterSpin").buddy(), &set.textBox("Center"));
+  EXPECT_EQ(set.label("CenterLabel").parent(), &set.frame("FrequencyFrame"));
   const ControlRow twice[] = {{"A", Kind::Label, "", "", {}}, {"a", Kind::Label, "", "", {}}};
   const ControlRow orphan[] = {{"A", Kind::Label, "B", "", {}}};
   const ControlRow inLabel[] = {{"A", Kind::Label, "", "", {}}, {"B", Kind::TextBox, "A", "", {}}};
   const ControlRow alone[] = {{"A", Kind::SpinButton, "", "", {}}};
-  EXPECT_EQ(errorNumber([&] { ControlSet{twice}; }), 457);
-  EXPECT_EQ(errorNumber([&] { ControlSet{orphan}; }), 5);
-  EXPECT_EQ(errorNumber([&] { ControlSet{inLabel}; }), 5);
-  EXPECT_EQ(errorNumber([&] { ControlSet{alone}; }), 5);
-}
-
-TEST_F(ControlSetTest, TabStopsAtUsableControlsAndOnceInAnOptionGroup) {
-  const auto walk = [this](bool forward) {
-    Events names;
-    while (names.size() < 9 && set.tab(forward)) names.push_back(focus());
-    return names;
+  const std::pair<int, std::function<void()>> faults[] = {
+      {5, [&] { static_cast<void>(set.textBox("Stopp")); }},
+      {13, [&] { static_cast<void>(set.textBox("Auto")); }},
+      {457, [&] { ControlSet{twice}; }},
+      {5, [&] { ControlSet{orphan}; }},
+      {5, [&] { ControlSet{inLabel}; }},
+      {5, [&] { ControlSet{alone}; }},
   };
-  EXPECT_EQ(walk(true), (Events{"CenterTextBox", "TimeOption", "UplinkOption", "TypeCombo", "AutoBox",
-                                "SingleButton"}));  // nothing chosen: the group's first in the table
-  set.control("DownlinkOption").SetFocus();         // not the one that the group is entered by
-  EXPECT_EQ(walk(true), (Events{"TypeCombo", "AutoBox", "SingleButton"}));
-  set.optionButton("DownlinkOption").Value(true);
-  set.list("TypeCombo").Enabled(false);
-  EXPECT_EQ(walk(false), (Events{"AutoBox", "DownlinkOption", "TimeOption", "CenterTextBox"}));
-  EXPECT_FALSE(set.tab(false));
-  EXPECT_EQ(focus(), "CenterTextBox");
-
-  set.frame("FrequencyFrame").Visible(false);  // takes the focused box with it
-  EXPECT_EQ(focus(), "TimeOption");
-  box.SetFocus();
-  EXPECT_EQ(focus(), "TimeOption");
-  EXPECT_EQ(walk(true), (Events{"AutoBox", "SingleButton"}));
-  set.picture("SideArea").Enabled(false);
-  EXPECT_EQ(focus(), "");
+  for (const auto& [number, action] : faults) EXPECT_EQ(errorNumber(action), number);
 }
 
-TEST_F(ControlSetTest, AFieldLosesTheFocusBeforeTheNextOneHasIt) {
-  box.SetFocus();
-  ControlSet::click(set.pushButton("SingleButton"));
-  EXPECT_EQ(taken(),
-            (Events{"CenterTextBox got", "CenterTextBox lost", "SingleButton got", "SingleButton click"}));
-
-  set.control("SingleButton").LostFocus = [this] { set.control("AutoBox").SetFocus(); };
-  box.SetFocus();  // what is left behind sends the focus elsewhere
-  EXPECT_EQ(taken(), Events{"AutoBox got"});
-}
-
-TEST_F(ControlSetTest, OptionsAreExclusiveWithinTheirFrame) {
-  OptionButton& uplink = set.optionButton("UplinkOption");
-  OptionButton& downlink = set.optionButton("DownlinkOption");
-  set.optionButton("TimeOption").Value(true);
-  uplink.Value(true);
-  ControlSet::click(downlink);
-  downlink.userClick();  // is chosen already
-  EXPECT_EQ(taken(),
-            (Events{"TimeOption click", "UplinkOption click", "DownlinkOption got", "DownlinkOption click"}));
-  EXPECT_TRUE(downlink.Value() && !uplink.Value() && set.optionButton("TimeOption").Value());
-
-  EXPECT_TRUE(set.arrow(true));  // round the end
-  EXPECT_TRUE(uplink.Value() && uplink.hasFocus());
-  downlink.Enabled(false);
-  EXPECT_FALSE(set.arrow(false));
-  EXPECT_TRUE(uplink.Value());
-}
-
-TEST_F(ControlSetTest, AccessKeysLeadOnFromLabelsAndClickButtons) {
-  struct KeyCase {
-    char32_t key;
-    Events events;
-  };
-  set.control("AutoBox").SetFocus();
-  taken();
-  const KeyCase cases[] = {
-      {U'C', {"AutoBox lost", "CenterTextBox got"}},
-      {U'u', {"CenterTextBox lost", "UplinkOption got"}},  // shared: walks and clicks nothing
-      {U'u', {"UplinkOption lost", "AutoBox got"}},
-      {U'u', {"AutoBox lost", "UplinkOption got"}},
-      {U'd', {"UplinkOption lost", "DownlinkOption got", "DownlinkOption click"}},
-      {U's', {"DownlinkOption lost", "SingleButton got", "SingleButton click"}},
-      {U'f', {"SingleButton lost", "CenterTextBox got"}},
-  };
-  for (const KeyCase& c : cases) {
-    EXPECT_TRUE(set.accessKey(c.key));
-    EXPECT_EQ(taken(), c.events);
-  }
-  EXPECT_FALSE(set.accessKey(U'x') || set.accessKey(U'&') || set.accessKey(0));
-  box.Enabled(false);
-  EXPECT_TRUE(set.accessKey(U'c'));  // on to the next that can be used
-  EXPECT_EQ(focus(), "TimeOption");
-}
-
-TEST_F(ControlSetTest, TypingReplacesWhatIsSelectedAndMayBeConsumed) {
-  const Constituent field(box);
-  std::vector<std::int16_t> keys;
-  box.GotFocus = [this] { box.selectAll(); };
-  box.KeyDown = [&](std::int16_t keyCode, std::int16_t /*shift*/) { keys.push_back(keyCode); };
+TEST(ConstituentTest, TypesOverWhatIsSelectedUnlessAKeyIsConsumed) {
+  ControlSet set(testing::kSampleRows);
+  TextBox& box = set.textBox("Span");
+  std::string keys;
+  box.GotFocus = [&] { box.selectAll(); };
+  box.KeyDown = [&](std::int16_t keyCode, std::int16_t) { keys += std::to_string(keyCode) + " "; };
   box.KeyPress = [](std::int16_t& character) {
-    if (character == 'x') character = 0;
-    if (character == 'y') character = 'Y';
+    character = character == 'x' ? 0 : character == 'y' ? 'Y' : character;
   };
   box.Text("old");
-  for (const char c : std::string("9xy\r")) field.KeyPress(c);
-  field.KeyPress(0x20AC);
+  for (const char16_t character : std::u16string(u"9xy\r\u20AC"))
+    Constituent(box).KeyPress(static_cast<std::int16_t>(character));
   EXPECT_EQ(box.Text(), "9Y\xE2\x82\xAC");
-  EXPECT_EQ(keys, (std::vector<std::int16_t>{'9', 'X', 'Y', 13, 0}));
-  field.KeyPress(8);
-  EXPECT_EQ(taken(), (Events{"Change old", "Change 9", "Change 9Y", "Change 9Y\xE2\x82\xAC", "Change 9Y"}));
-  EXPECT_EQ(errorNumber([&] { field.KeyPress(static_cast<std::int16_t>(0xD800)); }), 5);
+  EXPECT_EQ(keys, "57 88 89 13 0 ");
+  Constituent(box).KeyPress(8);
+  EXPECT_EQ(box.Text(), "9Y");
+  EXPECT_EQ(errorNumber([&] { Constituent(box).KeyPress(static_cast<std::int16_t>(0xD800)); }), 5);
   box.selectAll();
-  field.KeyPress(8);
-  field.KeyPress(8);
+  for (int i = 0; i < 2; ++i) Constituent(box).KeyPress(8);
   EXPECT_EQ(box.Text(), "");
 }
 
-TEST_F(ControlSetTest, AConstituentActsAsAUserCould) {
-  const Constituent combo(set.control("TypeCombo"));
-  combo.Text("Linear");
-  EXPECT_EQ(combo.ListIndex(), 1);
-  EXPECT_EQ(combo.List(0), "Off");
-  EXPECT_EQ(combo.ItemData(0), 32);
-  EXPECT_EQ(errorNumber([&] { combo.Text("linear"); }), 5);
-  EXPECT_EQ(errorNumber([&] { combo.ListIndex(2); }), 9);
+TEST(ConstituentTest, ActsAsAUserCouldAndHasTheMembersOfItsKind) {
+  testing::SamplePanel panel;
+  const auto of = [&](const char* name) { return Constituent(panel.set.control(name)); };
+  of("Type").Text("Off");
+  EXPECT_EQ(of("Type").List(of("Type").ListIndex()), "Off");
+  EXPECT_EQ(of("Auto").Caption(), "AutoScale & more");
+  of("Auto").Value(true);  // is so already
+  of("Auto").Click();
+  EXPECT_EQ(of("Auto").Value(), Variant(std::int16_t{0}));
+  of("Chan").Value(true);
+  EXPECT_EQ(of("Freq").Value(), Variant(false));
+  of("SpanSpin").SpinUp();
+  EXPECT_EQ(panel.events, "!Type +Auto !Auto !Chan ^SpanSpin");
 
-  const Constituent check(set.control("AutoBox"));
-  EXPECT_EQ(check.Caption(), "AutoScale & more");
-  check.Click();
-  check.Value(true);  // is so already
-  EXPECT_EQ(check.Value(), Variant(std::int16_t{1}));
-  check.KeyPress(' ');
-  EXPECT_EQ(check.Value(), Variant(std::int16_t{0}));
-  EXPECT_EQ(errorNumber([this] { set.checkBox("AutoBox").Value(2); }), 5);
-  Constituent(set.control("SingleButton")).KeyPress(13);
-  EXPECT_EQ(taken(), (Events{"TypeCombo click", "AutoBox got", "AutoBox click", "AutoBox click",
-                             "AutoBox lost", "SingleButton got", "SingleButton click"}));
+  panel.set.picture("Area").Enabled(false);  // and the rest of what is out of reach
+  panel.events.clear();
+  of("SpanSpin").SpinDown();
+  of("Name").Text("7");
+  of("Name").KeyPress('7');
+  of("Freq").Value(true);
+  of("Type").ListIndex(3);
+  of("Hidden").Click();
+  EXPECT_EQ(panel.events + of("Name").Text(), "Gr\xC3\xBC\xC3\x9F");
+  EXPECT_TRUE(!of("Name").Enabled() && of("Name").Visible() && !of("Hidden").Visible());
 
-  const Constituent option(set.control("UplinkOption"));
-  option.Value(true);
-  EXPECT_EQ(errorNumber([&] { option.Value(false); }), 5);
-  EXPECT_EQ(option.Value(), Variant(true));
-}
-
-TEST_F(ControlSetTest, AConstituentOutOfReachDoesNothingAndAMissingMemberIsAnError) {
-  const Constituent field(box);
-  const Constituent spin(set.control("CenterSpinButton"));
-  int steps = 0;
-  set.spinButton("CenterSpinButton").SpinUp = [&] { ++steps; };
-  set.spinButton("CenterSpinButton").SpinDown = [&] { steps += 10; };
-  spin.SpinUp();
-  spin.SpinDown();
-  set.frame("FrequencyFrame").Enabled(false);
-  EXPECT_TRUE(!field.Enabled() && field.Visible());
-  spin.SpinUp();
-  field.Text("7");
-  field.KeyPress('7');
-  Constituent(set.control("UplinkOption")).Value(true);
-  Constituent(set.control("HiddenButton")).Click();
-  EXPECT_EQ(steps, 11);
-  EXPECT_EQ(taken(), Events{});
-
-  const Constituent label(set.control("CenterLabel"));
-  const std::function<void()> missing[] = {
-      [&] { label.Click(); },
-      [&] { label.KeyPress('a'); },
-      [&] { static_cast<void>(label.Text()); },
-      [&] { static_cast<void>(label.Value()); },
-      [&] { label.SpinUp(); },
-      [&] { static_cast<void>(field.Caption()); },
-      [&] { static_cast<void>(field.ListIndex()); },
-      [&] { field.SpinDown(); },
-      [&] { spin.Click(); },
+  const std::pair<int, std::function<void()>> faults[] = {
+      {438, [&] { of("CenterLabel").Click(); }},      {438, [&] { of("Area").KeyPress('a'); }},
+      {438, [&] { (void)of("CenterLabel").Text(); }}, {438, [&] { (void)of("Single").Value(); }},
+      {438, [&] { of("Center").SpinUp(); }},          {438, [&] { (void)of("Center").Caption(); }},
+      {438, [&] { (void)of("Name").ListCount(); }},   {9, [&] { (void)of("Pn").List(4); }},
   };
-  for (const auto& action : missing) EXPECT_EQ(errorNumber(action), 438);
-  EXPECT_EQ(label.Caption(), "Center");
+  for (const auto& [number, action] : faults) EXPECT_EQ(errorNumber(action), number);
 }
 
 }  // namespace
