@@ -69,7 +69,9 @@ clsNumericEntry::Entered clsNumericEntry::setValue(double wanted, bool chooseRan
 std::optional<double> clsNumericEntry::snapped(double value) const {
   if (arbitrary_) return value;
   std::optional<double> onGrid = sequence_.defined() ? chooseSequence(value) : choosePower(value);
-  if (onGrid && step_) onGrid = finite(nearestMultiple(*onGrid, *step_));
+  if (onGrid && step_) {
+    onGrid = finite(channelChoose() ? nearestChannel(*onGrid) : nearestMultiple(*onGrid, *step_));
+  }
   return onGrid;
 }
 
@@ -106,14 +108,14 @@ clsNumericEntry::Settled clsNumericEntry::settled(double value, bool chooseRange
 double clsNumericEntry::stepped(double value, StepDirection direction) const {
   if (const StepSequence& steps = sequence_.defined() ? sequence_ : powers(); steps.defined())
     return nextInSequence(value, direction, steps, shownScale(0));
+  if (channelChoose()) return nextChannel(value, direction);
   if (step_ && normalizeAsStep_) return nextMultiple(value, direction, *step_);
   const double step = step_ ? *step_ : shownStep(value, direction);
   return toSignificantDigits(direction == StepDirection::Up ? value + step : value - step);
 }
 
 double clsNumericEntry::shownStep(double value, StepDirection direction) const {
-  if (formatScale_ == 0) raiseDivisionByZero();
-  return formatScale_ * suffixStep((value - formatOffset_) / formatScale_, direction, suffixes_);
+  return display().scale * suffixStep(shownNumber(value), direction, suffixes_);
 }
 
 // --- Limits and ranges
@@ -335,18 +337,19 @@ void clsNumericEntry::formatter(double value, std::string& text) const {
 }
 
 const SuffixRecord* clsNumericEntry::shownUnit(double value) const noexcept {
-  return suffixes_.find((value - formatOffset_) / formatScale_);
+  const auto [offset, scale] = display();
+  return shownSuffixes().find((value - offset) / scale);
 }
 
 double clsNumericEntry::shownScale(double value) const noexcept {
   const SuffixRecord* const unit = shownUnit(value);
-  return unit == nullptr ? formatScale_ : formatScale_ * unit->scale;
+  const double scale = display().scale;
+  return unit == nullptr ? scale : scale * unit->scale;
 }
 
 void clsNumericEntry::append(std::string& text, double value, std::string_view format, bool withUnit) const {
-  if (formatScale_ == 0) raiseDivisionByZero();
-  double shown = (value - formatOffset_) / formatScale_;
-  const SuffixRecord* const unit = suffixes_.find(shown);
+  double shown = shownNumber(value);
+  const SuffixRecord* const unit = shownSuffixes().find(shown);
   if (unit != nullptr) {
     if (unit->scale == 0) raiseDivisionByZero();
     shown /= unit->scale;

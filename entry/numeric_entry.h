@@ -2,11 +2,14 @@
 // that a user changes it with. Axes use it only to turn their values into text.
 #pragma once
 
+#include <array>
 #include <initializer_list>
 #include <optional>
 #include <string>
 #include <string_view>
+#include <vector>
 
+#include "entry/channel_map.h"
 #include "entry/entry_ranges.h"
 #include "entry/entry_steps.h"
 #include "entry/suffix_table.h"
@@ -191,6 +194,35 @@ class clsNumericEntry {
   // for another quantity; value, text, flags and the bound controls stay.
   void Clear() noexcept;
 
+  // --- Channels: (value - channel zero) / channel spacing of the chosen range, through its discontinuities
+  // (see entry/channel_map.h) and without a unit. The step is then one channel, whatever `step` says.
+
+  // The display offset, and the display scale, of the range that the record's order names; without a record,
+  // or from a host whose data have no orders, of range 0 and in force. The entry then has channel units.
+  void ChannelZero(double value, const HostRecordSet* records = nullptr) noexcept;
+  void ChannelSpacing(double value, const HostRecordSet* records = nullptr) noexcept;
+  // Whether the ranges' offsets and scales are channel zeros and spacings.
+  [[nodiscard]] bool channelUnits() const noexcept { return channelUnits_; }
+  void channelUnits(bool channels) noexcept;
+  // Whether channels are shown, or else frequencies: as soon as there are channel units, until it is set.
+  [[nodiscard]] bool channelChoose() const noexcept { return channelChoose_.value_or(channelUnits_); }
+  void channelChoose(bool channels) noexcept;
+
+  // Of one range, or without one of every range. One that is no block of channels, or overlaps another, is
+  // reported and not added.
+  void AddChannelDiscontinuity(double channel, double minimum, double maximum,
+                               std::optional<std::int32_t> range = {}) noexcept;
+  // The same from a host's record, whose default is the channel, or the value where it has none. 0 without a
+  // record takes all discontinuities back.
+  void ChannelDiscontinuity(double value, const HostRecordSet* records = nullptr) noexcept;
+  // Gives every range its discontinuities. One whose range has no limits is reported, and waits for them.
+  void UpdateDiscontinuities() noexcept;
+
+  // Whether the text in the box, or one that the latest event has refused, stands for a value: a number, and
+  // where channels are shown that of a channel within the limits. Set by a panel that refuses a text itself.
+  [[nodiscard]] bool validNumeric() const noexcept;
+  void validNumeric(bool valid) noexcept { validNumeric_ = valid; }
+
   // --- Events, forwarded by the panel. Each says by `newValue` whether it has changed the value. A refused
   // text changes nothing and stays to be corrected while the box keeps the focus; when the focus leaves, the
   // last good one is back.
@@ -228,6 +260,23 @@ class clsNumericEntry {
     std::optional<std::int32_t> range;
   };
 
+  struct Display {
+    double offset = 0;
+    double scale = 1;
+  };
+
+  struct ChannelField {
+    std::string_view failure;
+    std::string_view badOrder;
+    double EntryRange::*member;
+  };
+
+  struct RangedDiscontinuity {
+    frontpanels::ChannelDiscontinuity block;
+    std::optional<std::int32_t> range;
+    [[nodiscard]] bool countsFor(std::int32_t index) const noexcept { return range.value_or(index) == index; }
+  };
+
   [[nodiscard]] Entered setValue(double wanted, bool chooseRange) noexcept;
   // Empty after a failure that was reported by its own message.
   [[nodiscard]] std::optional<double> snapped(double value) const;
@@ -246,9 +295,24 @@ class clsNumericEntry {
 
   static void setGrid(std::string_view routine, const Variant& value, std::optional<double>& grid) noexcept;
 
+  void setChannelField(const ChannelField& field, double value, const HostRecordSet* records,
+                       double& inForce) noexcept;
+  void addDiscontinuity(const RangedDiscontinuity& added);
+  [[nodiscard]] bool hasLimits(std::int32_t index) const noexcept;
+  [[nodiscard]] ChannelPlan channelPlan(std::int32_t index) const noexcept;
+  // In the chosen range, or with `autoChoose` in the first that has the channel.
+  [[nodiscard]] std::optional<double> frequencyOfChannel(double channel) const noexcept;
+  [[nodiscard]] double nearestChannel(double value) const;
+  [[nodiscard]] double nextChannel(double value, StepDirection direction) const;
+
+  // What turns a value into the number that is shown, before its unit.
+  [[nodiscard]] Display display() const noexcept;
+  [[nodiscard]] double shownNumber(double value) const;
+  [[nodiscard]] const SuffixTable& shownSuffixes() const noexcept;
   // Null without units.
   [[nodiscard]] const SuffixRecord* shownUnit(double value) const noexcept;
   [[nodiscard]] std::optional<double> parsed(std::string_view text) const;
+  [[nodiscard]] bool accepts(std::string_view text) const;
   // The value that the field stands for: the exact one while its text is as it was written.
   [[nodiscard]] std::optional<double> shownValue() const;
   // Takes a typed text over as the value.
@@ -282,6 +346,12 @@ class clsNumericEntry {
   double formatScale_ = 1;
   double formatOffset_ = 0;
   std::string lastText_;  // as written to the box
+
+  std::vector<RangedDiscontinuity> discontinuities_;  // as added
+  std::array<std::vector<frontpanels::ChannelDiscontinuity>, EntryRanges::kCount> rangeDiscontinuities_;
+  std::optional<bool> channelChoose_;
+  bool channelUnits_ = false;
+  bool validNumeric_ = true;
 
   bool newValue_ = false;
   bool autoChoose_ = false;

@@ -98,8 +98,8 @@ const std::string& clsNumericEntry::text() const noexcept {
 
 void clsNumericEntry::text(std::string_view text) noexcept {
   onEvent("clsNumericEntry::LetText() failed. ", [&](bool& changed) {
-    const bool leftBlank = preserveBlankEntry_ && isBlankText(text);
-    if (!leftBlank && !parsed(text)) raiseTypeMismatch();
+    validNumeric_ = accepts(text);
+    if (!validNumeric_) raiseTypeMismatch();
     changed = commit(std::string(text)) == Entered::Changed;
   });
 }
@@ -112,10 +112,12 @@ std::optional<double> clsNumericEntry::textToNumeric() const noexcept {
 std::optional<double> clsNumericEntry::parsed(std::string_view text) const {
   const SuffixRecord* const unit = shownUnit(value_);
   const double unitScale = unit == nullptr ? 1 : unit->scale;
-  const std::optional<double> number = parseEntryText(text, suffixes_, unitScale, decimalSeparator_);
-  if (!number || formatScale_ == 0) return std::nullopt;
-  if (formatScale_ == 1 && formatOffset_ == 0) return number;
-  const double value = toSignificantDigits(*number * formatScale_ + formatOffset_);
+  const std::optional<double> number = parseEntryText(text, shownSuffixes(), unitScale, decimalSeparator_);
+  if (number && channelChoose()) return frequencyOfChannel(*number);
+  const auto [offset, scale] = display();
+  if (!number || scale == 0) return std::nullopt;
+  if (scale == 1 && offset == 0) return number;
+  const double value = toSignificantDigits(*number * scale + offset);
   if (!std::isfinite(value)) return std::nullopt;
   return value;
 }
@@ -153,6 +155,10 @@ void clsNumericEntry::Clear() noexcept {
     ranges_ = {};
     range_ = 0;
     choose(range_);
+    discontinuities_.clear();
+    UpdateDiscontinuities();
+    channelUnits_ = false;
+    channelChoose_.reset();
     sequence_ = {};
     power_ = 0;
     step_.reset();
@@ -177,6 +183,7 @@ clsNumericEntry::Entered clsNumericEntry::commit(const std::string& typed) {
 template <class Body>
 void clsNumericEntry::onEvent(const char* message, Body body) noexcept {
   newValue_ = false;
+  validNumeric_ = true;
   bool changed = false;
   guard(message, [&] { body(changed); });
   // Not before: a text that is written and a focus that moves raise events as well.
@@ -209,7 +216,7 @@ void clsNumericEntry::KeyPress(std::int16_t& character) noexcept {
       character = 0;
       typed == kUp ? upClick() : downClick();
       changed = newValue_;
-    } else if (textBox_ != nullptr && (typed == kEnter || beginsSuffix(suffixes_, typed))) {
+    } else if (textBox_ != nullptr && (typed == kEnter || beginsSuffix(shownSuffixes(), typed))) {
       character = 0;
       takeOver(typed == kEnter ? text() : text() + static_cast<char>(typed), changed);
     }
@@ -245,6 +252,7 @@ void clsNumericEntry::LostFocus() noexcept {
     if (entered != Entered::Refused) return;
     textBox_->Text(lastText_);
     textBox_->beep();
+    validNumeric_ = false;
   });
 }
 

@@ -1,0 +1,276 @@
+#include "entry/channel_info.h"
+
+#include <cmath>
+
+#include "entry/host_data_version.h"
+#include "tests/entry/entry_field.h"
+
+namespace frontpanels {
+namespace {
+
+using testing::ListedRecords;
+
+ListedRecords record(const Variant& order, double minimum = 0, double maximum = 0,
+                     const Variant& channel = {}) {
+  return ListedRecords(
+      {{{"[Order]", order}, {"[Minimum]", minimum}, {"[Maximum]", maximum}, {"[Default]", channel}}});
+}
+
+// Channel 1 at 870.03 MHz, 30 kHz apart; below it, down to 869.04 MHz, the channels 991 to 1023.
+class ChannelTest : public testing::EntryFieldTest {
+ protected:
+  ChannelTest() {
+    entry.frequencySuffix();
+    limits(0, 869.04e6, 893.98e6);
+    limits(1, 1930e6, 1990e6);
+    entry.range(0);
+    entry.value(880e6);
+  }
+  ~ChannelTest() override { hostDataVersion(0.04); }
+
+  void limits(std::int32_t range, double minimum, double maximum) {
+    entry.MinimumForRange(range, minimum);
+    entry.MaximumForRange(range, maximum);
+  }
+  void plan(const Variant& order, const char* zero, const char* spacing, double channel, double minimum,
+            double maximum) {
+    const ListedRecords set = record(order, minimum, maximum);
+    info.setChannelZero(zero, &set);
+    info.setChannelSpacing(spacing, &set);
+    info.setChannelDiscontinuity(numberToText(channel), &set);
+  }
+  void lookup(const char* id, double lowest, double highest) {
+    const ListedRecords set = record({}, lowest, highest);
+    info.setChannelLookup(id, &set);
+  }
+  void selectCellular() {
+    plan(4, "870e6", "30000", -32, 991, 1023);
+    plan(5, "1930E6", "50000", 500, 1500, 1600);
+    lookup("7", 4, 5);
+    info.selectChannelization(7, entry);
+  }
+  // Offset and scale of the first two ranges, and what 869.04 MHz reads.
+  [[nodiscard]] std::string plans() const {
+    std::string text;
+    for (const std::int32_t range : {0, 1})
+      text += numberToText(entry.FormatOffsetForRange(range)) + "/" +
+              numberToText(entry.FormatScaleForRange(range)) + " ";
+    return text + entry.formatter(869.04e6);
+  }
+
+  clsChannelInfo info;
+};
+
+TEST_F(ChannelTest, EveryFrequencyHasAChannelAndEveryChannelItsFrequency) {
+  struct Pair {
+    double frequency;
+    const char* channel;
+  };
+  const std::vector<Pair> cases = {
+      {869.04e6, "991"},  // the block: position -32 of the plain numbering
+      {869.055e6, "991.5"},  {869.07e6, "992"},    {869.97e6, "1022"},
+      {870e6, "1023"},                            // where channel 0 would lie
+      {870.009e6, "1023.3"}, {870.015e6, "0.5"},  // half-way to the upper channel belongs to the upper one
+      {870.03e6, "1"},       {870.0366e6, "1.22"}, {893.98e6, "799.333333333333"},
+      {1930e6, "0"},  // range 1, chosen by the channel
+      {1954.95e6, "499"},    {1955e6, "1500"},     {1960e6, "1600"},
+      {1960.025e6, "600.5"}, {1990e6, "1200"},
+  };
+  selectCellular();
+  entry.autoChoose(true);
+  for (const Pair& c : cases) {
+    entry.value(c.frequency);
+    EXPECT_EQ(box.Text(), c.channel);
+    entry.range(c.frequency < 1e9 ? 1 : 0);
+    entry.range(c.frequency < 1e9 ? 0 : 1);
+    EXPECT_EQ(entry.formatter(c.frequency), c.channel);
+    entry.valueNoUpdate(c.frequency < 1e9 ? 880.02e6 : 1980e6);
+    leave(c.channel);
+    EXPECT_NEAR(entry.value(), c.frequency, 1e-6) << c.channel;
+    EXPECT_TRUE(entry.validNumeric());
+  }
+  EXPECT_EQ(said(), "");
+}
+
+TEST_F(ChannelTest, ATextThatIsNoChannelIsRefused) {
+  selectCellular();
+  entry.value(870.03e6);
+  for (const char* text : {"0", "-5", "800", "900", "990", "1500", "1 k", "1 MHz", "1e300", "x", ""}) {
+    type(text);
+    EXPECT_FALSE(entry.validNumeric()) << text;
+    leave(text);
+    EXPECT_EQ(state(), "1 = 870030000") << text;
+    EXPECT_FALSE(entry.validNumeric()) << text;  // until the next event
+    entry.GotFocus();
+    EXPECT_TRUE(entry.validNumeric());
+  }
+  leave("1024");  // beyond the block's numbers and beyond the limits
+  EXPECT_FALSE(entry.validNumeric());
+  leave("799.5");  // its nearer half is within: the limit
+  EXPECT_EQ(state(), "799.333333333333 = 893980000");
+  leave("1023.5");  // as 1023.4999 reads when it is rounded
+  EXPECT_EQ(state(), "0.5 = 870015000");
+  leave("1023");
+  EXPECT_EQ(clicks(2), "1, 2");
+  EXPECT_EQ(clicks(-3), "1, 1023, 1022");
+  entry.value(870.04e6);
+  EXPECT_EQ(clicks(-1), "1023.33333333333");
+  entry.NormalizeAsStep(true);
+  EXPECT_EQ(clicks(1), "1");
+  entry.step(1e6);  // one channel all the same
+  entry.value(870.0701e6);
+  EXPECT_EQ(state(), "2 = 870060000");
+
+  entry.channelChoose(false);
+  EXPECT_EQ(state(), "870.06 MHz = 870060000");
+  leave("871");
+  entry.ChannelSpacing(30e3);  // the panel's choice stands
+  EXPECT_EQ(state(), "871 MHz = 871000000");
+  entry.channelChoose(true);
+  EXPECT_EQ(box.Text(), "33.3333333333333");
+  entry.validNumeric(false);
+  EXPECT_FALSE(entry.validNumeric());
+  entry.Clear();
+  EXPECT_FALSE(entry.channelChoose() || entry.channelUnits());
+  EXPECT_EQ(said(), "");
+}
+
+TEST_F(ChannelTest, AHostRecordNamesItsBandFromVersion004On) {
+  const auto five = record(5), six = record(6), half = record(1.5), none = record({}), word = record("x");
+  const auto block = record(0, 100, 109, 20);
+  entry.ChannelZero(870e6);
+  EXPECT_TRUE(entry.channelUnits() && entry.channelChoose());
+  entry.ChannelSpacing(30e3);
+  EXPECT_EQ(plans(), "870000000/30000 0/1 -32");
+  EXPECT_EQ(entry.formatOffset(), 870e6);
+  EXPECT_EQ(entry.formatScale(), 30e3);
+  entry.ChannelZero(5e6, &five);
+  entry.ChannelSpacing(5e3, &five);
+  EXPECT_EQ(entry.FormatOffsetForRange(5), 5e6);
+  EXPECT_EQ(entry.FormatScaleForRange(5), 5e3);
+  EXPECT_EQ(entry.formatOffset(), 870e6);
+  for (const ListedRecords* bad : {&six, &half, &none, &word}) {
+    entry.ChannelZero(1, bad);
+    EXPECT_EQ(said(), "clsNumericEntryChannelZero() bad value for PARM_CHANNEL_ZERO::FIELD_ORDER\r");
+    entry.ChannelSpacing(1, bad);
+    EXPECT_EQ(said(), "clsNumericEntryChannelSpacing() bad value for PARM_CHANNEL_SPACING::FIELD_ORDER\r");
+  }
+  entry.ChannelDiscontinuity(7, &six);
+  EXPECT_EQ(said(), "clsNumericEntry::ChannelDiscontinuity()\rSubscript out of range");
+  entry.ChannelSpacing(0);
+  EXPECT_EQ(said(), "clsNumericEntry::ChannelSpacing() failed. \rDivision by zero");
+  EXPECT_EQ(plans(), "870000000/30000 0/1 -32");
+  hostDataVersion(0.03);
+  entry.ChannelZero(869.04e6, &six);
+  entry.ChannelDiscontinuity(0, &block);
+  EXPECT_EQ(plans(), "869040000/30000 0/1 0");
+  EXPECT_EQ(entry.formatter(869.64e6), "100");
+  entry.ChannelDiscontinuity(0);
+  EXPECT_EQ(entry.formatter(869.64e6), "20");
+  entry.ChannelDiscontinuity(1);
+  EXPECT_EQ(said(),
+            "clsNumericEntry::ChannelDiscontinuity()\rObject variable or With block variable not set");
+}
+
+TEST_F(ChannelTest, BlocksThatOverlapAreRefusedInAnyOrder) {
+  const std::string refused =
+      "clsNumericEntry::AddChannelDiscontinuity()\rInvalid procedure call or argument";
+  struct BlockCase {
+    ChannelDiscontinuity block;
+    bool taken;
+  };
+  const std::vector<BlockCase> cases = {
+      {{10, 110, 119}, true},  {{10, 110, 119}, true},   // the same once more
+      {{20, 120, 129}, true},  {{0, 100, 109}, true},    // neighbours, whatever their order
+      {{29, 200, 209}, false}, {{-9, 200, 209}, false},  // a channel in common
+      {{40, 91, 100}, false},  {{40, 129, 130}, false},  // a number in common
+      {{30, 5, 4}, false},     {{30, 5, 5}, true},
+  };
+  entry.ChannelSpacing(1e6);
+  entry.ChannelZero(870e6);
+  for (const BlockCase& c : cases) {
+    entry.AddChannelDiscontinuity(c.block.channel, c.block.minimum, c.block.maximum);
+    EXPECT_EQ(said(), c.taken ? "" : refused) << c.block.channel << " " << c.block.minimum;
+  }
+  EXPECT_EQ(entry.formatter(869e6) + entry.formatter(889e6) + entry.formatter(900e6), "-11195");
+  entry.AddChannelDiscontinuity(50, 1, HUGE_VAL);
+  EXPECT_EQ(said(), "clsNumericEntry::AddChannelDiscontinuity()\rOverflow");
+  entry.AddChannelDiscontinuity(50, 900, 901, 3);
+  EXPECT_EQ(said(), "clsNumericEntry::UpdateDiscontinuities() ... no range defined for step/discontinuity\r");
+}
+
+TEST_F(ChannelTest, OfEachTableTheRecordsOfTheChannelizationAreApplied) {
+  plan(9, "1", "2", 0, 500, 510);
+  plan(4, "870e6", "30000", -32, 991, 1023);
+  info.setChannelZero("5");  // order 0
+  const auto four = record(4);
+  info.setChannelZero("6", &four);  // of two for a band the first counts
+  lookup("7", 9, 9);
+  lookup("7", 4, 5);
+  EXPECT_EQ(info.channelZeros(), (std::vector<ChannelZero>{{9, 1}, {4, 870e6}, {0, 5}, {4, 6}}));
+
+  entry.channelChoose(true);
+  entry.AddChannelDiscontinuity(-5, 0, 1e9);
+  const std::string before = plans();
+  info.selectChannelization(8, entry);
+  EXPECT_EQ(said(), "clsChannelInfo::selectChannelization() ... could not find channelization lookup\r");
+  info.selectChannelSpacing(8, entry);
+  EXPECT_EQ(said(), "clsChannelInfo::selectChannelSpacing() ... could not find channelization lookup\r");
+  const auto wrong = [&](const char* id, std::int16_t number, double order, const char* problem) {
+    lookup(id, order, order + 9);
+    info.selectChannelization(number, entry);
+    EXPECT_EQ(said(), std::string("clsChannelInfo::selectChannelization()\r") + problem);
+    EXPECT_EQ(plans(), before);
+  };
+  plan(20, "1", "0", 0, 1, 2);
+  wrong("1", 1, 20, "Division by zero");
+  plan(40, "1", "1", 0, 1, 2);
+  plan(40, "1", "1", 1, 5, 6);
+  wrong("2", 2, 40, "Invalid procedure call or argument");
+  wrong("3", 3, 33, "Subscript out of range");
+
+  info.selectChannelSpacing(7, entry);
+  EXPECT_EQ(entry.FormatScaleForRange(0), 30e3);
+  EXPECT_EQ(entry.FormatOffsetForRange(0), 0);
+  info.selectChannelization(7, entry);
+  EXPECT_EQ(plans(), "870000000/30000 0/1 991");
+  EXPECT_EQ(said(), "");
+}
+
+TEST_F(ChannelTest, WhatIsNoNumberAddsNoRecordAndWhatIsNoneOfItsWidthIsReported) {
+  const auto bad = record(70000, 70000, 1), block = record(70000, 1, 2);
+  for (const char* text : {"", "x", "1,5", "1e400", "nan"}) {
+    info.setChannelZero(text, &bad);
+    info.setChannelSpacing(text, &bad);
+    info.setChannelDiscontinuity(text, &bad);
+    info.setChannelLookup(text, &bad);
+  }
+  EXPECT_EQ(said(), "");
+  info.setChannelZero("1", &bad);
+  info.setChannelSpacing("1", &bad);
+  info.setChannelDiscontinuity("1", &bad);
+  info.setChannelLookup("1", &bad);
+  info.setChannelLookup("1", nullptr);
+  EXPECT_EQ(
+      said(),
+      "clsChannelInfo::setChannelZero()\rOverflow\nclsChannelInfo::setChannelSpacing()\rOverflow\n"
+      "clsChannelInfo::setChannelDiscontinuity()\rOverflow\nclsChannelInfo::setChannelLookup()\rOverflow\n"
+      "clsChannelInfo::setChannelLookup()\rObject variable or With block variable not set");
+  EXPECT_TRUE(info.channelZeros().empty() && info.channelSpacings().empty() &&
+              info.channelDiscontinuities().empty() && info.channelLookups().empty());
+  hostDataVersion(0.03);
+  info.setChannelZero(" 1.5 ", &bad);
+  info.setChannelSpacing("2", &bad);
+  info.setChannelDiscontinuity("3", &block);
+  lookup("4", 1, 2);
+  EXPECT_EQ(info.channelZeros(), (std::vector<ChannelZero>{{0, 1.5}}));
+  EXPECT_EQ(info.channelSpacings(), (std::vector<ChannelSpacing>{{0, 2}}));
+  EXPECT_EQ(info.channelDiscontinuities(), (std::vector<OrderedDiscontinuity>{{0, {3, 1, 2}}}));
+  EXPECT_EQ(info.channelLookups(), (std::vector<ChannelLookup>{{4, 1, 2}}));
+  info.reinitialize();
+  EXPECT_TRUE(info.channelZeros().empty() && info.channelSpacings().empty() &&
+              info.channelDiscontinuities().empty() && info.channelLookups().empty());
+}
+
+}  // namespace
+}  // namespace frontpanels
