@@ -62,11 +62,7 @@ class ChannelTest : public testing::EntryFieldTest {
 };
 
 TEST_F(ChannelTest, EveryFrequencyHasAChannelAndEveryChannelItsFrequency) {
-  struct Pair {
-    double frequency;
-    const char* channel;
-  };
-  const std::vector<Pair> cases = {
+  const std::vector<std::pair<double, const char*>> cases = {
       {869.04e6, "991"},  // the block: position -32 of the plain numbering
       {869.055e6, "991.5"},  {869.07e6, "992"},    {869.97e6, "1022"},
       {870e6, "1023"},                            // where channel 0 would lie
@@ -78,24 +74,20 @@ TEST_F(ChannelTest, EveryFrequencyHasAChannelAndEveryChannelItsFrequency) {
   };
   selectCellular();
   entry.autoChoose(true);
-  for (const Pair& c : cases) {
-    entry.value(c.frequency);
-    EXPECT_EQ(box.Text(), c.channel);
-    entry.range(c.frequency < 1e9 ? 1 : 0);
-    entry.range(c.frequency < 1e9 ? 0 : 1);
-    EXPECT_EQ(entry.formatter(c.frequency), c.channel);
-    entry.valueNoUpdate(c.frequency < 1e9 ? 880.02e6 : 1980e6);
-    leave(c.channel);
-    EXPECT_NEAR(entry.value(), c.frequency, 1e-6) << c.channel;
-    EXPECT_TRUE(entry.validNumeric());
+  for (const auto& [frequency, channel] : cases) {
+    entry.value(frequency);
+    EXPECT_EQ(box.Text(), channel);
+    entry.valueNoUpdate(frequency < 1e9 ? 880.02e6 : 1980e6);
+    leave(channel);
+    EXPECT_NEAR(entry.value(), frequency, 1e-6) << channel;
   }
-  EXPECT_EQ(said(), "");
 }
 
 TEST_F(ChannelTest, ATextThatIsNoChannelIsRefused) {
   selectCellular();
   entry.value(870.03e6);
-  for (const char* text : {"0", "-5", "800", "900", "990", "1500", "1 k", "1 MHz", "1e300", "x", ""}) {
+  for (const char* text :
+       {"0", "-5", "800", "900", "990", "1024", "1500", "1 k", "1 MHz", "1e300", "x", ""}) {
     type(text);
     EXPECT_FALSE(entry.validNumeric()) << text;
     leave(text);
@@ -104,10 +96,10 @@ TEST_F(ChannelTest, ATextThatIsNoChannelIsRefused) {
     entry.GotFocus();
     EXPECT_TRUE(entry.validNumeric());
   }
-  leave("1024");  // beyond the block's numbers and beyond the limits
-  EXPECT_FALSE(entry.validNumeric());
   leave("799.5");  // its nearer half is within: the limit
   EXPECT_EQ(state(), "799.333333333333 = 893980000");
+  leave("990.6");
+  EXPECT_EQ(state(), "991 = 869040000");
   leave("1023.5");  // as 1023.4999 reads when it is rounded
   EXPECT_EQ(state(), "0.5 = 870015000");
   leave("1023");
@@ -125,6 +117,7 @@ TEST_F(ChannelTest, ATextThatIsNoChannelIsRefused) {
   EXPECT_EQ(state(), "870.06 MHz = 870060000");
   leave("871");
   entry.ChannelSpacing(30e3);  // the panel's choice stands
+  entry.reformat();
   EXPECT_EQ(state(), "871 MHz = 871000000");
   entry.channelChoose(true);
   EXPECT_EQ(box.Text(), "33.3333333333333");
@@ -140,15 +133,14 @@ TEST_F(ChannelTest, AHostRecordNamesItsBandFromVersion004On) {
   const auto block = record(0, 100, 109, 20);
   entry.ChannelZero(870e6);
   EXPECT_TRUE(entry.channelUnits() && entry.channelChoose());
+  entry.ChannelSpacing(25e3 / 3);
+  EXPECT_EQ(entry.formatter(870e6 + 7 * 25e3 / 3), "7");
   entry.ChannelSpacing(30e3);
-  EXPECT_EQ(plans(), "870000000/30000 0/1 -32");
-  EXPECT_EQ(entry.formatOffset(), 870e6);
-  EXPECT_EQ(entry.formatScale(), 30e3);
   entry.ChannelZero(5e6, &five);
   entry.ChannelSpacing(5e3, &five);
-  EXPECT_EQ(entry.FormatOffsetForRange(5), 5e6);
-  EXPECT_EQ(entry.FormatScaleForRange(5), 5e3);
-  EXPECT_EQ(entry.formatOffset(), 870e6);
+  EXPECT_EQ(numberToText(entry.FormatOffsetForRange(5)) + numberToText(entry.FormatScaleForRange(5)),
+            "50000005000");
+  EXPECT_EQ(numberToText(entry.formatOffset()) + numberToText(entry.formatScale()), "87000000030000");
   for (const ListedRecords* bad : {&six, &half, &none, &word}) {
     entry.ChannelZero(1, bad);
     EXPECT_EQ(said(), "clsNumericEntryChannelZero() bad value for PARM_CHANNEL_ZERO::FIELD_ORDER\r");
@@ -175,11 +167,7 @@ TEST_F(ChannelTest, AHostRecordNamesItsBandFromVersion004On) {
 TEST_F(ChannelTest, BlocksThatOverlapAreRefusedInAnyOrder) {
   const std::string refused =
       "clsNumericEntry::AddChannelDiscontinuity()\rInvalid procedure call or argument";
-  struct BlockCase {
-    ChannelDiscontinuity block;
-    bool taken;
-  };
-  const std::vector<BlockCase> cases = {
+  const std::vector<std::pair<ChannelDiscontinuity, bool>> cases = {
       {{10, 110, 119}, true},  {{10, 110, 119}, true},   // the same once more
       {{20, 120, 129}, true},  {{0, 100, 109}, true},    // neighbours, whatever their order
       {{29, 200, 209}, false}, {{-9, 200, 209}, false},  // a channel in common
@@ -188,9 +176,9 @@ TEST_F(ChannelTest, BlocksThatOverlapAreRefusedInAnyOrder) {
   };
   entry.ChannelSpacing(1e6);
   entry.ChannelZero(870e6);
-  for (const BlockCase& c : cases) {
-    entry.AddChannelDiscontinuity(c.block.channel, c.block.minimum, c.block.maximum);
-    EXPECT_EQ(said(), c.taken ? "" : refused) << c.block.channel << " " << c.block.minimum;
+  for (const auto& [block, taken] : cases) {
+    entry.AddChannelDiscontinuity(block.channel, block.minimum, block.maximum);
+    EXPECT_EQ(said(), taken ? "" : refused) << block.channel << " " << block.minimum;
   }
   EXPECT_EQ(entry.formatter(869e6) + entry.formatter(889e6) + entry.formatter(900e6), "-11195");
   entry.AddChannelDiscontinuity(50, 1, HUGE_VAL);
@@ -230,46 +218,43 @@ TEST_F(ChannelTest, OfEachTableTheRecordsOfTheChannelizationAreApplied) {
   wrong("3", 3, 33, "Subscript out of range");
 
   info.selectChannelSpacing(7, entry);
-  EXPECT_EQ(entry.FormatScaleForRange(0), 30e3);
-  EXPECT_EQ(entry.FormatOffsetForRange(0), 0);
+  EXPECT_EQ(plans().substr(0, 12), "0/30000 0/1 ");
   info.selectChannelization(7, entry);
   EXPECT_EQ(plans(), "870000000/30000 0/1 991");
   EXPECT_EQ(said(), "");
 }
 
 TEST_F(ChannelTest, WhatIsNoNumberAddsNoRecordAndWhatIsNoneOfItsWidthIsReported) {
-  const auto bad = record(70000, 70000, 1), block = record(70000, 1, 2);
-  for (const char* text : {"", "x", "1,5", "1e400", "nan"}) {
-    info.setChannelZero(text, &bad);
-    info.setChannelSpacing(text, &bad);
-    info.setChannelDiscontinuity(text, &bad);
-    info.setChannelLookup(text, &bad);
-  }
+  const auto wide = record(70000, 70000, 1), fit = record(70000, 1, 2);
+  const auto setAll = [&](const char* text, const HostRecordSet* set) {
+    info.setChannelZero(text, set);
+    info.setChannelSpacing(text, set);
+    info.setChannelDiscontinuity(text, set);
+    info.setChannelLookup(text, set);
+  };
+  const auto empty = [&] {
+    return info.channelZeros().empty() && info.channelSpacings().empty() &&
+           info.channelDiscontinuities().empty() && info.channelLookups().empty();
+  };
+  for (const char* text : {"", "x", "1,5", "1e400", "nan"}) setAll(text, &wide);
   EXPECT_EQ(said(), "");
-  info.setChannelZero("1", &bad);
-  info.setChannelSpacing("1", &bad);
-  info.setChannelDiscontinuity("1", &bad);
-  info.setChannelLookup("1", &bad);
+  setAll("1", &wide);
   info.setChannelLookup("1", nullptr);
   EXPECT_EQ(
       said(),
       "clsChannelInfo::setChannelZero()\rOverflow\nclsChannelInfo::setChannelSpacing()\rOverflow\n"
       "clsChannelInfo::setChannelDiscontinuity()\rOverflow\nclsChannelInfo::setChannelLookup()\rOverflow\n"
       "clsChannelInfo::setChannelLookup()\rObject variable or With block variable not set");
-  EXPECT_TRUE(info.channelZeros().empty() && info.channelSpacings().empty() &&
-              info.channelDiscontinuities().empty() && info.channelLookups().empty());
+  EXPECT_TRUE(empty());
+
   hostDataVersion(0.03);
-  info.setChannelZero(" 1.5 ", &bad);
-  info.setChannelSpacing("2", &bad);
-  info.setChannelDiscontinuity("3", &block);
-  lookup("4", 1, 2);
-  EXPECT_EQ(info.channelZeros(), (std::vector<ChannelZero>{{0, 1.5}}));
-  EXPECT_EQ(info.channelSpacings(), (std::vector<ChannelSpacing>{{0, 2}}));
-  EXPECT_EQ(info.channelDiscontinuities(), (std::vector<OrderedDiscontinuity>{{0, {3, 1, 2}}}));
+  setAll(" 3.5 ", &fit);  // an id is a whole number, halves to even
+  EXPECT_EQ(info.channelZeros(), (std::vector<ChannelZero>{{0, 3.5}}));
+  EXPECT_EQ(info.channelSpacings(), (std::vector<ChannelSpacing>{{0, 3.5}}));
+  EXPECT_EQ(info.channelDiscontinuities(), (std::vector<OrderedDiscontinuity>{{0, {3.5, 1, 2}}}));
   EXPECT_EQ(info.channelLookups(), (std::vector<ChannelLookup>{{4, 1, 2}}));
   info.reinitialize();
-  EXPECT_TRUE(info.channelZeros().empty() && info.channelSpacings().empty() &&
-              info.channelDiscontinuities().empty() && info.channelLookups().empty());
+  EXPECT_TRUE(empty());
 }
 
 }  // namespace
