@@ -34,6 +34,7 @@ class clsBaseVFP {
 
   // `child` is the panel control; both references must outlive the base.
   clsBaseVFP(const PanelEnvironment& environment, PanelControl& child);
+  ~clsBaseVFP() = default;
   clsBaseVFP(const clsBaseVFP&) = delete;
   clsBaseVFP& operator=(const clsBaseVFP&) = delete;
 
