@@ -23,6 +23,8 @@ class Field final : public ControlPeer {
     box.peer(this);
   }
   ~Field() override { box.peer(nullptr); }
+  Field(const Field&) = delete;
+  Field& operator=(const Field&) = delete;
 
   void type(std::string text) {
     box.focusChanged(true);
