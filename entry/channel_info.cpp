@@ -1,7 +1,6 @@
 #include "entry/channel_info.h"
 
 #include <algorithm>
-#include <ranges>
 #include <string>
 
 #include "entry/host_data_version.h"
@@ -119,28 +118,28 @@ void clsChannelInfo::selectChannelSpacing(std::int16_t id, clsNumericEntry& entr
 }
 
 const ChannelLookup* clsChannelInfo::lookup(std::string_view routine, std::int16_t id) const {
-  const auto backwards = std::views::reverse(lookups_);
-  const auto found = std::ranges::find(backwards, id, &ChannelLookup::id);
-  if (found != backwards.end()) return &*found;
+  const auto found = std::find_if(lookups_.rbegin(), lookups_.rend(),
+                                  [id](const ChannelLookup& record) { return record.id == id; });
+  if (found != lookups_.rend()) return &*found;
   errorHandler().Assert(named(routine, " ... could not find channelization lookup")());
   return nullptr;
 }
 
 clsChannelInfo::RangePlans clsChannelInfo::spacingsOf(const ChannelLookup& lookup) const {
   RangePlans plans;
-  for (const ChannelSpacing& record : std::views::reverse(spacings_)) {
-    const auto range = rangeOf(record.order, lookup);
+  for (auto record = spacings_.rbegin(); record != spacings_.rend(); ++record) {
+    const auto range = rangeOf(record->order, lookup);
     if (!range) continue;
-    if (record.spacing == 0) raiseDivisionByZero();
-    plans[*range].spacing = record.spacing;
+    if (record->spacing == 0) raiseDivisionByZero();
+    plans[*range].spacing = record->spacing;
   }
   return plans;
 }
 
 clsChannelInfo::RangePlans clsChannelInfo::plansOf(const ChannelLookup& lookup) const {
   RangePlans plans = spacingsOf(lookup);
-  for (const ChannelZero& record : std::views::reverse(zeros_))
-    if (const auto range = rangeOf(record.order, lookup)) plans[*range].zero = record.frequency;
+  for (auto record = zeros_.rbegin(); record != zeros_.rend(); ++record)
+    if (const auto range = rangeOf(record->order, lookup)) plans[*range].zero = record->frequency;
   for (const OrderedDiscontinuity& record : discontinuities_)
     if (const auto range = rangeOf(record.order, lookup)) {
       requireSeparate(record.block, plans[*range].discontinuities);

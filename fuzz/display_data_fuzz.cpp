@@ -18,16 +18,14 @@ constexpr std::int32_t kMeasurementId = 100;
 // The bits of the first byte.
 enum SetUp : std::uint8_t { kResourceKnown = 1, kTraceAdded = 2, kCursorGiven = 4, kTwice = 8 };
 
-// As a host that has, or has not, named its resource and added the trace.
+// As a host that has, or has not, named its resource and added the trace; once it is there, it stays.
 void setUp(SpectrumView& panel, std::uint8_t bits) {
   panel.vfpSet(kHardwareId, PARM_MEASUREMENT_ID, 0, kMeasurementId);
   panel.vfpSet(kHardwareId, PARM_RESOURCE_ID, 0, kHardwareId);
   panel.base().resourceIdValid((bits & kResourceKnown) != 0);
-  clsTraceManager& traces = panel.base().traceManager();
-  const bool there = traces.find(SpectrumView::kSpectrumResultType) != nullptr;
-  const bool wanted = (bits & kTraceAdded) != 0;
-  if (wanted && !there) panel.vfpOp(kHardwareId, kAddTraceOperation, kAddTraceOperation);
-  if (!wanted && there) traces.removeTraceObject(SpectrumView::kSpectrumResultType);
+  if ((bits & kTraceAdded) == 0) return;
+  if (panel.base().traceManager().find(SpectrumView::kSpectrumResultType) == nullptr)
+    panel.vfpOp(kHardwareId, kAddTraceOperation, kAddTraceOperation);
 }
 
 // Making a panel costs a hundred times what decoding does: one serves many inputs, until its life ends with
