@@ -67,7 +67,9 @@ void clsNumericEntry::setChannelField(const ChannelField& field, double value, c
     } else {
       inForce = value;
     }
-    (*ranges_.find(index)).*field.member = value;
+    EntryRange* const range = ranges_.find(index);
+    if (range == nullptr) raiseSubscriptOutOfRange();
+    range->*field.member = value;
     channelUnits(true);
   });
 }

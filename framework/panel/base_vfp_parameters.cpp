@@ -37,9 +37,9 @@ MarkerPointer findMarker(TraceObject& painter, const std::string& id) {
 // One row a code. A code whose value must be a number names the message for one that is none.
 struct clsBaseVFP::ParameterRow {
   enum class When : std::uint8_t { Always, OwnsWindow };
-  std::int16_t code;
-  const char* mustBeNumeric;
-  void (*apply)(clsBaseVFP& base, const Variant& value);
+  std::int16_t code = 0;
+  const char* mustBeNumeric = nullptr;
+  void (*apply)(clsBaseVFP& base, const Variant& value) = nullptr;
   When when = When::Always;
   const char* withoutTrace = nullptr;  // the message for a panel that has no active trace
 };
