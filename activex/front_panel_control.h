@@ -344,6 +344,11 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
   void mouseUp(const MouseEvent& e) override { base().MouseUp(e.button, e.shift, e.xTwips, e.yTwips); }
   void keyDown(std::int16_t keyCode, std::int16_t shift) override { base().KeyDown(keyCode, shift); }
 
+  void focusChanged(bool focused) override {
+    Dispatching<DualControl<Dual>, Dual>::focusChanged(focused);
+    if (focused) base().Activate();
+  }
+
   // --- PanelContainer: a container that keeps no such property goes without.
   void caption(std::string_view text) override { this->putExtended(L"Caption", std::string(text)); }
   void visible(bool visible) override { this->putExtended(L"Visible", visible); }

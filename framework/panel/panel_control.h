@@ -5,6 +5,7 @@
 #include <string>
 #include <string_view>
 
+#include "framework/panel/panel_host.h"
 #include "framework/panel/panel_settings.h"
 #include "platform/controls.h"
 #include "platform/result_reader.h"
@@ -40,7 +41,8 @@ struct FrontPanelLink {
   bool enable = false;
 };
 
-class PanelControl : public TraceForm {
+// Its base makes requests to the host through it.
+class PanelControl : public TraceForm, public PanelHost {
  public:
   // Entry points and what the base calls back. `base` is null unless the panel shows several measurements
   // through bases of their own; then it says which of them calls.
@@ -85,16 +87,6 @@ class PanelControl : public TraceForm {
   virtual void saveVfp() = 0;
   // The panel's own settings, behind the common ones.
   virtual void appendSettings(PanelSettings& settings) = 0;
-  // Requests to the host; each answer is a status.
-  virtual std::int32_t frontPanelOp(std::int32_t hwId, std::int32_t vfpId, std::int16_t operation,
-                                    const Variant& argument) = 0;
-  virtual std::int32_t frontPanelSet(std::int32_t hwId, std::int32_t vfpId, std::int16_t parameterType,
-                                     std::int16_t index, const Variant& value) = 0;
-  virtual std::int32_t saveDisplaySettings(std::int32_t hwId, std::int32_t vfpId,
-                                           const PanelSettings& settings) = 0;
-  virtual std::int32_t saveSetup(std::int32_t setUpId, std::int32_t resourceId, std::int32_t frontPanelId,
-                                 const PanelSettings& settings) = 0;
-
   // What a host asks of a panel as one of many.
   virtual void frontPanelLink(const FrontPanelLink& link) = 0;
   virtual std::int32_t measurementInfo(Variant& measurementTypes) = 0;
