@@ -31,6 +31,9 @@ HeadlessPanel::HeadlessPanel(const VerticalScale& scale)
   gdi_.fillRect(view_.hdc(), {0, 0, kGraph.width, kGraph.height},
                 gdi_.sysColorBrush(SystemColor::ButtonFace));
   panel_.Form_Resize();
+  // A picture has no use for fields: all of it is graph.
+  set(kRightPanelParameter, false);
+  set(kBottomPanelParameter, false);
   require(panel_.vfpOp(kHardwareId, kAddTraceOperation, kAddTraceOperation));
   set(kAutoScaleParameter, false);
   set(kVerticalResolutionParameter, scale.dbPerDivision);

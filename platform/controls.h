@@ -7,9 +7,12 @@
 #include <cstdint>
 #include <functional>
 #include <memory>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
+
+#include "platform/gdi.h"
 
 namespace frontpanels {
 
@@ -48,6 +51,7 @@ enum class ControlChange : std::uint8_t {
   Enabled,
   Visible,
   Font,
+  ForeColor,
   Place,
   Text,
   Selection,
@@ -104,11 +108,18 @@ class Control {
   void Bold(bool bold) { set(bold_, bold, ControlChange::Font); }
   [[nodiscard]] bool Italic() const noexcept { return italic_; }
   void Italic(bool italic) { set(italic_, italic, ControlChange::Font); }
+  // Of the caption; the system's colour for its kind while there is none.
+  [[nodiscard]] const std::optional<Color>& ForeColor() const noexcept { return foreColor_; }
+  void ForeColor(std::optional<Color> color) { set(foreColor_, color, ControlChange::ForeColor); }
   [[nodiscard]] const ControlPlace& place() const noexcept { return place_; }
   void Move(const ControlPlace& place) { set(place_, place, ControlChange::Place); }
 
   // The frame or picture that it lies in, null on the panel itself.
   [[nodiscard]] Control* parent() const noexcept { return parent_; }
+  // At any depth.
+  [[nodiscard]] bool liesIn(const Control& container) const noexcept {
+    return parent_ != nullptr && (parent_ == &container || parent_->liesIn(container));
+  }
   // Whether a user can reach it: it and all that it lies in are visible, and enabled.
   [[nodiscard]] bool reallyVisible() const noexcept;
   [[nodiscard]] bool reallyEnabled() const noexcept;
@@ -178,6 +189,7 @@ class Control {
   bool bold_ = false;
   bool italic_ = false;
   bool focused_ = false;
+  std::optional<Color> foreColor_;
   ControlPlace place_;
   ControlPeer* peer_ = nullptr;
   ControlScope* scope_ = nullptr;

@@ -7,11 +7,13 @@
 #include "framework/panel/base_vfp.h"
 #include "framework/panel/host_codes.h"
 #include "framework/panel/hosted_panel.h"
+#include "framework/panel/picture_area.h"
 #include "framework/panel/report_html.h"
 #include "framework/support/error_handler.h"
 #include "framework/support/guard.h"
 #include "painters/multi_trace_painter.h"
 #include "spectrum/frequency_plan.h"
+#include "spectrum/spectrum_controls.h"
 #include "traces/result_types.h"
 
 namespace frontpanels {
@@ -57,11 +59,12 @@ class SpectrumView::Implementation : public HostedPanel {
   }
   void resultData(std::int32_t resultTypeId, ResultReader& reader, clsBaseVFP* base) override;
   std::string typeName() override { return kTypeName; }
-  SideArea* displayPanel() override { return nullptr; }
-  SideArea* controlPanel() override { return nullptr; }
-  Control* MarkerToCenterButton() override { return nullptr; }
+  SideArea* displayPanel() override { return &displayPanel_; }
+  SideArea* controlPanel() override { return &controlPanel_; }
+  Control* MarkerToCenterButton() override { return &controls_.control("MarkerToCenterButton"); }
+  ControlSet* controls() override { return &controls_; }
   void evaluateEnablingMarkerToCenter() override {}
-  void Form_Resize() override { base_.Resize(); }
+  void Form_Resize() override;
   void refreshControls() override { refreshTraces(); }
   void refreshMenuItems() override { base_.refreshMenuItems(); }
   void closeVfp() override { base_.closeVfp(); }
@@ -94,6 +97,9 @@ class SpectrumView::Implementation : public HostedPanel {
   void adjustResolution();
   void refreshTraces();
 
+  ControlSet controls_{spectrumControls()};
+  PictureArea displayPanel_{controls_, controls_.picture("displayPanel")};
+  PictureArea controlPanel_{controls_, controls_.picture("controlPanel")};
   clsBaseVFP base_;
   FrequencyPlan plan_;
   std::array<float, kMaxPoints> liveTrace_{};
@@ -169,6 +175,16 @@ std::int32_t SpectrumView::Implementation::addTrace(const Variant& parameter) {
   if (!parameter.isNumeric() || parameter.toDouble() != kAddTraceOperation) return kStatusUnusableParameter;
   base_.traceManager().addTraceObject(std::make_shared<clsMultiTracePainter>(gdi()), kSpectrumResultType);
   return kStatusDone;
+}
+
+// The collapse buttons lie along the areas' inner edges, and at the view's edge where an area is hidden.
+void SpectrumView::Implementation::Form_Resize() {
+  base_.Resize();
+  const float right = InvisibleWidthMarkX1() - kCollapseButtonTwips;
+  const float bottom = InvisibleHeightMarkY1() - kCollapseButtonTwips;
+  controls_.control("MarkerFrameInvisibleButton").Move({right, 0, kCollapseButtonTwips, bottom});
+  controls_.control("MeasurementFrameInvisibleButton")
+      .Move({0, bottom, InvisibleWidthMarkX1(), kCollapseButtonTwips});
 }
 
 // --- Live data
@@ -413,7 +429,7 @@ void SpectrumView::PopUp_Click(std::int32_t subjectId, std::int32_t buttonId) {
 }
 
 std::string SpectrumView::Caption() { return base().Caption(); }
-void SpectrumView::Form_Resize() { base().Resize(); }
+void SpectrumView::Form_Resize() { implementation_->Form_Resize(); }
 void SpectrumView::Paint() { base().Paint(); }
 void SpectrumView::Activate() { base().Activate(); }
 

@@ -28,6 +28,8 @@ class SpectrumViewTest : public ReportingTest {
     panel = std::make_unique<SpectrumView>(PanelEnvironment{gdi, windowing, view, hub, {15, 15}, ""}, owner,
                                            owner);
     panel->Form_Resize();
+    panel->base().rightPanelVisible(false);
+    panel->base().bottomPanelVisible(false);
     gdi.clear();
   }
   ~SpectrumViewTest() override {
