@@ -4,10 +4,12 @@
 
 #include <cstdint>
 #include <string_view>
+#include <vector>
 
 #include "framework/panel/panel_control.h"
 #include "framework/panel/panel_environment.h"
 #include "framework/panel/panel_host.h"
+#include "framework/panel/pop_up_menu.h"
 #include "platform/control_set.h"
 
 namespace frontpanels {
@@ -78,6 +80,11 @@ class HostedPanel : public PanelControl {
 
   // The panel's fields; null when it has none.
   [[nodiscard]] virtual ControlSet* controls() { return nullptr; }
+
+  // The graph's context menu as it is to be shown now; no items for none. A click on an item that is not
+  // enabled does nothing.
+  [[nodiscard]] virtual std::vector<PanelMenuItem> contextMenu() { return {}; }
+  virtual void contextMenuClick(std::int16_t /*id*/) {}
 
   // Requests to the host
   std::int32_t frontPanelOp(std::int32_t hwId, std::int32_t vfpId, std::int16_t operation,

@@ -1,8 +1,10 @@
-// The pop-up menu belongs to the host; a panel decides which of its items are checked and enabled.
+// Menus of a panel. The pop-up menu belongs to the host; a panel decides which of its items are checked and
+// enabled. The context menu of its graph is the panel's own.
 #pragma once
 
 #include <cstdint>
 #include <map>
+#include <string>
 
 namespace frontpanels {
 
@@ -10,6 +12,15 @@ struct MenuItemState {
   bool checked = false;
   bool enabled = true;
   friend bool operator==(const MenuItemState&, const MenuItemState&) = default;
+};
+
+// One item of the context menu, in order.
+struct PanelMenuItem {
+  std::int16_t id = 0;
+  std::string caption;
+  bool checked = false;
+  bool enabled = true;
+  friend bool operator==(const PanelMenuItem&, const PanelMenuItem&) = default;
 };
 
 // A menu that wants to hear of each decision as it falls.
