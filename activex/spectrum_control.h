@@ -20,7 +20,7 @@ class SpectrumControl final : public FrontPanelControl<ISpectrumView> {
 
  private:
   [[nodiscard]] void* findInterface(REFIID id) noexcept override;
-  [[nodiscard]] HostedPanel& panel() override { return panel_->control(); }
+  [[nodiscard]] HostedPanel& panel() override { return *panel_; }
   [[nodiscard]] clsBaseVFP& base() override { return panel_->base(); }
 
   std::optional<SpectrumView> panel_;

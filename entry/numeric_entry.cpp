@@ -142,6 +142,11 @@ void clsNumericEntry::range(std::int32_t index) noexcept {
   });
 }
 
+bool clsNumericEntry::rangeDefined(std::int32_t index) const noexcept {
+  const EntryRange* const range = ranges_.find(index);
+  return range != nullptr && range->defined;
+}
+
 void clsNumericEntry::choose(std::int32_t index) noexcept {
   const EntryRange& range = *ranges_.find(index);
   range_ = index;
@@ -348,7 +353,18 @@ double clsNumericEntry::shownScale(double value) const noexcept {
 }
 
 void clsNumericEntry::append(std::string& text, double value, std::string_view format, bool withUnit) const {
-  double shown = shownNumber(value);
+  appendShown(text, shownNumber(value), format, withUnit);
+}
+
+void clsNumericEntry::appendDifference(std::string& text, double difference, std::string_view format,
+                                       bool withUnit) const {
+  const double scale = display().scale;
+  if (scale == 0) raiseDivisionByZero();
+  appendShown(text, difference / scale, format, withUnit);
+}
+
+void clsNumericEntry::appendShown(std::string& text, double shown, std::string_view format,
+                                  bool withUnit) const {
   const SuffixRecord* const unit = shownSuffixes().find(shown);
   if (unit != nullptr) {
     if (unit->scale == 0) raiseDivisionByZero();

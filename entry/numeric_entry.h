@@ -79,6 +79,9 @@ class clsNumericEntry {
   [[nodiscard]] std::int32_t range() const noexcept { return range_; }
   void range(std::int32_t index) noexcept;
 
+  // Whether a range has limits of its own.
+  [[nodiscard]] bool rangeDefined(std::int32_t index) const noexcept;
+
   // The fields of one range, 0 to 6, whether or not it is the chosen one: what is in force stays until a
   // range is chosen. A limit that is written defines the range.
   [[nodiscard]] double MinimumForRange(std::int32_t index) const noexcept;
@@ -176,6 +179,9 @@ class clsNumericEntry {
   // Appends the text of a value by a number format of the caller's. Raises "Division by zero" for a scale of
   // 0 and what appendNumber raises; `text` is then as it was.
   void append(std::string& text, double value, std::string_view format, bool withUnit) const;
+  // The same of the difference of two values: the display offset cancels out of it, and between channels it
+  // is a number of channels.
+  void appendDifference(std::string& text, double difference, std::string_view format, bool withUnit) const;
   // How many units of the value make one of what is shown: the scale times that of the unit chosen for
   // `value`.
   [[nodiscard]] double shownScale(double value) const noexcept;
@@ -321,6 +327,7 @@ class clsNumericEntry {
 
   template <class Body>
   void onEvent(const char* message, Body body) noexcept;
+  void appendShown(std::string& text, double shown, std::string_view format, bool withUnit) const;
   void click(const char* message, StepDirection direction) noexcept;
   // Commits a text while the box keeps the focus.
   void takeOver(const std::string& typed, bool& changed);

@@ -123,7 +123,7 @@ void addTraceObject(PanelUnderTest& test, FuzzInput& input) {
 }
 
 void setSurface(PanelUnderTest& test, FuzzInput& input) {
-  HostedPanel& surface = test.panel().control();
+  HostedPanel& surface = test.panel();
   const auto value = input.number<std::int16_t>();
   try {
     surface.ViewDrawWidth(value);

@@ -9,11 +9,13 @@ namespace {
 
 constexpr std::string_view kGap = "  ";
 
+std::string_view xFormat(double value, const ReadoutFormat& format) {
+  return !format.xMarkerFormat.empty() ? format.xMarkerFormat
+                                       : formatNoFinerThan(format.pointSpacing / format.x.shownScale(value));
+}
+
 void appendX(std::string& text, double value, const ReadoutFormat& format) {
-  const std::string_view numberFormat =
-      !format.xMarkerFormat.empty() ? format.xMarkerFormat
-                                    : formatNoFinerThan(format.pointSpacing / format.x.shownScale(value));
-  format.x.append(text, value, numberFormat, true);
+  format.x.append(text, value, xFormat(value, format), true);
 }
 
 constexpr std::string_view kNoLevel = "---";
@@ -26,8 +28,7 @@ void appendY(std::string& text, double level, const ReadoutFormat& format) {
   }
 }
 
-// A difference is shown with its sign, in the unit that its size calls for; the display offset of the axis
-// cancels out of it.
+// A difference is shown with its sign, in the unit that its size calls for.
 char signOf(double difference) { return difference < 0 ? '-' : '+'; }
 
 }  // namespace
@@ -56,7 +57,8 @@ void appendDeltaReadout(std::string& text, const clsMarker& delta, const clsMark
   const double x = delta.valueX - partner.valueX;
   const double y = delta.valueY - partner.valueY;
   ((text += delta.id) += kGap) += signOf(x);
-  appendX(text, std::fabs(x) + format.x.formatOffset(), format);
+  format.x.appendDifference(text, std::fabs(x), xFormat(std::fabs(x) + format.x.formatOffset(), format),
+                            true);
   text += kGap;
   if (std::isfinite(y)) text += signOf(y);
   appendY(text, std::fabs(y) + format.y.formatOffset(), format);

@@ -451,7 +451,8 @@ void clsMultiTracePainter::writeXLabel(LabelPlace place, double value) {
 void clsMultiTracePainter::writeDivisionLabel(LabelPlace place) {
   text_.clear();
   if (numberOfHorizontalDivisions_ > 0) {
-    xAxisFormatter_.formatter((xStop_ - xStart_) / numberOfHorizontalDivisions_, text_);
+    xAxisFormatter_.appendDifference(text_, (xStop_ - xStart_) / numberOfHorizontalDivisions_,
+                                     xAxisFormatter_.formatString(), !xAxisFormatter_.suppressSuffix());
     text_ += "/div";
   }
   labels_.text(place, text_);

@@ -82,6 +82,8 @@ class clsMultiTracePainter : public TraceObject {
   [[nodiscard]] double traceValue(std::int16_t index) const;
   [[nodiscard]] std::int16_t pnOffset(std::int16_t index) const override;
   void pnOffset(std::int16_t index, std::int16_t pn);
+  // The id by which a trace is named, whatever its index. Raises "Subscript out of range".
+  [[nodiscard]] std::int16_t traceId(std::int16_t index) const { return traces_.slot(index).traceId; }
   [[nodiscard]] TraceOrientation traceOrientation(std::int16_t index) const;
   void traceOrientation(std::int16_t index, TraceOrientation orientation);
   // Trace ids, the least recently used first; the same ids may be given another order.

@@ -7,6 +7,9 @@ namespace frontpanels {
 
 // Operations of `vfpOp`.
 inline constexpr std::int16_t QUILL_VFP_CLOSE = 1;
+inline constexpr std::int16_t kSingleSweepOperation = 2;  // these three go from the panel to the host
+inline constexpr std::int16_t kContinuousSweepOperation = 3;
+inline constexpr std::int16_t kStopSweepOperation = 4;
 inline constexpr std::int16_t QUILL_VFP_SAVE = 9;
 inline constexpr std::int16_t kAddTraceOperation = 10;
 inline constexpr std::int16_t kRemoveTraceOperation = 11;
@@ -29,13 +32,19 @@ inline constexpr std::int16_t kBottomPanelItem = 901;
 // Parameter types of `vfpSet`.
 inline constexpr std::int16_t kCenterFrequencyParameter = 13;
 inline constexpr std::int16_t kSpanParameter = 14;
+inline constexpr std::int16_t kRbwParameter = 16;
+inline constexpr std::int16_t kIfBandwidthParameter = 17;  // 1 narrow
 inline constexpr std::int16_t TIME_MEASUREMENT_PERIOD = 43;
 inline constexpr std::int16_t TIME_DATABASE_PERIOD = 44;
 inline constexpr std::int16_t TIME_DISPLAY_PERIOD = 45;
+inline constexpr std::int16_t kDisplayLengthParameter = 94;
 inline constexpr std::int16_t PARM_MEASUREMENT_ID = 312;
 inline constexpr std::int16_t kCaptionParameter = 314;
 inline constexpr std::int16_t PARM_RESOURCE_ID = 315;
 inline constexpr std::int16_t PARM_LOGGING_FLAG = 322;
+inline constexpr std::int16_t kChannelizationParameter = 333;
+inline constexpr std::int16_t kAverageTypeParameter = 500;
+inline constexpr std::int16_t kAverageCountParameter = 502;
 inline constexpr std::int16_t kLeftParameter = 700;
 inline constexpr std::int16_t kTopParameter = 701;
 inline constexpr std::int16_t kWidthParameter = 702;
@@ -58,8 +67,12 @@ inline constexpr std::int16_t kMarkerFlagParameter = 741;
 inline constexpr std::int16_t kActiveMarkerParameter = 742;
 inline constexpr std::int16_t kAttachMarkerParameter = 743;
 inline constexpr std::int16_t kMarkerValueParameter = 744;
+inline constexpr std::int16_t kUnitsParameter = 750;  // 0 channels, else frequencies
 inline constexpr std::int16_t kCellNamingParameter = 799;
+inline constexpr std::int16_t kDistanceIntervalParameter = 803;
+inline constexpr std::int16_t kIntervalKindParameter = 804;  // 0 distance, else time
 inline constexpr std::int16_t kSavedParameter = 810;
+inline constexpr std::int16_t kAverageAsLogPowerParameter = 3900;  // 0 power, else log power
 
 // Answers of the entry points.
 inline constexpr std::int32_t kStatusDone = 0;

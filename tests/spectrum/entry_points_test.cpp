@@ -84,9 +84,10 @@ class EntryPointsTest : public ReportingTest {
 };
 
 TEST_F(EntryPointsTest, ListedCodesTakeEveryKindOfValueAndAFailureChangesNothing) {
-  const std::vector<std::int16_t> codes = {
-      9,   10,  11,  12,  13,  14,  15,  16,  18,  21,  43,  44,  45,  312, 314, 315, 322, 700, 701, 702, 703,
-      704, 705, 706, 714, 716, 717, 719, 722, 726, 727, 735, 736, 737, 740, 741, 742, 743, 744, 799, 810};
+  const std::vector<std::int16_t> codes = {9,   10,  11,  12,  13,  14,  15,  16,  17,  18,  21,  43,  44,
+                                           45,  312, 314, 315, 322, 700, 701, 702, 703, 704, 705, 706, 714,
+                                           716, 717, 719, 722, 726, 727, 735, 736, 737, 740, 741, 742, 743,
+                                           744, 799, 810, 94,  333, 500, 502, 750, 803, 804, 3900};
   int failures = 0;
   for (const Entry entry : {&EntryPointsTest::vfpSet, &EntryPointsTest::displayParameter,
                             &EntryPointsTest::baseVfpSet, &EntryPointsTest::vfpOp}) {
@@ -110,7 +111,8 @@ TEST_F(EntryPointsTest, ListedCodesTakeEveryKindOfValueAndAFailureChangesNothing
 TEST_F(EntryPointsTest, EveryOtherCodeAnswersAndChangesNothing) {
   const auto listed = [](int code) {
     return (code >= 9 && code <= 21) || (code >= 43 && code <= 45) || (code >= 312 && code <= 322) ||
-           (code >= 700 && code <= 810);
+           code == 94 || code == 333 || code == 500 || code == 502 || (code >= 700 && code <= 810) ||
+           code == 3900;
   };
   const std::string before = state();
   for (int code = -32768; code <= 32767; ++code) {

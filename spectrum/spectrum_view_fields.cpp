@@ -1,0 +1,292 @@
+// SpectrumView towards its user: what each field does when its value has been changed.
+#include <iterator>
+
+#include "framework/panel/host_codes.h"
+#include "framework/support/enumerated_tables.h"
+#include "framework/support/error_handler.h"
+#include "framework/support/flag_scope.h"
+#include "framework/support/guard.h"
+#include "spectrum/spectrum_view.h"
+
+namespace frontpanels {
+namespace {
+
+constexpr std::int32_t kDownlinkRange = 0;
+constexpr std::int32_t kUplinkRange = 1;
+
+std::string named(std::string_view routine) { return std::string("SpectrumView::").append(routine); }
+
+}  // namespace
+
+// --- Fields to handlers
+
+// An option of a pair: the code and value that it stands for, and what it changes on the panel itself.
+struct SpectrumView::OptionRow {
+  const char* name;
+  const char* routine;
+  std::int16_t parameterType;
+  double value;
+  Handler apply;
+};
+
+const SpectrumView::OptionRow SpectrumView::kOptions[] = {
+    {"FrequencyOption", "FrequencyOption_Click()", kUnitsParameter, 1, &SpectrumView::applyUnits},
+    {"ChannelOption", "ChannelOption_Click()", kUnitsParameter, 0, &SpectrumView::applyUnits},
+    {"IntervalTimeOption", "IntervalTimeOption_Click()", kIntervalKindParameter, 1,
+     &SpectrumView::applyInterval},
+    {"IntervalDistanceOption", "IntervalDistanceOption_Click()", kIntervalKindParameter, 0,
+     &SpectrumView::applyInterval},
+    {"LogPwrOption", "LogPwrOption_Click()", kAverageAsLogPowerParameter, 1, nullptr},
+    {"LinPowerOption", "LinPowerOption_Click()", kAverageAsLogPowerParameter, 0, nullptr},
+    {"WidebandOption", "WidebandOption_Click()", kIfBandwidthParameter, 0, nullptr},
+    {"NarrowbandOption", "NarrowbandOption_Click()", kIfBandwidthParameter, kNarrowbandFilter, nullptr},
+};
+
+void SpectrumView::bindFields() {
+  bindEntries();
+  bindButtons();
+  ControlSet& controls = fields_.controls;
+  for (const OptionRow& row : kOptions)
+    controls.optionButton(row.name).Click = [this, &row] {
+      if (!base_.closing()) optionClick(row);
+    };
+  controls.optionButton("DownlinkOption").Click = [this] {
+    if (!base_.closing()) bandClick("DownlinkOption_Click()", kDownlinkRange);
+  };
+  controls.optionButton("UplinkOption").Click = [this] {
+    if (!base_.closing()) bandClick("UplinkOption_Click()", kUplinkRange);
+  };
+}
+
+std::function<void()> SpectrumView::whileOpen(Handler handler) {
+  return [this, handler] {
+    if (!base_.closing()) (this->*handler)();
+  };
+}
+
+// In the order of SpectrumFields::entryFields.
+void SpectrumView::bindEntries() {
+  constexpr Handler kHandlers[] = {
+      &SpectrumView::newCenterFrequency, &SpectrumView::newFrequencySpan, &SpectrumView::newFrequencyRbw,
+      &SpectrumView::newStartFrequency,  &SpectrumView::newStopFrequency, &SpectrumView::newAverageCount,
+      &SpectrumView::newDisplayLength,   &SpectrumView::newSweepRate,     &SpectrumView::newVerticalScale,
+      &SpectrumView::newVerticalOffset,
+  };
+  const Handler* handler = std::begin(kHandlers);
+  for (const SpectrumFields::EntryField& field : SpectrumFields::entryFields())
+    fields_.bind(field, whileOpen(*handler++));
+  fields_.controls.list("AverageTypeCombo").Click = whileOpen(&SpectrumView::newAverageType);
+  fields_.controls.list("ChannelizationCombo").Click = whileOpen(&SpectrumView::newChannelization);
+}
+
+void SpectrumView::bindButtons() {
+  struct ButtonRow {
+    const char* name;
+    Handler click;
+  };
+  constexpr ButtonRow kButtons[] = {
+      {"CloseButton", &SpectrumView::closeVfp},
+      {"SingleSweepButton", &SpectrumView::SingleSweepButton_Click},
+      {"ContinuousSweepButton", &SpectrumView::ContinuousSweepButton_Click},
+      {"StopSweepButton", &SpectrumView::StopSweepButton_Click},
+      {"MeasurementFrameInvisibleButton", &SpectrumView::toggleMeasurementArea},
+      {"AutoScaleBox", &SpectrumView::AutoScaleBox_Click},
+      {"MarkerAddButton", &SpectrumView::addMarker},
+      {"MarkerDeleteButton", &SpectrumView::deleteMarker},
+      {"MarkerToMaxButton", &SpectrumView::markerToMax},
+      {"MarkerDeltaButton", &SpectrumView::addDeltaMarker},
+      {"MarkerToCenterButton", &SpectrumView::markerToCenter},
+      {"MarkerFrameInvisibleButton", &SpectrumView::toggleDisplayArea},
+  };
+  for (const ButtonRow& row : kButtons) fields_.controls.control(row.name).Click = whileOpen(row.click);
+}
+
+// --- Requests
+
+bool SpectrumView::accepted(std::string_view routine, std::int32_t status) {
+  if (status == kStatusDone) return true;
+  errorHandler().ReportError(named(routine) + " status = " + std::to_string(status));
+  return false;
+}
+
+bool SpectrumView::request(std::string_view routine, std::int16_t parameterType, double value) {
+  return accepted(routine,
+                  frontPanelSet(base_.resourceId(), base_.virtualFrontPanelId, parameterType, 0, value));
+}
+
+void SpectrumView::operate(std::string_view routine, std::int16_t operation) {
+  guard(
+      [routine] { return named(routine); },
+      [&] { accepted(routine, frontPanelOp(base_.resourceId(), base_.virtualFrontPanelId, operation, {})); });
+}
+
+void SpectrumView::SingleSweepButton_Click() { operate("SingleSweepButton_Click()", kSingleSweepOperation); }
+void SpectrumView::StopSweepButton_Click() { operate("StopSweepButton_Click()", kStopSweepOperation); }
+void SpectrumView::ContinuousSweepButton_Click() {
+  operate("ContinuousSweepButton_Click()", kContinuousSweepOperation);
+}
+
+// --- Frequencies
+
+void SpectrumView::newCenterFrequency() {
+  if (updateInProgress_) return;
+  const FlagScope inProgress(updateInProgress_);
+  guard("SpectrumView::newCenterFrequency()", [this] {
+    showBand();
+    fields_.frequency.fitCenter();
+    updateXAxisLabels();
+    request("newCenterFrequency()", kCenterFrequencyParameter, fields_.frequency.center.value());
+  });
+}
+
+// A host that is told of the span alone would tune past the limit that the centre has given way to.
+void SpectrumView::newFrequencySpan() {
+  if (updateInProgress_) return;
+  const FlagScope inProgress(updateInProgress_);
+  guard("SpectrumView::newFrequencySpan()", [this] {
+    FrequencyEntries& frequency = fields_.frequency;
+    const double centerHz = frequency.center.value();
+    frequency.setSpan(frequency.span.value());
+    updateXAxisLabels();
+    adjustResolution();
+    const bool moved = frequency.center.value() != centerHz;
+    if (moved && !request("newFrequencySpan()", kCenterFrequencyParameter, frequency.center.value())) return;
+    request("newFrequencySpan()", kSpanParameter, frequency.span.value());
+  });
+}
+
+void SpectrumView::newStartStopFrequency(bool startChanged) {
+  if (updateInProgress_) return;
+  const FlagScope inProgress(updateInProgress_);
+  guard("SpectrumView::newStartStopFrequency()", [&] {
+    FrequencyEntries& frequency = fields_.frequency;
+    frequency.joinEdges(startChanged);
+    showBand();
+    updateXAxisLabels();
+    adjustResolution();
+    // What the host answers to the first request must not change the second one.
+    const double spanHz = frequency.span.value();
+    if (request("newStartStopFrequency()", kCenterFrequencyParameter, frequency.center.value()))
+      request("newStartStopFrequency()", kSpanParameter, spanHz);
+  });
+}
+
+void SpectrumView::bandClick(std::string_view routine, std::int32_t range) {
+  if (optionChangeInProgress_) return;
+  const FlagScope inProgress(updateInProgress_);
+  guard([routine] { return named(routine); },
+        [&] {
+          fields_.frequency.setBand(range);
+          updateXAxisLabels();
+          request(routine, kCenterFrequencyParameter, fields_.frequency.center.value());
+        });
+}
+
+// --- The other entries and lists
+
+void SpectrumView::newFrequencyRbw() {
+  guard("SpectrumView::newFrequencyRbw()",
+        [this] { request("newFrequencyRbw()", kRbwParameter, fields_.frequencyRbw.value()); });
+}
+
+void SpectrumView::newAverageCount() {
+  guard("SpectrumView::newAverageCount()",
+        [this] { request("newAverageCount()", kAverageCountParameter, fields_.averageCount.value()); });
+}
+
+void SpectrumView::newDisplayLength() {
+  guard("SpectrumView::newDisplayLength()",
+        [this] { request("newDisplayLength()", kDisplayLengthParameter, fields_.displayLength.value()); });
+}
+
+void SpectrumView::newSweepRate() {
+  guard("SpectrumView::newSweepRate()", [this] {
+    const double value = fields_.sweepRate.value();
+    if (fields_.interval() == MeasurementInterval::Time) {
+      base_.measurementPeriod = value;
+      request("newSweepRate()", TIME_MEASUREMENT_PERIOD, value);
+    } else {
+      distanceIntervalM_ = value;
+      request("newSweepRate()", kDistanceIntervalParameter, value);
+    }
+  });
+}
+
+void SpectrumView::newAverageType() {
+  fields_.averageType.Click();
+  if (optionChangeInProgress_ || !fields_.averageType.newValue()) return;
+  guard("SpectrumView::newAverageType()", [this] {
+    fields_.averageCount.Enabled(fields_.averageType.value() != kAveragingOff);
+    request("newAverageType()", kAverageTypeParameter, fields_.averageType.value());
+  });
+}
+
+void SpectrumView::newChannelization() {
+  fields_.channelization.Click();
+  if (optionChangeInProgress_ || !fields_.channelization.newValue()) return;
+  ChannelizationCombo_Change();
+  guard("SpectrumView::ChannelizationCombo_Change()", [this] {
+    request("ChannelizationCombo_Change()", kChannelizationParameter, fields_.channelization.value());
+  });
+}
+
+// --- Options
+
+void SpectrumView::optionClick(const OptionRow& row) {
+  guard([&row] { return named(row.routine); },
+        [&] {
+          if (row.apply != nullptr) (this->*row.apply)();
+          if (!optionChangeInProgress_) request(row.routine, row.parameterType, row.value);
+        });
+}
+
+void SpectrumView::applyUnits() {
+  if (fields_.controls.optionButton("ChannelOption").Value()) return ChannelizationCombo_Change();
+  fields_.frequency.showFrequencies();
+  updateXAxisLabels();
+}
+
+void SpectrumView::applyInterval() { fields_.showInterval(fields_.interval(), intervalValue()); }
+
+void SpectrumView::ChannelizationCombo_Change() {
+  if (base_.closing()) return;
+  guard("SpectrumView::ChannelizationCombo_Change()", [this] {
+    if (!fields_.controls.optionButton("ChannelOption").Value()) return;
+    if (!fields_.frequency.showChannels(fields_.channels, fields_.channelization.value()))
+      fields_.frequency.showFrequencies();
+    updateXAxisLabels();
+  });
+}
+
+// --- Vertical axis
+
+void SpectrumView::newVerticalScale() {
+  guard("SpectrumView::newVerticalScale()", [this] {
+    const double perDivision = fields_.verticalScale.value();
+    if (!(perDivision > 0))
+      return errorHandler().Assert("SpectrumView::newVerticalScale() ... illegal value");
+    if (clsMultiTracePainter* const painter = activePainter()) painter->setDbPerDivision(perDivision);
+    refreshTraces();
+  });
+}
+
+void SpectrumView::newVerticalOffset() {
+  guard("SpectrumView::newVerticalOffset()", [this] {
+    if (clsMultiTracePainter* const painter = activePainter())
+      painter->gridScaleTop(fields_.verticalOffset.value());
+    refreshTraces();
+  });
+}
+
+void SpectrumView::AutoScaleBox_Click() {
+  if (optionChangeInProgress_) return;
+  guard("SpectrumView::AutoScaleBox_Click()", [this] {
+    clsMultiTracePainter* const painter = activePainter();
+    if (painter == nullptr) return;
+    painter->setAutoScale(fields_.controls.checkBox("AutoScaleBox").Value() != 0);
+    refreshTraces();
+    showVerticalAxis();
+  });
+}
+
+}  // namespace frontpanels

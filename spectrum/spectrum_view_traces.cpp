@@ -1,0 +1,272 @@
+// SpectrumView and its traces: live data, axes, markers.
+#include <algorithm>
+
+#include "framework/support/error_handler.h"
+#include "framework/support/flag_scope.h"
+#include "framework/support/guard.h"
+#include "spectrum/spectrum_view.h"
+#include "traces/result_types.h"
+
+namespace frontpanels {
+namespace {
+
+// Room round the plot for its labels, in twips: a level of six characters at the left, a row of text above
+// and below.
+constexpr float kInsetLeftTwips = 720;
+constexpr float kInsetTopTwips = 360;
+constexpr float kInsetRightTwips = 180;
+constexpr float kInsetBottomTwips = 315;
+
+}  // namespace
+
+// --- Data
+
+void SpectrumView::DFISpectrum_DataChanged(std::int32_t index) {
+  if (base_.closing()) return;
+  guard("SpectrumView::DfiSpectrum_DataChanged()", [&] {
+    const std::size_t points = readSweep(index);
+    showSweep(findOrAddPainter(), std::span(liveTrace_).first(points));
+    refreshTraces();
+  });
+}
+
+void SpectrumView::resultData(std::int32_t resultTypeId, ResultReader& reader, clsBaseVFP* /*base*/) {
+  if (resultTypeId != kSpectrumResultType) return;
+  guard("SpectrumView::resultData()", [&] {
+    const std::size_t points = reader.GetFloat32Array(liveTrace_);
+    showSweep(findOrAddPainter(), std::span(liveTrace_).first(points));
+    refreshTraces();
+  });
+}
+
+// Fills the live-trace buffer; a point that it has no room for is an array-bounds error, and the picture
+// stays.
+std::size_t SpectrumView::readSweep(std::int32_t index) {
+  const auto points = static_cast<std::size_t>(DFISpectrum_.itemCount(index));
+  if (points > liveTrace_.size()) raiseSubscriptOutOfRange();
+  const std::span<const float> singles = DFISpectrum_.singles(index);
+  if (singles.size() == points) {
+    std::copy(singles.begin(), singles.end(), liveTrace_.begin());
+    return points;
+  }
+  for (std::size_t item = 0; item < points; ++item)
+    liveTrace_[item] = DFISpectrum_.singleValue(index, static_cast<std::int32_t>(item));
+  return points;
+}
+
+// A marker keeps its point; where there is another number of points it keeps its frequency as well as it can.
+void SpectrumView::showSweep(clsMultiTracePainter& painter, std::span<const float> levels) {
+  const auto points = static_cast<std::int32_t>(levels.size());
+  const bool otherPoints = points != painter.numberOfMeasurements();
+  painter.numberOfMeasurements(points);
+  painter.dataChanged(true);
+  painter.span(fields_.frequency.span.value());
+  painter.trace(levels);
+  painter.traceSize(points);
+  painter.offset(0);
+  if (otherPoints && points > 1 && painter.span() != 0) painter.ResetMarkers();
+}
+
+clsMultiTracePainter* SpectrumView::findPainter() {
+  return dynamic_cast<clsMultiTracePainter*>(base_.traceManager().find(kSpectrumResultType));
+}
+
+clsMultiTracePainter* SpectrumView::activePainter() {
+  return dynamic_cast<clsMultiTracePainter*>(base_.traceManager().activeTrace());
+}
+
+clsMultiTracePainter& SpectrumView::findOrAddPainter() {
+  if (findPainter() == nullptr)
+    base_.traceManager().addTraceObject(std::make_shared<clsMultiTracePainter>(gdi()), kSpectrumResultType);
+  clsMultiTracePainter* const painter = findPainter();
+  if (painter == nullptr) raiseObjectVariableNotSet();
+  return *painter;
+}
+
+void SpectrumView::refreshTraces() {
+  guard("SpectrumView::refreshTraces()", [this] {
+    if (!view().visible()) return;
+    base_.traceManager().paintTraces(true);
+    followAutoScale();
+  });
+}
+
+// --- Traces and axes
+
+void SpectrumView::changedTraceConfiguration(TraceState state, TraceObject* activeTrace,
+                                             std::int16_t resultType) {
+  const auto fail = [](const char* what) {
+    errorHandler().Assert(std::string("SpectrumView::changedTraceConfiguration() failed ... ") + what);
+  };
+  guard("SpectrumView::changedTraceConfiguration() failed ... ", [&] {
+    updateMarkerButtons();
+    evaluateEnablingMarkerToCenter();
+    if (state == TraceState::Removed) return;
+    if (state != TraceState::Added) return fail("unrecognized trace state");
+    if (resultType == 0) return fail("missing result type");
+    if (activeTrace == nullptr) return fail("null trace");
+    if (resultType != kSpectrumResultType)
+      return fail(isKnownResultType(resultType) ? "unhandled result type" : "unrecognized result type");
+    setUpTrace(dynamic_cast<clsMultiTracePainter&>(*activeTrace));
+  });
+}
+
+void SpectrumView::setUpTrace(clsMultiTracePainter& painter) {
+  painter.yAxisFormatter().Clear();
+  painter.yAxisFormatter().dBmSuffix();
+  painter.yAxisFormatter().suppressSuffix(true);
+  painter.autoFormatX(true);
+  painter.autoFormatY(true);
+  painter.verticalResolution(fields_.verticalScale.value());
+  painter.gridScaleTop(fields_.verticalOffset.value());
+  painter.setAutoScale(fields_.controls.checkBox("AutoScaleBox").Value() != 0);
+  painter.yAxisLabel("dBm");
+  painter.gridScaleLeft(kInsetLeftTwips / metrics().twipsPerPixelX);
+  painter.gridInsetTop(kInsetTopTwips / metrics().twipsPerPixelY);
+  painter.gridScaleRight(kInsetRightTwips / metrics().twipsPerPixelX);
+  painter.gridScaleBottom(kInsetBottomTwips / metrics().twipsPerPixelY);
+  updateXAxisLabels();
+}
+
+// The axis reads as the centre entry does: in the same channels or units.
+void SpectrumView::formatXAxis(clsMultiTracePainter& painter) {
+  clsNumericEntry& formatter = painter.xAxisFormatter();
+  const clsNumericEntry& center = fields_.frequency.center;
+  const bool channels = center.channelChoose();
+  formatter.Clear();
+  formatter.frequencySuffix();
+  formatter.formatString(axisFormatForSpan(fields_.frequency.span.value()));
+  if (channels) {
+    formatter.CopyLimits(center);
+    fields_.channels.selectChannelization(fields_.channelization.value(), formatter);
+  }
+  formatter.channelChoose(channels);
+}
+
+void SpectrumView::updateXAxisLabels() {
+  guard("SpectrumView::updateXAxisLabels()...", [this] {
+    clsMultiTracePainter* const painter = findPainter();
+    if (painter == nullptr) return;
+    formatXAxis(*painter);
+    painter->xStart(fields_.frequency.axisStartHz());
+    painter->xStop(fields_.frequency.axisStopHz());
+    painter->updateXAxisLabels();
+  });
+}
+
+void SpectrumView::adjustResolution() {
+  guard("SpectrumView::adjustResolution()", [this] {
+    const std::string_view format = axisFormatForSpan(fields_.frequency.span.value());
+    fields_.ifLabelFormatter.formatString(format);
+    if (clsMultiTracePainter* const painter = findPainter()) {
+      painter->xAxisFormatter().formatString(format);
+      painter->updateXAxisLabels();
+    }
+  });
+}
+
+// The vertical fields show what the trace has.
+void SpectrumView::showVerticalAxis() {
+  const clsMultiTracePainter* const painter = activePainter();
+  if (painter == nullptr) return;
+  const FlagScope inProgress(optionChangeInProgress_);
+  fields_.controls.checkBox("AutoScaleBox").Value(painter->getAutoScale() ? 1 : 0);
+  fields_.verticalScale.valueNoUpdate(painter->verticalResolution());
+  if (const std::optional<double> top = painter->gridScaleTop()) fields_.verticalOffset.valueNoUpdate(*top);
+  shownTop_ = painter->gridScaleTop();
+  shownPerDivision_ = painter->verticalResolution();
+}
+
+void SpectrumView::followAutoScale() {
+  const clsMultiTracePainter* const painter = activePainter();
+  if (painter == nullptr || !painter->getAutoScale()) return;
+  if (painter->gridScaleTop() != shownTop_ || painter->verticalResolution() != shownPerDivision_)
+    showVerticalAxis();
+}
+
+// --- Markers
+
+void SpectrumView::addMarker() {
+  if (base_.closing()) return;
+  guard("SpectrumView::addMarker() ... ", [this] {
+    const clsMultiTracePainter* const painter = activePainter();
+    if (painter == nullptr || painter->numberOfTraces() == 0) return;
+    base_.traceManager().addMarker(painter->traceId(painter->selectedTraceIndex()));
+    updateMarkerButtons();
+    evaluateEnablingMarkerToCenter();
+  });
+}
+
+// A marker has one delta marker, and that has none.
+void SpectrumView::addDeltaMarker() {
+  if (base_.closing()) return;
+  guard("SpectrumView::addDeltaMarker() ... ", [this] {
+    const clsMultiTracePainter* const painter = activePainter();
+    const MarkerPointer marker = painter == nullptr ? nullptr : painter->activeMarker();
+    if (marker != nullptr && marker->deltaPartner.empty()) base_.traceManager().addDeltaMarker();
+  });
+}
+
+void SpectrumView::deleteMarker() {
+  if (base_.closing()) return;
+  guard("SpectrumView::MarkerDeleteButton_Click() ... ", [this] {
+    clsMultiTracePainter* const painter = activePainter();
+    if (painter == nullptr || painter->activeMarker() == nullptr) return;
+    painter->deleteActiveMarker();
+    updateMarkerButtons();
+    evaluateEnablingMarkerToCenter();
+    refreshTraces();
+  });
+}
+
+void SpectrumView::markerToMax() {
+  const clsMultiTracePainter* const painter = activePainter();
+  if (!base_.closing() && painter != nullptr && painter->activeMarker() != nullptr)
+    base_.traceManager().markerToMax();
+}
+
+void SpectrumView::markerToMin() {
+  const clsMultiTracePainter* const painter = activePainter();
+  if (!base_.closing() && painter != nullptr && painter->activeMarker() != nullptr)
+    base_.traceManager().markerToMin();
+}
+
+void SpectrumView::markerToCenter() {
+  if (base_.closing()) return;
+  guard("SpectrumView::markerToCenter()", [this] {
+    clsMultiTracePainter* const painter = activePainter();
+    if (painter == nullptr || painter->activeMarker() == nullptr) return;
+    painter->updateActiveMarker();
+    fields_.frequency.center.valueNoUpdateAutoChoose(painter->activeMarker()->valueX);
+    newCenterFrequency();
+    refreshTraces();
+  });
+}
+
+void SpectrumView::updateMarkerButtons() {
+  guard("SpectrumView::updateMarkerButtons() . . .", [this] {
+    const bool any = base_.traceManager().activeTrace() != nullptr &&
+                     !base_.traceManager().activeTrace()->markerCollection().empty();
+    for (const char* const button :
+         {"MarkerDeleteButton", "MarkerDeltaButton", "MarkerToMaxButton", "MarkerToCenterButton"})
+      fields_.controls.control(button).Enabled(any);
+  });
+}
+
+void SpectrumView::evaluateEnablingMarkerToCenter() {
+  guard("SpectrumView::evaluateEnablingMarkerToCenter()", [this] {
+    const TraceObject* const active = base_.traceManager().activeTrace();
+    MarkerToCenterButton()->Enabled(active != nullptr && active->activeMarker() != nullptr &&
+                                    !base_.recordMode && !base_.playback);
+  });
+}
+
+void SpectrumView::setMarkerFrameColor(Color color) {
+  fields_.controls.control("MarkerFrame").ForeColor(color);
+}
+
+void SpectrumView::deltaMarkerButtonEnabled(bool enable) {
+  fields_.controls.control("MarkerDeltaButton").Enabled(enable);
+}
+
+}  // namespace frontpanels
