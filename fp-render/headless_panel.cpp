@@ -51,8 +51,8 @@ void HeadlessPanel::set(std::int16_t parameterType, const Variant& value) {
 
 void HeadlessPanel::show(const DisplaySweep& sweep, const std::string& caption) {
   set(kCaptionParameter, caption);
-  set(kCenterFrequencyParameter, sweep.centerHz);
-  set(kSpanParameter, sweep.spanHz);
+  set(kCenterFrequencyParameter, sweep.range.centerHz);
+  set(kSpanParameter, sweep.range.spanHz);
   hub_.publish(SpectrumView::kSpectrumPath, sweep.shown());
 }
 

@@ -1,4 +1,4 @@
-// Brings a sweep to the points that the spectrum panel shows.
+// Brings a sweep, or a part of its frequencies, to the points that the spectrum panel shows.
 #pragma once
 
 #include <array>
@@ -15,18 +15,31 @@ inline constexpr std::size_t kDisplayValues = 513;
 // last value is therefore always a gap, and the sweep has the others.
 inline constexpr std::size_t kDisplayCells = kDisplayValues - 1;
 
-struct DisplaySweep {
-  double centerHz = 0;  // of the range from the first bin at the left edge to the last bin at the right edge
+// From `centerHz - spanHz / 2` at the graph's left edge to `centerHz + spanHz / 2` at its right edge.
+struct FrequencyRange {
+  double centerHz = 0;
   double spanHz = 0;
+
+  friend bool operator==(const FrequencyRange&, const FrequencyRange&) = default;
+};
+
+// From the first bin to the last; a bin alone has one bin's width. Nothing for a sweep without bins.
+[[nodiscard]] FrequencyRange rangeOf(const Sweep& sweep) noexcept;
+
+struct DisplaySweep {
+  FrequencyRange range;
   std::array<float, kDisplayValues> values{};  // dB; gaps are not-a-number
   std::size_t count = 0;  // of `values`, the closing gap included; 0 for a sweep without bins
 
   [[nodiscard]] std::span<const float> shown() const noexcept { return {values.data(), count}; }
 };
 
-// Up to 512 bins are shown one for one. More are shared out among 512 cells, half-open stretches of bins, and
-// the largest level of a cell stands for it: a narrow carrier never vanishes, and it appears less than one
-// cell's width from its frequency. A cell is a gap where all of its bins are. Allocates nothing.
+// Cells lie evenly from edge to edge, no further apart than the bins and at most 512 of them. The largest
+// level of the bins nearest to a cell stands for it: a narrow carrier never vanishes, and it appears no
+// further than half a cell from its frequency. A cell between two bins shows the nearer one; a cell is a gap
+// where all of its bins are, and outside the sweep. The range's span is above 0. Allocates nothing.
+void resample(const Sweep& sweep, const FrequencyRange& range, DisplaySweep& display) noexcept;
+// The whole sweep: up to 512 bins are shown one for one.
 void resample(const Sweep& sweep, DisplaySweep& display) noexcept;
 
 }  // namespace frontpanels

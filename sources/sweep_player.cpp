@@ -33,7 +33,6 @@ bool SweepPlayer::step() {
     state_ = State::Ended;
     return false;
   }
-  resample(sweep_, display_);
   sweepNumber_ = sweep_.number;
   sweepTime_ = sweep_.time;
   return true;

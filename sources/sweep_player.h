@@ -6,7 +6,6 @@
 #include <memory>
 #include <string>
 
-#include "sources/resample.h"
 #include "sources/sweep_recording.h"
 
 namespace frontpanels {
@@ -31,8 +30,8 @@ class SweepPlayer {
   bool step();
 
   [[nodiscard]] State state() const noexcept { return state_; }
-  // The sweep taken last, as a panel shows it.
-  [[nodiscard]] const DisplaySweep& display() const noexcept { return display_; }
+  // The sweep taken last; without bins until there was one.
+  [[nodiscard]] const Sweep& sweep() const noexcept { return sweep_; }
   // Counted from 1; 0 before the first sweep.
   [[nodiscard]] std::uint64_t sweepNumber() const noexcept { return sweepNumber_; }
   [[nodiscard]] const std::string& sweepTime() const noexcept { return sweepTime_; }
@@ -49,7 +48,6 @@ class SweepPlayer {
   std::unique_ptr<SweepRecording> recording_;
   State state_ = State::Empty;
   Sweep sweep_;
-  DisplaySweep display_;
   std::uint64_t sweepNumber_ = 0;
   std::string sweepTime_;
 };

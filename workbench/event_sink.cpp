@@ -4,6 +4,8 @@
 
 #include <olectl.h>
 
+#include <limits>
+
 #include "workbench/automation.h"
 #include "workbench/failure.h"
 
@@ -23,6 +25,16 @@ std::int32_t numberOf(VARIANT& argument) {
   VariantInit(&number);
   check(VariantChangeType(&number, &argument, 0, VT_I4), "Reading an argument of an event");
   return number.lVal;
+}
+
+std::int16_t shortOf(VARIANT& argument) { return static_cast<std::int16_t>(numberOf(argument)); }
+
+// Nothing at all would be converted to 0.
+double realOf(VARIANT& argument) {
+  VARIANT number;
+  VariantInit(&number);
+  const bool isNumber = argument.vt != VT_EMPTY && SUCCEEDED(VariantChangeType(&number, &argument, 0, VT_R8));
+  return isNumber ? number.dblVal : std::numeric_limits<double>::quiet_NaN();
 }
 
 // Writes in the type that the panel handed over.
@@ -65,8 +77,22 @@ ComPointer<ITypeInfo> defaultSource(ITypeInfo& classInfo) {
 
 }  // namespace
 
+// The arguments of an event come in reverse order, the status first.
+struct EventSink::Handler {
+  const wchar_t* event;
+  UINT arguments;
+  std::int32_t (EventSink::*answer)(VARIANT* arguments);
+};
+
+const EventSink::Handler EventSink::kHandlers[] = {
+    {L"frontPanelOp", 5, &EventSink::frontPanelOp},
+    {L"frontPanelSet", 6, &EventSink::frontPanelSet},
+};
+
 EventSink::EventSink(PanelRequests& requests, const IID& id, ITypeInfo& events)
-    : requests_(&requests), id_(id), frontPanelOp_(memberOf(events, L"frontPanelOp")) {}
+    : requests_(&requests), id_(id) {
+  for (const Handler& handler : kHandlers) handlers_.emplace(memberOf(events, handler.event), &handler);
+}
 
 void* EventSink::findInterface(REFIID id) noexcept {
   return id == IID_IUnknown || id == IID_IDispatch || id == id_ ? static_cast<IDispatch*>(this) : nullptr;
@@ -86,17 +112,26 @@ HRESULT EventSink::GetTypeInfo(UINT, LCID, ITypeInfo** info) {
 HRESULT EventSink::Invoke(DISPID member, REFIID, LCID, WORD, DISPPARAMS* parameters, VARIANT*, EXCEPINFO*,
                           UINT*) {
   return comBarrier([&]() -> HRESULT {
-    // frontPanelOp(hwId, vfpId, OP, argument, status), the last argument first.
-    enum { kStatus, kArgument, kOperation, kPanelId, kHardwareId, kCount };
     const ComPointer<EventSink> alive(this);
-    if (requests_ == nullptr || member != frontPanelOp_) return DISP_E_MEMBERNOTFOUND;
-    if (parameters == nullptr || parameters->cArgs != kCount) return DISP_E_BADPARAMCOUNT;
-    VARIANT* const arguments = parameters->rgvarg;
-    return writeStatus(
-        arguments[kStatus],
-        requests_->frontPanelOp(numberOf(arguments[kHardwareId]), numberOf(arguments[kPanelId]),
-                                static_cast<std::int16_t>(numberOf(arguments[kOperation]))));
+    const auto found = handlers_.find(member);
+    if (requests_ == nullptr || found == handlers_.end()) return DISP_E_MEMBERNOTFOUND;
+    const Handler& handler = *found->second;
+    if (parameters == nullptr || parameters->cArgs != handler.arguments) return DISP_E_BADPARAMCOUNT;
+    return writeStatus(parameters->rgvarg[0], (this->*handler.answer)(parameters->rgvarg));
   });
+}
+
+std::int32_t EventSink::frontPanelOp(VARIANT* arguments) {
+  enum { kStatus, kArgument, kOperation, kPanelId, kHardwareId };
+  return requests_->frontPanelOp(numberOf(arguments[kHardwareId]), numberOf(arguments[kPanelId]),
+                                 shortOf(arguments[kOperation]));
+}
+
+std::int32_t EventSink::frontPanelSet(VARIANT* arguments) {
+  enum { kStatus, kValue, kIndex, kParameterType, kPanelId, kHardwareId };
+  return requests_->frontPanelSet(numberOf(arguments[kHardwareId]), numberOf(arguments[kPanelId]),
+                                  shortOf(arguments[kParameterType]), shortOf(arguments[kIndex]),
+                                  realOf(arguments[kValue]));
 }
 
 EventConnection::EventConnection(IUnknown& control, PanelRequests& requests) {

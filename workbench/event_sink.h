@@ -28,12 +28,17 @@ class EventSink final : public ComObject<IDispatch> {
                                    VARIANT* result, EXCEPINFO*, UINT*) override;
 
  private:
+  struct Handler;
+  static const Handler kHandlers[];
+
   ~EventSink() override = default;
   [[nodiscard]] void* findInterface(REFIID id) noexcept override;
+  [[nodiscard]] std::int32_t frontPanelOp(VARIANT* arguments);
+  [[nodiscard]] std::int32_t frontPanelSet(VARIANT* arguments);
 
   PanelRequests* requests_;
   IID id_;
-  DISPID frontPanelOp_ = DISPID_UNKNOWN;
+  std::map<DISPID, const Handler*> handlers_;
 };
 
 // Connected while it lives: finds the default source interface of a control, joins it with a sink of its own,

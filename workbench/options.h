@@ -32,7 +32,7 @@ inline constexpr const char* kUsage =
     "it "
     "carries.\n"
     "\n"
-    "  --screenshots FOLDER  after each sweep, save a picture of the window and one of the panel's graph\n"
+    "  --screenshots FOLDER  of each sweep shown, save a picture of the window and one of the panel's graph\n"
     "  --sweeps N            stop after N sweeps\n"
     "  --exit                unattended: ask nothing, end with the play\n"
     "  --help                show this and end\n"

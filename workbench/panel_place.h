@@ -30,6 +30,9 @@ class PanelRequests {
  public:
   virtual std::int32_t frontPanelOp(std::int32_t hardwareId, std::int32_t panelId,
                                     std::int16_t operation) = 0;
+  // The user has changed a setting; `value` is not-a-number where the panel sent something else.
+  virtual std::int32_t frontPanelSet(std::int32_t hardwareId, std::int32_t panelId,
+                                     std::int16_t parameterType, std::int16_t index, double value) = 0;
 
  protected:
   ~PanelRequests() = default;

@@ -13,6 +13,10 @@
 #define IDM_SOURCE_RESTART 1204
 #define IDM_HELP_ABOUT 1301
 
+/* What is done for a panel once its event is over; in no menu. */
+#define IDM_SINGLE_SWEEP 1501
+#define IDM_ANSWER_PANEL 1502
+
 /* The rates stand in the order of the table in rates.h. */
 #define IDM_RATE_FIRST 1401
 #define IDM_RATE_LAST 1406

@@ -12,8 +12,6 @@ constexpr const char* kSpectrumPath = "Brantor Scanner/Spectrum/Spectrum Trace";
 
 // Codes of the host interface.
 enum Parameter : std::int16_t {
-  kCenterHz = 13,
-  kSpanHz = 14,
   kMeasurementPeriod = 43,
   kDatabasePeriod = 44,
   kDisplayPeriod = 45,
@@ -55,11 +53,16 @@ SpectrumPanel::~SpectrumPanel() {
   }
 }
 
+void SpectrumPanel::set(const ReceiverSetting& setting) {
+  const std::string meaning = "setting " + std::to_string(setting.code);
+  set(setting.code, meaning.c_str(), setting.value);
+  if (setting.code == Receiver::kCenterHz) told_.centerHz = setting.value;
+  if (setting.code == Receiver::kSpanHz) told_.spanHz = setting.value;
+}
+
 void SpectrumPanel::show(const DisplaySweep& sweep) {
-  if (sweep.centerHz != centerHz_) set(kCenterHz, "centre frequency", sweep.centerHz);
-  if (sweep.spanHz != spanHz_) set(kSpanHz, "span", sweep.spanHz);
-  centerHz_ = sweep.centerHz;
-  spanHz_ = sweep.spanHz;
+  if (sweep.range.centerHz != told_.centerHz) set({Receiver::kCenterHz, sweep.range.centerHz});
+  if (sweep.range.spanHz != told_.spanHz) set({Receiver::kSpanHz, sweep.range.spanHz});
   hub_.call("Publish", {kSpectrumPath, sweep.shown()});
 }
 

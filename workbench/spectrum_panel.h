@@ -6,7 +6,7 @@
 #include <cstdint>
 #include <string>
 
-#include "sources/resample.h"
+#include "sources/receiver.h"
 #include "workbench/automation.h"
 #include "workbench/hosted_control.h"
 
@@ -22,6 +22,8 @@ class SpectrumPanel {
   SpectrumPanel& operator=(const SpectrumPanel&) = delete;
   ~SpectrumPanel();
 
+  // Tells it what the receiver is set to.
+  void set(const ReceiverSetting& setting);
   // Retunes the panel when the range is another, and hands it the levels.
   void show(const DisplaySweep& sweep);
   // What the graph shows, as PNG.
@@ -36,8 +38,7 @@ class SpectrumPanel {
   HostedControl control_;
   Automation panel_;
   Automation hub_;
-  double centerHz_ = 0;
-  double spanHz_ = 0;
+  FrequencyRange told_;
 };
 
 }  // namespace frontpanels::workbench

@@ -19,9 +19,11 @@
 namespace frontpanels::workbench {
 namespace {
 
-constexpr std::int16_t kCloseRequest = 1;
+// Operations that panels ask for.
+enum Operation : std::int16_t { kClose = 1, kSingleSweep = 2, kContinuousSweeps = 3, kStopSweeps = 4 };
 constexpr std::int32_t kDone = 0;
 constexpr std::int32_t kUnknownRequest = -1;
+constexpr std::int32_t kUnusableValue = -8;
 // Unattended there is nobody to watch: as fast as timers go.
 constexpr std::chrono::milliseconds kUnattendedPeriod{10};
 
@@ -91,6 +93,8 @@ const Workbench::Command Workbench::kCommands[] = {
     {IDM_SOURCE_RESTART, &Workbench::restart,
      [](const Workbench& self) { return self.player_.state() != SweepPlayer::State::Empty; }},
     {IDM_HELP_ABOUT, &Workbench::about, kAlways},
+    {IDM_SINGLE_SWEEP, &Workbench::single, kAlways},
+    {IDM_ANSWER_PANEL, &Workbench::answerPanel, kAlways},
 };
 
 Workbench::Workbench(Options options, TextFiles& files)
@@ -162,6 +166,7 @@ void Workbench::askForRecording() {
 
 void Workbench::openRecording(const std::string& path) {
   player_.open(path);
+  receiver_.showWholeSweeps();
   window_.status(StatusPart::Message, "");
   play();
 }
@@ -174,6 +179,7 @@ void Workbench::openPanel() {
   if (!messages_) messages_.emplace();
   panel_ = std::make_unique<SpectrumPanel>(window_, static_cast<PanelRequests&>(*this));
   window_.occupy(&panel_->control());
+  for (const ReceiverSetting& setting : receiver_.settings()) panel_->set(setting);
   if (player_.sweepNumber() > 0) showSweep();
   showMessages();
 }
@@ -199,8 +205,15 @@ void Workbench::step() {
   takeSweep();
 }
 
+// At the end of a recording it begins anew, as playing does.
+void Workbench::single() {
+  player_.play();
+  step();
+}
+
 void Workbench::restart() {
   player_.restart();
+  receiver_.showWholeSweeps();
   applyState();
 }
 
@@ -249,12 +262,27 @@ bool Workbench::takeSweep() {
   showSweep();
   showStatus();
   showMessages();
-  if (!options_.screenshotFolder.empty()) takeScreenshots();
+  takeScreenshots();
   return true;
 }
 
 void Workbench::showSweep() {
-  if (panel_) panel_->show(player_.display());
+  const DisplaySweep& sweep = receiver_.receive(player_.sweep());
+  if (panel_ && sweep.count > 0) panel_->show(sweep);
+}
+
+// As a receiver does once it is set: tells the panel, and shows what it receives now. Where nothing was taken
+// yet the next sweep will.
+void Workbench::answerPanel() {
+  bool retuned = false;
+  for (const ReceiverSetting& answer : receiver_.takeAnswers()) {
+    if (panel_) panel_->set(answer);
+    retuned = retuned || answer.code == Receiver::kCenterHz || answer.code == Receiver::kSpanHz;
+  }
+  if (!retuned) return;
+  showSweep();
+  showMessages();
+  takeScreenshots();
 }
 
 void Workbench::showMessages() {
@@ -262,6 +290,7 @@ void Workbench::showMessages() {
 }
 
 void Workbench::takeScreenshots() {
+  if (options_.screenshotFolder.empty() || player_.sweepNumber() == 0) return;
   const std::filesystem::path folder = std::filesystem::absolute(toUtf16(options_.screenshotFolder));
   std::filesystem::create_directories(folder);
   wchar_t number[24];
@@ -283,10 +312,32 @@ void Workbench::finishUnattended() {
 
 void Workbench::end(ExitCode code) noexcept { PostQuitMessage(static_cast<int>(code)); }
 
+// --- What the panel asks for. It is still inside its own event: all but stopping is done after it.
+
 std::int32_t Workbench::frontPanelOp(std::int32_t, std::int32_t, std::int16_t operation) {
-  if (operation != kCloseRequest) return kUnknownRequest;
-  // Not at once: the panel is still inside its own event.
-  PostMessageW(window_.handle(), WM_COMMAND, IDM_PANELS_CLOSE, 0);
+  const bool empty = player_.state() == SweepPlayer::State::Empty;
+  const auto afterwards = [this](UINT id) {
+    return PostMessageW(window_.handle(), WM_COMMAND, id, 0) ? kDone : kUnknownRequest;
+  };
+  switch (operation) {
+    case kClose:
+      return afterwards(IDM_PANELS_CLOSE);
+    case kSingleSweep:
+      return empty ? kUnknownRequest : afterwards(IDM_SINGLE_SWEEP);
+    case kContinuousSweeps:
+      return empty ? kUnknownRequest : afterwards(IDM_SOURCE_PLAY);
+    case kStopSweeps:
+      pause();
+      return kDone;
+    default:
+      return kUnknownRequest;
+  }
+}
+
+std::int32_t Workbench::frontPanelSet(std::int32_t, std::int32_t, std::int16_t parameterType, std::int16_t,
+                                      double value) {
+  if (!receiver_.request(parameterType, value)) return kUnusableValue;
+  PostMessageW(window_.handle(), WM_COMMAND, IDM_ANSWER_PANEL, 0);
   return kDone;
 }
 

@@ -7,6 +7,7 @@
 #include <string>
 
 #include "platform/textfile.h"
+#include "sources/receiver.h"
 #include "sources/sweep_player.h"
 #include "workbench/main_window.h"
 #include "workbench/options.h"
@@ -38,6 +39,8 @@ class Workbench final : private MainWindowEvents, private PanelRequests {
   void failed(const std::string& message) noexcept override;
   // PanelRequests
   std::int32_t frontPanelOp(std::int32_t hardwareId, std::int32_t panelId, std::int16_t operation) override;
+  std::int32_t frontPanelSet(std::int32_t hardwareId, std::int32_t panelId, std::int16_t parameterType,
+                             std::int16_t index, double value) override;
 
   bool start();
   void askForRecording();
@@ -48,6 +51,7 @@ class Workbench final : private MainWindowEvents, private PanelRequests {
   void play();
   void pause();
   void step();
+  void single();
   void restart();
   void rate(std::size_t index);
   void about();
@@ -55,6 +59,7 @@ class Workbench final : private MainWindowEvents, private PanelRequests {
   void applyState();
   bool takeSweep();
   void showSweep();
+  void answerPanel();
   void showMessages();
   void takeScreenshots();
   void finishUnattended();
@@ -65,6 +70,7 @@ class Workbench final : private MainWindowEvents, private PanelRequests {
 
   Options options_;
   SweepPlayer player_;
+  Receiver receiver_;
   std::size_t rate_ = kFirstRate;
   std::uint64_t sweepsTaken_ = 0;
   ExitCode exitCode_ = ExitCode::Done;

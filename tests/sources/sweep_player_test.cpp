@@ -34,7 +34,7 @@ TEST_F(SweepPlayerTest, TakesOneSweepAStepAndEndsAfterTheLastOneWhichItKeepsShow
   EXPECT_EQ(now(), "paused 1");
   EXPECT_EQ(player.percent(), 100);  // the row after a sweep tells that it has ended
   EXPECT_EQ(player.sweepTime(), "2020-01-01 00:00:10");
-  EXPECT_EQ(player.display().values[0], -1.0F);
+  EXPECT_EQ(player.sweep().levelsDb[0], -1.0F);
   player.play();
   player.pause();
   EXPECT_EQ(now(), "paused 1");
@@ -44,7 +44,7 @@ TEST_F(SweepPlayerTest, TakesOneSweepAStepAndEndsAfterTheLastOneWhichItKeepsShow
   EXPECT_FALSE(player.step());
   EXPECT_FALSE(player.step());
   EXPECT_EQ(now(), "ended 2");
-  EXPECT_EQ(player.display().values[0], -3.0F);
+  EXPECT_EQ(player.sweep().levelsDb[0], -3.0F);
   player.play();
   EXPECT_EQ(now(), "playing 0");
   EXPECT_TRUE(player.step());

@@ -1,0 +1,102 @@
+#include "sources/receiver.h"
+
+#include <algorithm>
+#include <cmath>
+#include <iterator>
+#include <limits>
+
+namespace frontpanels {
+namespace {
+
+// Called with finite values only.
+bool isCenter(double value) { return value >= kLowestTunedHz && value <= kHighestTunedHz; }
+bool isSpan(double value) { return value > 0 && value <= kHighestTunedHz - kLowestTunedHz; }
+bool isPositive(double value) { return value > 0; }
+bool isNotNegative(double value) { return value >= 0; }
+bool isFlag(double value) { return value == 0 || value == 1; }
+bool isListValue(double value) {
+  return value == std::floor(value) && std::abs(value) <= std::numeric_limits<std::int16_t>::max();
+}
+bool isCount(double value) { return isListValue(value) && isNotNegative(value); }
+
+struct SettingRow {
+  std::int16_t code;
+  bool (*accepts)(double value);
+};
+
+constexpr SettingRow kRows[] = {
+    {Receiver::kCenterHz, isCenter},
+    {Receiver::kSpanHz, isSpan},
+    {16, isPositive},      // resolution bandwidth, Hz
+    {17, isFlag},          // narrow IF bandwidth
+    {43, isNotNegative},   // measurement interval, s
+    {94, isPositive},      // display length
+    {333, isListValue},    // channelization
+    {500, isListValue},    // averaging type
+    {502, isCount},        // averages
+    {750, isFlag},         // frequencies rather than channels
+    {803, isNotNegative},  // measurement interval, m
+    {804, isFlag},         // the interval is a time
+    {3900, isFlag},        // averages of logarithmic power
+};
+
+bool isTuning(std::int16_t code) { return code == Receiver::kCenterHz || code == Receiver::kSpanHz; }
+
+}  // namespace
+
+bool Receiver::request(std::int16_t code, double value) {
+  const auto* const row = std::find_if(std::begin(kRows), std::end(kRows),
+                                       [code](const SettingRow& r) { return r.code == code; });
+  if (row == std::end(kRows) || !std::isfinite(value) || !row->accepts(value)) return false;
+  if (std::find(unanswered_.begin(), unanswered_.end(), code) == unanswered_.end())
+    unanswered_.push_back(code);
+  values_[code] = value;
+  if (isTuning(code)) {
+    tuned_ = true;
+    fitRange();
+  }
+  return true;
+}
+
+// Where both edges pass their limits the span has been refused before.
+void Receiver::fitRange() {
+  const auto center = values_.find(kCenterHz);
+  const auto span = values_.find(kSpanHz);
+  if (center == values_.end() || span == values_.end()) return;
+  span->second = std::min(span->second, kHighestTunedHz - kLowestTunedHz);
+  const double half = span->second / 2;
+  center->second = std::clamp(center->second, kLowestTunedHz + half, kHighestTunedHz - half);
+}
+
+std::vector<ReceiverSetting> Receiver::takeAnswers() {
+  std::vector<ReceiverSetting> answers;
+  for (const std::int16_t code : unanswered_) answers.push_back({code, values_.at(code)});
+  unanswered_.clear();
+  return answers;
+}
+
+std::vector<ReceiverSetting> Receiver::settings() const {
+  std::vector<ReceiverSetting> all;
+  for (const auto& [code, value] : values_) all.push_back({code, value});
+  return all;
+}
+
+const DisplaySweep& Receiver::receive(const Sweep& sweep) {
+  display_.count = 0;
+  if (sweep.levelsDb.empty()) return display_;
+  const FrequencyRange whole = rangeOf(sweep);
+  if (!tuned_) values_.erase(kCenterHz), values_.erase(kSpanHz);
+  values_.try_emplace(kCenterHz, whole.centerHz);
+  values_.try_emplace(kSpanHz, whole.spanHz);
+  if (!tuned_) {
+    resample(sweep, display_);
+  } else {
+    fitRange();
+    resample(sweep, {values_[kCenterHz], values_[kSpanHz]}, display_);
+  }
+  return display_;
+}
+
+void Receiver::showWholeSweeps() { tuned_ = false; }
+
+}  // namespace frontpanels
