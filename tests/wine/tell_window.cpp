@@ -3,15 +3,22 @@
 //   tell_window CLASS WORD...
 //
 // Waits for a window of that class and puts into its queue, in order, for each word: "key:118" a key pressed
-// and let go (a virtual key's number), "command:1101" a menu's command, "close" its closing. Ends with 1 when
-// no such window came.
+// and let go (a virtual key's number), "command:1101" a menu's command, "click:<Stop>" a click on what shows
+// that text, "type:<Span>=1M" the text and Enter into the box beside that label, "close" its closing. Ends
+// with 1 when no such window came.
 #include <windows.h>
 
 #include <cstdio>
-#include <cstdlib>
 #include <cstring>
+#include <cwchar>
+#include <string>
+#include <utility>
+
+#include "tests/wine/panel_user.h"
 
 namespace {
+
+using namespace frontpanels::testing;
 
 constexpr ULONGLONG kPatienceMs = 30000;
 constexpr DWORD kGlanceMs = 50;
@@ -26,15 +33,37 @@ HWND waitForWindow(const char* className) {
   return nullptr;
 }
 
-bool tell(HWND window, const char* word) {
-  if (std::strncmp(word, "key:", 4) == 0) {
-    const auto key = static_cast<WPARAM>(std::atoi(word + 4));
-    return PostMessageA(window, WM_KEYDOWN, key, 1) && PostMessageA(window, WM_KEYUP, key, 0xC0000001);
-  }
-  if (std::strncmp(word, "command:", 8) == 0)
-    return PostMessageA(window, WM_COMMAND, static_cast<WPARAM>(std::atoi(word + 8)), 0);
-  if (std::strcmp(word, "close") == 0) return PostMessageA(window, WM_CLOSE, 0, 0);
-  return false;
+// What stands before and behind the first of the sign.
+std::pair<std::wstring, std::wstring> halvesOf(const std::wstring& text, wchar_t sign) {
+  const std::size_t at = text.find(sign);
+  if (at == std::wstring::npos) return {text, {}};
+  return {text.substr(0, at), text.substr(at + 1)};
+}
+
+bool clickOn(HWND window, const std::wstring& text) {
+  const HWND button = withText(window, text);
+  if (button == nullptr) return false;
+  click(button);
+  return true;
+}
+
+bool typeBeside(HWND window, const std::wstring& labelAndText) {
+  const auto [label, text] = halvesOf(labelAndText, L'=');
+  const HWND box = boxBeside(window, label);
+  if (box == nullptr) return false;
+  typeInto(box, text);
+  return true;
+}
+
+bool tell(HWND window, const std::wstring& word) {
+  const auto [what, rest] = halvesOf(word, L':');
+  if (what == L"click") return clickOn(window, rest);
+  if (what == L"type") return typeBeside(window, rest);
+  if (what == L"close") return PostMessageW(window, WM_CLOSE, 0, 0);
+  const auto number = std::wcstoul(rest.c_str(), nullptr, 10);
+  if (what == L"command") return PostMessageW(window, WM_COMMAND, number, 0);
+  if (what != L"key") return false;
+  return PostMessageW(window, WM_KEYDOWN, number, 1) && PostMessageW(window, WM_KEYUP, number, 0xC0000001);
 }
 
 }  // namespace
@@ -47,7 +76,7 @@ int main(int count, char** words) {
     return 1;
   }
   for (int i = 2; i < count; ++i) {
-    if (!tell(window, words[i])) {
+    if (!tell(window, std::wstring(words[i], words[i] + std::strlen(words[i])))) {
       std::fprintf(stderr, "the window cannot be told %s\n", words[i]);
       return 2;
     }
