@@ -3,6 +3,7 @@
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <initializer_list>
 #include <string>
 #include <string_view>
@@ -19,6 +20,8 @@ class RecordingOwner : public PanelHost, public PanelContainer {
   std::vector<std::string> calls;
   PanelSettings kept;  // as last handed over
   std::vector<std::uint8_t> png;
+  // What the host does inside the request for a setting.
+  std::function<void(std::int16_t parameterType, const Variant& value)> settingChanged;
 
   std::int32_t frontPanelOp(std::int32_t hwId, std::int32_t vfpId, std::int16_t operation,
                             const Variant& argument) override {
@@ -26,7 +29,9 @@ class RecordingOwner : public PanelHost, public PanelContainer {
   }
   std::int32_t frontPanelSet(std::int32_t hwId, std::int32_t vfpId, std::int16_t parameterType,
                              std::int16_t index, const Variant& value) override {
-    return request("frontPanelSet", {hwId, vfpId, parameterType, index}, value);
+    const std::int32_t answer = request("frontPanelSet", {hwId, vfpId, parameterType, index}, value);
+    if (settingChanged) settingChanged(parameterType, value);
+    return answer;
   }
   std::int32_t saveDisplaySettings(std::int32_t hwId, std::int32_t vfpId,
                                    const PanelSettings& settings) override {
