@@ -151,12 +151,30 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
     });
   }
   HRESULT STDMETHODCALLTYPE Constituent(BSTR name, IDispatch** field) override {
-    return give(field, [&]() -> IDispatch* {
-      ControlSet* const controls = panel().controls();
-      if (controls == nullptr) raiseInvalidProcedureCall();
-      return new ConstituentObject(this->outer(), controls->control(fromBstr(name)));
-    });
+    return give(field, [&] { return constituent(fromBstr(name)); });
   }
+  HRESULT STDMETHODCALLTYPE get_displayPanel(IDispatch** field) override {
+    return give(field, [&] { return constituent("displayPanel"); });
+  }
+  HRESULT STDMETHODCALLTYPE get_controlPanel(IDispatch** field) override {
+    return give(field, [&] { return constituent("controlPanel"); });
+  }
+  HRESULT STDMETHODCALLTYPE setDrawingArea() override {
+    return perform([&] { base().setDrawingArea(); });
+  }
+  HRESULT STDMETHODCALLTYPE get_hSplitter(float* position) override {
+    return give(position, [&] { return base().hSplitter; });
+  }
+  HRESULT STDMETHODCALLTYPE put_hSplitter(float position) override {
+    return perform([&] { base().hSplitter = position; });
+  }
+  HRESULT STDMETHODCALLTYPE get_vSplitter(float* position) override {
+    return give(position, [&] { return base().vSplitter; });
+  }
+  HRESULT STDMETHODCALLTYPE put_vSplitter(float position) override {
+    return perform([&] { base().vSplitter = position; });
+  }
+  HRESULT STDMETHODCALLTYPE get_winState(short* state) override { return get_ViewState(state); }
   HRESULT STDMETHODCALLTYPE get_Settings(VARIANT* settings) override {
     return give(settings, [&] { return toAutomation(listOf(base().settings())); });
   }
@@ -416,6 +434,12 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
   static Color colorOf(LONG value) noexcept {
     if (value < 0) return {static_cast<std::uint32_t>(GetSysColor(static_cast<int>(value & 0xFF)))};
     return {static_cast<std::uint32_t>(value) & 0xFFFFFFU};
+  }
+
+  IDispatch* constituent(std::string_view name) {
+    ControlSet* const controls = panel().controls();
+    if (controls == nullptr) raiseInvalidProcedureCall();
+    return new ConstituentObject(this->outer(), controls->control(name));
   }
 
   HRESULT change(AreaProperty property, VARIANT_BOOL value) {

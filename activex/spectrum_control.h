@@ -17,6 +17,20 @@ class SpectrumControl final : public FrontPanelControl<ISpectrumView> {
   HRESULT STDMETHODCALLTYPE addMarker() override;
   HRESULT STDMETHODCALLTYPE markerToMax() override;
   HRESULT STDMETHODCALLTYPE markerToMin() override;
+  HRESULT STDMETHODCALLTYPE deleteMarker() override;
+  HRESULT STDMETHODCALLTYPE addDeltaMarker() override;
+  HRESULT STDMETHODCALLTYPE markerToCenter() override;
+  HRESULT STDMETHODCALLTYPE updateMarkerButtons() override;
+  HRESULT STDMETHODCALLTYPE evaluateEnablingMarkerToCenter() override;
+  HRESULT STDMETHODCALLTYPE deltaMarkerButtonEnabled(VARIANT_BOOL enable) override;
+  HRESULT STDMETHODCALLTYPE Limits(short parameterType, VARIANT ranges, LONG* status) override;
+  HRESULT STDMETHODCALLTYPE ChannelZero(short order, double frequencyHz) override;
+  HRESULT STDMETHODCALLTYPE ChannelSpacing(short order, double spacingHz) override;
+  HRESULT STDMETHODCALLTYPE ChannelDiscontinuity(short order, double channel, double lowest,
+                                                 double highest) override;
+  HRESULT STDMETHODCALLTYPE ChannelLookup(short channelization, short lowestOrder,
+                                          short highestOrder) override;
+  HRESULT STDMETHODCALLTYPE ClearChannels() override;
 
  private:
   [[nodiscard]] void* findInterface(REFIID id) noexcept override;
