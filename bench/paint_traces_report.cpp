@@ -6,6 +6,7 @@
 
 #include "bench/allocation_count.h"
 #include "bench/paint_traces_scene.h"
+#include "bench/spectrum_panel_scene.h"
 
 namespace frontpanels::bench {
 namespace {
@@ -26,40 +27,44 @@ double median(std::vector<double> values) {
   return values[values.size() / 2];
 }
 
-bool samePicture(PaintTracesScene& scene, const ReadPixels& readPixels) {
-  scene.drawPanelAgain();
+bool samePicture(BenchScene& scene, const ReadPixels& readPixels) {
+  scene.drawFrameworkAgain();
   const std::vector<std::uint32_t> panel = readPixels();
   scene.drawBareAgain();
   return panel == readPixels();
+}
+
+bool report(BenchScene& scene, const ReadPixels& readPixels, int rounds) {
+  const bool same = samePicture(scene, readPixels);
+  if (!same)
+    std::printf("%s: the framework and the bare calls draw different pictures\n", scene.name().c_str());
+  std::vector<double> framework;
+  std::vector<double> bare;
+  std::vector<double> ratio;
+  std::uint64_t allocations = 0;
+  for (int round = 0; round < rounds; ++round) {
+    const std::uint64_t before = allocationCount();
+    framework.push_back(microsecondsAFrame([&] { scene.drawFramework(); }));
+    allocations = allocationCount() - before;
+    bare.push_back(microsecondsAFrame([&] { scene.drawBare(); }));
+    ratio.push_back(framework.back() / bare.back());
+  }
+  std::printf("%-10s %12.1f %12.1f %8.3f %12.2f\n", scene.name().c_str(), median(framework), median(bare),
+              median(ratio), static_cast<double>(allocations) / kFramesARound);
+  return same;
 }
 
 }  // namespace
 
 bool reportPaintTraces(Gdi& gdi, DcHandle view, const ReadPixels& readPixels, int rounds) {
   bool same = true;
-  std::printf("%-10s %12s %12s %8s %12s\n", "T x P", "panel, us", "bare, us", "ratio", "allocations");
+  std::printf("%-10s %12s %12s %8s %12s\n", "scene", "drawn, us", "bare, us", "ratio", "allocations");
   for (const SceneSize& size : kSceneSizes) {
     PaintTracesScene scene(gdi, view, size);
-    if (!samePicture(scene, readPixels)) {
-      std::printf("%d x %d: the panel and the bare calls draw different pictures\n", size.traces,
-                  size.points);
-      same = false;
-    }
-    std::vector<double> panel;
-    std::vector<double> bare;
-    std::vector<double> ratio;
-    std::uint64_t allocations = 0;
-    for (int round = 0; round < rounds; ++round) {
-      const std::uint64_t before = allocationCount();
-      panel.push_back(microsecondsAFrame([&] { scene.drawPanel(); }));
-      allocations = allocationCount() - before;
-      bare.push_back(microsecondsAFrame([&] { scene.drawBare(); }));
-      ratio.push_back(panel.back() / bare.back());
-    }
-    std::printf("%d x %-6d %12.1f %12.1f %8.3f %12.2f\n", size.traces, size.points, median(panel),
-                median(bare), median(ratio), static_cast<double>(allocations) / kFramesARound);
+    same = report(scene, readPixels, rounds) && same;
   }
-  return same;
+  SpectrumPanelScene panel(gdi, view);
+  return report(panel, readPixels, rounds) && same;
 }
 
 }  // namespace frontpanels::bench

@@ -16,7 +16,8 @@ constexpr std::int16_t kResultType = 25;
 }  // namespace
 
 PaintTracesScene::PaintTracesScene(Gdi& gdi, DcHandle view, SceneSize size)
-    : gdi_(gdi),
+    : size_(size),
+      gdi_(gdi),
       form_(view),
       fonts_(gdi_, kMetrics, true),
       manager_({gdi_, windowing_, kMetrics, fonts_.handles(), true}),
@@ -25,38 +26,39 @@ PaintTracesScene::PaintTracesScene(Gdi& gdi, DcHandle view, SceneSize size)
   manager_.drawingArea(0, 0, form_.ViewScaleWidth(), form_.ViewScaleHeight());
   manager_.setShadowDC();
   manager_.addTraceObject(painter_, kResultType);
-  makeFrames(size);
-  setUp(size);
+  makeFrames();
+  setUp();
   gdi_.start();
   paint(0);
   gdi_.stop();
 }
 
-// A noise floor with a few carriers, other noise in each frame.
-void PaintTracesScene::makeFrames(SceneSize size) {
+std::vector<std::vector<float>> noisyFrames(std::size_t frames, std::size_t points) {
   std::mt19937 random(1);
   std::normal_distribution<float> noise(-95.0F, 3.0F);
-  frames_.resize(kFrames);
-  for (std::vector<Variant>& frame : frames_) {
-    for (std::int16_t trace = 0; trace < size.traces; ++trace) {
-      std::vector<float> values(static_cast<std::size_t>(size.points));
-      for (std::size_t i = 0; i < values.size(); ++i) {
-        values[i] = noise(random);
-        if (i % 97 == 0) values[i] += 45.0F;
-      }
-      frame.emplace_back(Variant::Singles(std::move(values)));
-    }
+  std::vector<std::vector<float>> levels(frames, std::vector<float>(points));
+  for (std::vector<float>& frame : levels) {
+    for (std::size_t i = 0; i < points; ++i) frame[i] = noise(random) + (i % 97 == 0 ? 45.0F : 0.0F);
   }
+  return levels;
+}
+
+void PaintTracesScene::makeFrames() {
+  const auto traces = static_cast<std::size_t>(size_.traces);
+  auto levels = noisyFrames(kFrames * traces, static_cast<std::size_t>(size_.points));
+  frames_.resize(kFrames);
+  for (std::size_t i = 0; i < levels.size(); ++i)
+    frames_[i / traces].emplace_back(Variant::Singles(std::move(levels[i])));
   for (const std::vector<Variant>& frame : frames_) {
     std::vector<std::span<const float>>& spans = values_.emplace_back();
     for (const Variant& trace : frame) spans.emplace_back(std::get<Variant::Singles>(trace.value()));
   }
 }
 
-void PaintTracesScene::setUp(SceneSize size) {
-  for (std::int16_t trace = 0; trace < size.traces; ++trace)
-    painter_->addNewTraceAtEnd(trace, 0, size.points - 1, trace);
-  painter_->numberOfMeasurements(size.points);
+void PaintTracesScene::setUp() {
+  for (std::int16_t trace = 0; trace < size_.traces; ++trace)
+    painter_->addNewTraceAtEnd(trace, 0, size_.points - 1, trace);
+  painter_->numberOfMeasurements(size_.points);
   painter_->yAxisFormatter().dBmSuffix();
   painter_->yAxisFormatter().suppressSuffix(true);
   painter_->xAxisFormatter().frequencySuffix();
@@ -69,7 +71,7 @@ void PaintTracesScene::setUp(SceneSize size) {
   for (std::int16_t i = 0; i < kMarkers; ++i) {
     const auto marker = std::make_shared<clsMarker>();
     marker->id = std::to_string(i + 1);
-    marker->point = size.points * (i + 1) / (kMarkers + 1);
+    marker->point = size_.points * (i + 1) / (kMarkers + 1);
     painter_->addMarkerToTrace(marker, 0);
   }
   const double plotLeft = painter_->gridScaleLeft();
@@ -78,7 +80,7 @@ void PaintTracesScene::setUp(SceneSize size) {
   const double plotHeight = kScenePx.height - plotTop - static_cast<double>(painter_->gridScaleBottom());
   const double range = kDbPerDivision * kDivisions;
   mapping_.leftPx = plotLeft;
-  mapping_.stepPx = plotWidth / (size.points - 2);
+  mapping_.stepPx = plotWidth / (size_.points - 2);
   mapping_.pxPerUnit = plotHeight / range;
   mapping_.originPx = plotTop + plotHeight + plotHeight * (kTopDbm - range) / range;
 }
@@ -92,9 +94,8 @@ void PaintTracesScene::paint(std::size_t frame) {
 
 void PaintTracesScene::paintBare(std::size_t frame) { gdi_.draw(values_[frame], mapping_); }
 
-void PaintTracesScene::drawPanel() { paint(++panelFrame_ % kFrames); }
-void PaintTracesScene::drawBare() { paintBare(++bareFrame_ % kFrames); }
-void PaintTracesScene::drawPanelAgain() { paint(0); }
-void PaintTracesScene::drawBareAgain() { paintBare(0); }
+std::string PaintTracesScene::name() const {
+  return std::to_string(size_.traces) + " x " + std::to_string(size_.points);
+}
 
 }  // namespace frontpanels::bench

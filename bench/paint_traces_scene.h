@@ -7,14 +7,13 @@
 #include <string>
 #include <vector>
 
+#include "bench/bench_scene.h"
 #include "bench/captured_picture.h"
 #include "painters/multi_trace_painter.h"
 #include "traces/label_font_set.h"
 #include "traces/trace_manager.h"
 
 namespace frontpanels::bench {
-
-inline constexpr Size kScenePx{800, 600};
 
 struct SceneSize {
   std::int16_t traces;
@@ -62,25 +61,25 @@ class NoWindowing : public Windowing {
 };
 
 // The scene drawn by trace manager and painter, and the same scene as bare graphics calls.
-class PaintTracesScene {
+class PaintTracesScene final : public BenchScene {
  public:
   PaintTracesScene(Gdi& gdi, DcHandle view, SceneSize size);
 
-  // Each draws the next of a few frames, so that every frame has new values.
-  void drawPanel();
-  void drawBare();
-  // Draws the frame that the bare picture was captured from, by either way, for a comparison of pixels.
-  void drawPanelAgain();
-  void drawBareAgain();
+  [[nodiscard]] std::string name() const override;
+  void drawFramework() override { paint(++panelFrame_ % kFrames); }
+  void drawBare() override { paintBare(++bareFrame_ % kFrames); }
+  void drawFrameworkAgain() override { paint(0); }
+  void drawBareAgain() override { paintBare(0); }
 
  private:
   static constexpr std::size_t kFrames = 8;
 
-  void makeFrames(SceneSize size);
-  void setUp(SceneSize size);
+  void makeFrames();
+  void setUp();
   void paint(std::size_t frame);
   void paintBare(std::size_t frame);
 
+  SceneSize size_;
   CapturingGdi gdi_;
   BenchForm form_;
   NoWindowing windowing_;

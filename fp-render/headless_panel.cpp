@@ -22,10 +22,10 @@ void require(std::int32_t status) {
 }  // namespace
 
 HeadlessPanel::HeadlessPanel(const VerticalScale& scale)
-    : view_(gdi_, kGraph),
+    : view_(gdi_.createScreen(kGraph), kGraph),
       picture_(gdi_.createScreen(kPicture)),
       captionFont_(gdi_.createFont({"Arial", 13, 700})),
-      panel_({gdi_, windowing_, view_, hub_, ScreenMetrics{}, ""}, host_, container_) {
+      panel_({gdi_, windowing_, view_, hub_, ScreenMetrics{}, ""}, owner_, owner_) {
   if (!view_.hdc() || !picture_) raiseOutOfMemory();
   // The panel leaves margins round its graph, where a window has its background.
   gdi_.fillRect(view_.hdc(), {0, 0, kGraph.width, kGraph.height},
@@ -62,7 +62,7 @@ void HeadlessPanel::drawCaption() {
   const SelectedFont font(gdi_, picture_, captionFont_);
   const TextStyleScope style(gdi_, picture_, gdi_.sysColor(SystemColor::ButtonText),
                              BackgroundMode::Transparent);
-  const std::string& caption = container_.captionText();
+  const std::string& caption = owner_.captionText();
   const Size textPx = gdi_.textExtent(picture_, caption);
   gdi_.textOut(picture_, {kCaptionIndentPx, (kCaptionHeightPx - textPx.height) / 2}, caption);
 }

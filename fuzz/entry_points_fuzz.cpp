@@ -3,7 +3,9 @@
 #include <cstdint>
 #include <iterator>
 #include <memory>
+#include <vector>
 
+#include "entry/host_record_list.h"
 #include "framework/panel/base_vfp.h"
 #include "framework/panel/host_codes.h"
 #include "framework/panel/hosted_panel.h"
@@ -32,21 +34,75 @@ void enter(PanelUnderTest& test, Entry entry) {
 }
 
 // The panel's own entry points and the base's on the reverse path.
-template <auto entry, class Object>
-void operate(PanelUnderTest& test, Object& object, FuzzInput& input) {
+template <class Entry>
+void operate(PanelUnderTest& test, Entry entry, FuzzInput& input) {
   const auto hardwareId = input.number<std::int32_t>();
   const auto operation = input.number<std::int16_t>();
   const Variant parameter = takeVariant(input);
-  enter(test, [&] { return (object.*entry)(hardwareId, operation, parameter); });
+  enter(test, [&] { return entry(hardwareId, operation, parameter); });
 }
 
-template <auto entry, class Object>
-void set(PanelUnderTest& test, Object& object, FuzzInput& input) {
+template <class Entry>
+void set(PanelUnderTest& test, Entry entry, FuzzInput& input) {
   const auto hardwareId = input.number<std::int32_t>();
   const auto parameterType = input.number<std::int16_t>();
   const auto index = input.number<std::int16_t>();
   const Variant value = takeVariant(input);
-  enter(test, [&] { return (object.*entry)(hardwareId, parameterType, index, value); });
+  enter(test, [&] { return entry(hardwareId, parameterType, index, value); });
+}
+
+void vfpOp(PanelUnderTest& test, FuzzInput& input) {
+  operate(
+      test, [&](auto id, auto code, const auto& value) { return test.panel().vfpOp(id, code, value); },
+      input);
+}
+
+void vfpSet(PanelUnderTest& test, FuzzInput& input) {
+  set(
+      test,
+      [&](auto id, auto code, auto, const auto& value) { return test.panel().vfpSet(id, code, 0, value); },
+      input);
+}
+
+void baseVfpOp(PanelUnderTest& test, FuzzInput& input) {
+  clsBaseVFP& base = test.panel().base();
+  operate(
+      test, [&](auto id, auto code, const auto& value) { return base.baseVfpOp(id, code, value); }, input);
+}
+
+void baseVfpSet(PanelUnderTest& test, FuzzInput& input) {
+  clsBaseVFP& base = test.panel().base();
+  set(
+      test,
+      [&](auto id, auto code, auto index, const auto& value) {
+        return base.baseVfpSet(id, code, index, value);
+      },
+      input);
+}
+
+// A user at any field: a click, keys, an arrow, an item of a list.
+void useControl(PanelUnderTest& test, FuzzInput& input) {
+  const auto controls = test.panel().controls()->controls();
+  Control& control = *controls[input.number<std::uint8_t>() % controls.size()];
+  const auto how = input.number<std::uint8_t>();
+  ControlSet::click(control);
+  for (const std::uint8_t key : input.bytes(how % 32)) control.userKey(key);
+  if (auto* const spin = dynamic_cast<SpinButton*>(&control)) spin->press((how & 32) != 0);
+  if (auto* const list = dynamic_cast<ItemList*>(&control);
+      list != nullptr && list->usable() && list->ListCount() > 0)
+    list->userChoice(how % list->ListCount());
+}
+
+// Bands and their channels, as a host names them.
+void limits(PanelUnderTest& test, FuzzInput& input) {
+  const auto parameterType = input.number<std::int16_t>();
+  const auto order = input.number<std::int8_t>();
+  const HostRecordList records(
+      std::vector<HostRecordList::Record>{{order, takeVariant(input), takeVariant(input)}});
+  enter(test, [&] { return test.panel().Limits(parameterType, records); });
+  test.panel().channels().setChannelLookup("0", &records);
+  test.panel().channels().setChannelZero(takeVariant(input).toText(), &records);
+  test.panel().channels().setChannelSpacing("30000", &records);
 }
 
 void displayData(PanelUnderTest& test, FuzzInput& input) {
@@ -150,8 +206,8 @@ using B = clsBaseVFP;
 
 // make_seeds writes the places of these rows.
 constexpr Call kCalls[] = {
-    [](PanelUnderTest& test, FuzzInput& input) { operate<&V::vfpOp>(test, test.panel(), input); },
-    [](PanelUnderTest& test, FuzzInput& input) { set<&V::vfpSet>(test, test.panel(), input); },
+    vfpOp,
+    vfpSet,
     publish,
     resize,
     call<&V::Paint>,
@@ -169,13 +225,13 @@ constexpr Call kCalls[] = {
     displayData,
     displayParameter,
     PopUp_Click,
-    [](PanelUnderTest& test, FuzzInput& input) { operate<&B::baseVfpOp>(test, test.panel().base(), input); },
-    [](PanelUnderTest& test, FuzzInput& input) { set<&B::baseVfpSet>(test, test.panel().base(), input); },
+    baseVfpOp,
+    baseVfpSet,
     [](PanelUnderTest& test, FuzzInput& input) { test.owner.status = input.number<std::int32_t>(); },
     [](PanelUnderTest& test, FuzzInput& input) {
       test.windowing.captured = WindowHandle{input.number<std::uint8_t>()};
     },
-    call<&V::Activate>,
+    baseCall<&B::Activate>,
     baseCall<&B::closeVfp>,
     baseCall<&B::saveVfp>,
     baseCall<&B::reportHtml>,
@@ -183,6 +239,15 @@ constexpr Call kCalls[] = {
     askBase,
     setSurface,
     addTraceObject,
+    useControl,
+    limits,
+    call<&V::addDeltaMarker>,
+    call<&V::deleteMarker>,
+    call<&V::markerToCenter>,
+    call<&V::ChannelizationCombo_Change>,
+    [](PanelUnderTest& test, FuzzInput& input) {
+      test.panel().contextMenuClick(input.number<std::int8_t>());
+    },
 };
 
 void run(FuzzInput input) {

@@ -4,42 +4,25 @@
 #include <cstddef>
 #include <cstdint>
 #include <memory>
-#include <string_view>
 #include <vector>
 
-#include "framework/panel/panel_host.h"
+#include "framework/panel/headless.h"
 #include "platform/data_server.h"
 #include "platform/raster/raster_gdi.h"
-#include "platform/windowing.h"
 #include "spectrum/spectrum_view.h"
 
 namespace frontpanels::fuzz {
 
-// The picture box. The pixels behind it stay as many, whatever size it says it has.
-class FuzzView : public GraphView {
+// Has a window, and is hidden until it is shown.
+class FuzzView : public HeadlessView {
  public:
-  Size sizePx;
-  bool shown = false;
-
-  FuzzView(DcHandle dc, Size size) : sizePx(size), dc_(dc) {}
-
-  [[nodiscard]] DcHandle hdc() override { return dc_; }
+  FuzzView(DcHandle dc, Size size) : HeadlessView(dc, size) { shown = false; }
   [[nodiscard]] WindowHandle hwnd() override { return WindowHandle{77}; }
-  [[nodiscard]] Size clientSizePx() override { return sizePx; }
-  [[nodiscard]] MousePointer mousePointer() override { return pointer_; }
-  void mousePointer(MousePointer pointer) override { pointer_ = pointer; }
-  [[nodiscard]] bool visible() override { return shown; }
-  void visible(bool visible) override { shown = visible; }
-  void refresh() override {}
-
- private:
-  DcHandle dc_;
-  MousePointer pointer_ = MousePointer::Default;
 };
 
 // Host and container. It answers every request with the same status, and may first do to the panel what the
 // panel has asked for, as hosts do.
-class FuzzOwner : public PanelHost, public PanelContainer {
+class FuzzOwner : public HeadlessOwner {
  public:
   std::int32_t status = 0;
   SpectrumView* obeys = nullptr;  // the panel, while the host does as it asks
@@ -61,13 +44,6 @@ class FuzzOwner : public PanelHost, public PanelContainer {
                          const PanelSettings& settings) override {
     return restored(resourceId, settings);
   }
-  void caption(std::string_view) override {}
-  void visible(bool) override {}
-  void viewState(std::int16_t) override {}
-  void left(float) override {}
-  void top(float) override {}
-  void width(float) override {}
-  void height(float) override {}
   std::vector<std::uint8_t> picturePng() override { return {0x89, 'P', 'N', 'G'}; }
 
  private:
