@@ -51,24 +51,22 @@ bool Receiver::request(std::int16_t code, double value) {
   if (std::find(unanswered_.begin(), unanswered_.end(), code) == unanswered_.end())
     unanswered_.push_back(code);
   values_[code] = value;
-  if (isTuning(code)) {
-    tuned_ = true;
-    fitRange();
-  }
+  tuned_ = tuned_ || isTuning(code);
   return true;
 }
 
-// Where both edges pass their limits the span has been refused before.
+// Not before centre and span are asked for again: a panel that has changed both says so one after the other.
 void Receiver::fitRange() {
   const auto center = values_.find(kCenterHz);
   const auto span = values_.find(kSpanHz);
-  if (center == values_.end() || span == values_.end()) return;
+  if (!tuned_ || center == values_.end() || span == values_.end()) return;
   span->second = std::min(span->second, kHighestTunedHz - kLowestTunedHz);
   const double half = span->second / 2;
   center->second = std::clamp(center->second, kLowestTunedHz + half, kHighestTunedHz - half);
 }
 
 std::vector<ReceiverSetting> Receiver::takeAnswers() {
+  fitRange();
   std::vector<ReceiverSetting> answers;
   for (const std::int16_t code : unanswered_) answers.push_back({code, values_.at(code)});
   unanswered_.clear();
@@ -85,14 +83,15 @@ const DisplaySweep& Receiver::receive(const Sweep& sweep) {
   display_.count = 0;
   if (sweep.levelsDb.empty()) return display_;
   const FrequencyRange whole = rangeOf(sweep);
-  if (!tuned_) values_.erase(kCenterHz), values_.erase(kSpanHz);
-  values_.try_emplace(kCenterHz, whole.centerHz);
-  values_.try_emplace(kSpanHz, whole.spanHz);
-  if (!tuned_) {
-    resample(sweep, display_);
-  } else {
+  double& centerHz = values_.try_emplace(kCenterHz, whole.centerHz).first->second;
+  double& spanHz = values_.try_emplace(kSpanHz, whole.spanHz).first->second;
+  if (tuned_) {
     fitRange();
-    resample(sweep, {values_[kCenterHz], values_[kSpanHz]}, display_);
+    resample(sweep, {centerHz, spanHz}, display_);
+  } else {
+    centerHz = whole.centerHz;
+    spanHz = whole.spanHz;
+    resample(sweep, display_);
   }
   return display_;
 }

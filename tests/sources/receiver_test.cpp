@@ -106,6 +106,8 @@ TEST_F(ReceiverTest, MovesARangeBackInsideItsLimits) {
   EXPECT_EQ(receive(sweepFrom(0, 11)), "150 300 0");
   EXPECT_TRUE(receiver.request(13, 5.9e9));
   EXPECT_EQ(text(receiver.takeAnswers()), "13=5850000000");
+  EXPECT_TRUE(receiver.request(13, 2e6) && receiver.request(14, 4e6));  // not moved by the span before
+  EXPECT_EQ(text(receiver.takeAnswers()), "13=2000000 14=4000000");
   EXPECT_TRUE(receiver.request(14, 6e9));
   EXPECT_EQ(receive(sweepFrom(0, 11)), "3000 6000 0");
 }
