@@ -83,9 +83,8 @@ TEST_F(ReceiverTest, ShowsWholeSweepsUntilItIsTunedAndThenTheRangeWhateverIsSwep
   EXPECT_EQ(receive(sweepFrom(300, 21)), "320 20 -10");  // from 310 MHz on; the span is the one shown last
   EXPECT_EQ(receive(sweepFrom(309, 5)), "320 20 -1");
   EXPECT_EQ(receive(sweepFrom(100, 11)), "320 20 gap");
-  EXPECT_TRUE(receiver.request(14, 4e6));
+  EXPECT_TRUE(receiver.request(14, 4e6) && receiver.request(16, 1e3));
   EXPECT_EQ(receive(sweepFrom(300, 21)), "320 4 -18");
-  EXPECT_TRUE(receiver.request(16, 1e3));
   receiver.showWholeSweeps();
   EXPECT_EQ(receive(sweepFrom(100, 11)), "105 10 0");
   EXPECT_EQ(text(receiver.settings()), "13=105000000 14=10000000 16=1000");
@@ -99,7 +98,11 @@ TEST_F(ReceiverTest, TakesWhatWasNotRequestedFromTheFirstSweep) {
 }
 
 // As panels do it: from 0 to 6 GHz, and the centre gives way.
-TEST_F(ReceiverTest, MovesARangeBackInsideItsLimits) {
+TEST_F(ReceiverTest, MovesARequestedRangeBackInsideItsLimits) {
+  const Sweep wide = sweepFrom(0, 7001);
+  EXPECT_EQ(receive(wide), "3500 7000 0");
+  EXPECT_EQ(text(receiver.takeAnswers()), "");
+  EXPECT_EQ(text(receiver.settings()), "13=3500000000 14=7000000000");
   EXPECT_EQ(receive(sweepFrom(100, 11)), "105 10 0");
   EXPECT_TRUE(receiver.request(14, 300e6));
   EXPECT_EQ(text(receiver.takeAnswers()), "14=300000000");

@@ -98,20 +98,25 @@ TEST(Resample, ShowsThePartOfASweepThatLiesInARange) {
   }
 }
 
-// 3001 bins, 1000 to 4000, for 512 cells, each 3000 / 511 = 5.87 bins from the next.
+// 3001 bins, 1000 to 4000, for 512 cells, each 3000 / 511 = 5.87 bins from the next. A bin counts as far as
+// half of it reaches over the edge.
 TEST(Resample, KeepsEachPeakOfTheRangeAndNoneFromOutside) {
+  constexpr std::ptrdiff_t kNowhere = kDisplayValues;
   const struct {
+    double centerMHz;
     std::size_t peak;
-    std::ptrdiff_t cell;  // 512 is the closing gap's
-  } rows[] = {{999, 513},  {1000, 0},   {1002, 0},   {1003, 1},
-              {2500, 256}, {3997, 510}, {4000, 511}, {4001, 513}};
+    std::ptrdiff_t cell;
+  } rows[] = {{2600, 999, kNowhere},     {2600, 1000, 0},        {2600, 1002, 0},
+              {2600, 1003, 1},           {2600, 2500, 256},      {2600, 3997, 510},
+              {2600, 4000, 511},         {2600, 4001, kNowhere}, {2600.45, 1000, 0},
+              {2600.55, 1000, kNowhere}, {2600.55, 4001, 511},   {2600.45, 4001, kNowhere}};
   for (const auto& row : rows) {
     Sweep sweep = sweepOf(6000);
     sweep.levelsDb[row.peak] = 7.0F;
     DisplaySweep display;
-    resample(sweep, {2600e6, 3000e6}, display);
+    resample(sweep, {row.centerMHz * 1e6, 3000e6}, display);
     const auto peak = std::find(display.values.begin(), display.values.end(), 7.0F);
-    EXPECT_EQ(peak - display.values.begin(), row.cell) << row.peak;
+    EXPECT_EQ(peak - display.values.begin(), row.cell) << row.centerMHz << " " << row.peak;
   }
 }
 
