@@ -207,6 +207,9 @@ void Workbench::step() {
 
 // At the end of a recording it begins anew, as playing does.
 void Workbench::single() {
+  player_.pause();
+  applyState();
+  if (takeSweep()) return;
   player_.play();
   step();
 }
@@ -328,7 +331,8 @@ std::int32_t Workbench::frontPanelOp(std::int32_t, std::int32_t, std::int16_t op
       return empty ? kUnknownRequest : afterwards(IDM_SOURCE_PLAY);
     case kStopSweeps:
       pause();
-      return kDone;
+      return afterwards(
+          IDM_SOURCE_PAUSE);  // what was asked for before it and has not begun is stopped as well
     default:
       return kUnknownRequest;
   }

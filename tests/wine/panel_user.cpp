@@ -18,10 +18,17 @@ std::vector<HWND> descendants(HWND panel) {
   return all;
 }
 
-bool isBox(HWND window) {
+bool isOf(HWND window, const wchar_t* className) {
   wchar_t name[32] = L"";
   GetClassNameW(window, name, 32);
-  return lstrcmpiW(name, L"EDIT") == 0 && (GetWindowLongW(window, GWL_STYLE) & WS_VISIBLE) != 0;
+  return lstrcmpiW(name, className) == 0;
+}
+
+HWND withText(HWND panel, const wchar_t* className, const std::wstring& text) {
+  const std::vector<HWND> all = descendants(panel);
+  const auto found = std::find_if(
+      all.begin(), all.end(), [&](HWND window) { return isOf(window, className) && textOf(window) == text; });
+  return found == all.end() ? nullptr : *found;
 }
 
 RECT placeOf(HWND window) {
@@ -39,22 +46,17 @@ std::wstring textOf(HWND window) {
   return text;
 }
 
-HWND withText(HWND panel, const std::wstring& text) {
-  const std::vector<HWND> all = descendants(panel);
-  const auto found =
-      std::find_if(all.begin(), all.end(), [&](HWND window) { return textOf(window) == text; });
-  return found == all.end() ? nullptr : *found;
-}
+HWND buttonWith(HWND panel, const std::wstring& caption) { return withText(panel, L"BUTTON", caption); }
 
 HWND boxBeside(HWND panel, const std::wstring& label) {
-  const HWND beside = withText(panel, label);
+  const HWND beside = withText(panel, L"STATIC", label);
   if (beside == nullptr) return nullptr;
   const RECT at = placeOf(beside);
   HWND nearest = nullptr;
   for (const HWND window : descendants(panel)) {
     const RECT place = placeOf(window);
     const bool inItsRow = place.top < at.bottom && place.bottom > at.top && place.left >= at.right;
-    if (isBox(window) && inItsRow && (nearest == nullptr || place.left < placeOf(nearest).left))
+    if (isOf(window, L"EDIT") && inItsRow && (nearest == nullptr || place.left < placeOf(nearest).left))
       nearest = window;
   }
   return nearest;

@@ -7,8 +7,8 @@
 
 namespace frontpanels::testing {
 
-// What a child window of any depth shows; null when there is none with that text.
-[[nodiscard]] HWND withText(HWND panel, const std::wstring& text);
+// A button, an option or a frame by its caption; null when there is none.
+[[nodiscard]] HWND buttonWith(HWND panel, const std::wstring& caption);
 // The box to the right of a label; null when there is none.
 [[nodiscard]] HWND boxBeside(HWND panel, const std::wstring& label);
 [[nodiscard]] std::wstring textOf(HWND window);

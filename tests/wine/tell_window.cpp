@@ -3,9 +3,9 @@
 //   tell_window CLASS WORD...
 //
 // Waits for a window of that class and puts into its queue, in order, for each word: "key:118" a key pressed
-// and let go (a virtual key's number), "command:1101" a menu's command, "click:<Stop>" a click on what shows
-// that text, "type:<Span>=1M" the text and Enter into the box beside that label, "close" its closing. Ends
-// with 1 when no such window came.
+// and let go (a virtual key's number), "command:1101" a menu's command, "click:<Stop>" a click on the button
+// of that caption, "type:<Span>=1M" the text and Enter into the box beside that label, "close" its closing.
+// Ends with 1 when no such window came.
 #include <windows.h>
 
 #include <cstdio>
@@ -41,7 +41,7 @@ std::pair<std::wstring, std::wstring> halvesOf(const std::wstring& text, wchar_t
 }
 
 bool clickOn(HWND window, const std::wstring& text) {
-  const HWND button = withText(window, text);
+  const HWND button = buttonWith(window, text);
   if (button == nullptr) return false;
   click(button);
   return true;
