@@ -93,18 +93,29 @@ void ControlCore::site(IOleClientSite* site) {
   readAmbients();
 }
 
+// A container that does not say is running, and has no font.
 void ControlCore::readAmbients() {
-  userMode_ = true;  // a container that does not say is running
-  const auto ambients = site_.query<IDispatch>();
-  if (!ambients) return;
+  userMode_ = true;
+  ComPointer<IFont> font;
   VARIANT value;
   VariantInit(&value);
-  DISPPARAMS none{};
-  const HRESULT read = ambients->Invoke(DISPID_AMBIENT_USERMODE, IID_NULL, LOCALE_USER_DEFAULT,
-                                        DISPATCH_PROPERTYGET, &none, &value, nullptr, nullptr);
-  if (SUCCEEDED(read) && SUCCEEDED(VariantChangeType(&value, &value, 0, VT_BOOL)))
+  if (readAmbient(DISPID_AMBIENT_USERMODE, value) && SUCCEEDED(VariantChangeType(&value, &value, 0, VT_BOOL)))
     userMode_ = V_BOOL(&value) != VARIANT_FALSE;
   VariantClear(&value);
+  if (readAmbient(DISPID_AMBIENT_FONT, value) && (V_VT(&value) == VT_DISPATCH || V_VT(&value) == VT_UNKNOWN))
+    font = ComPointer<IUnknown>(V_UNKNOWN(&value)).query<IFont>();
+  VariantClear(&value);
+  HFONT handle = nullptr;
+  if (font && FAILED(font->get_hFont(&handle))) handle = nullptr;
+  window_.font(handle);
+  font_ = font;
+}
+
+bool ControlCore::readAmbient(DISPID property, VARIANT& value) const {
+  const auto ambients = site_.query<IDispatch>();
+  DISPPARAMS none{};
+  return ambients && SUCCEEDED(ambients->Invoke(property, IID_NULL, LOCALE_USER_DEFAULT, DISPATCH_PROPERTYGET,
+                                                &none, &value, nullptr, nullptr));
 }
 
 // Some containers answer the control itself: asking it would call us back for ever.

@@ -94,11 +94,13 @@ class ControlCore : public Aggregable, public WindowOwner {
  private:
   void lastRelease() noexcept final;
   [[nodiscard]] ComPointer<IDispatch> extender() const;
+  [[nodiscard]] bool readAmbient(DISPID property, VARIANT& value) const;
 
   const ControlClass& class_;
   SIZEL extent_{};
   PanelWindow window_;
   ComPointer<IOleClientSite> site_;
+  ComPointer<IFont> font_;  // of the container, as long as the fields show it
   bool userMode_ = true;
   bool dirty_ = false;
   int freezes_ = 0;

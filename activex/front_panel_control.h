@@ -2,6 +2,7 @@
 // interface; it has these members and its own.
 #pragma once
 
+#include <algorithm>
 #include <cstring>
 #include <string>
 
@@ -211,7 +212,7 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
   HRESULT STDMETHODCALLTYPE SavePicture(BSTR path) override {
     return perform([&] {
       MemoryPicture picture;
-      this->window().render(picture);
+      this->window().renderGraph(picture);
       writePng(std::wstring(path, SysStringLen(path)), picture);
     });
   }
@@ -356,11 +357,18 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
     const std::int32_t top = toInt32(area.top);
     return {left, top, left + toInt32(area.width), top + toInt32(area.height)};
   }
+  Size graphSizePx() override {
+    const Size view = this->window().clientSizePx();
+    return {graphLengthPx(panel().InvisibleWidthMarkX1(), panel().ViewScaleWidth(), view.width),
+            graphLengthPx(panel().InvisibleHeightMarkY1(), panel().ViewScaleHeight(), view.height)};
+  }
   void resized() override { panel().Form_Resize(); }
   void mouseDown(const MouseEvent& e) override { base().MouseDown(e.button, e.shift, e.xTwips, e.yTwips); }
   void mouseMove(const MouseEvent& e) override { base().MouseMove(e.button, e.shift, e.xTwips, e.yTwips); }
   void mouseUp(const MouseEvent& e) override { base().MouseUp(e.button, e.shift, e.xTwips, e.yTwips); }
   void keyDown(std::int16_t keyCode, std::int16_t shift) override { base().KeyDown(keyCode, shift); }
+  std::vector<PanelMenuItem> contextMenu() override { return panel().contextMenu(); }
+  void contextMenuClick(std::int16_t id) override { panel().contextMenuClick(id); }
 
   void focusChanged(bool focused) override {
     Dispatching<DualControl<Dual>, Dual>::focusChanged(focused);
@@ -377,7 +385,7 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
   void height(float length) override { this->putExtended(L"Height", length); }
   std::vector<std::uint8_t> picturePng() override {
     MemoryPicture picture;
-    this->window().render(picture);
+    this->window().renderGraph(picture);
     return encodePng(picture);
   }
 
@@ -429,6 +437,12 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
     clsBaseVFP& self() override { return control_.base(); }
     FrontPanelControl& control_;
   };
+
+  // From the surface's scale to pixels of the view; at least one, as there is no picture without a pixel.
+  static std::int32_t graphLengthPx(float mark, float scaleLength, std::int32_t viewPx) {
+    const float share = scaleLength > 0 ? mark / scaleLength : 1.0F;
+    return std::clamp(toInt32(share * static_cast<float>(viewPx)), 1, viewPx);
+  }
 
   // With the sign bit set, the low bits name a colour of the system.
   static Color colorOf(LONG value) noexcept {

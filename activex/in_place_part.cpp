@@ -11,12 +11,23 @@ namespace {
 
 constexpr wchar_t kObjectName[] = L"Front Panels";
 
-// Keys that move markers: the host is to hand them on to the window.
-constexpr WPARAM kOwnKeys[] = {VK_LEFT, VK_RIGHT, VK_UP, VK_DOWN, VK_HOME, VK_END};
+// Keys that move markers, and the caret of a field.
+constexpr WPARAM kArrowKeys[] = {VK_LEFT, VK_RIGHT, VK_UP, VK_DOWN, VK_HOME, VK_END};
+
+bool isArrow(WPARAM key) {
+  return std::find(std::begin(kArrowKeys), std::end(kArrowKeys), key) != std::end(kArrowKeys);
+}
 
 DWORD modifierState() {
   const auto down = [](int key) { return GetKeyState(key) < 0; };
   return (down(VK_SHIFT) ? 1U : 0U) | (down(VK_CONTROL) ? 2U : 0U) | (down(VK_MENU) ? 4U : 0U);
+}
+
+// Enter in a field is the field's, whatever a default button of the container would make of it.
+HRESULT dispatch(const MSG& message) {
+  TranslateMessage(&message);
+  DispatchMessageW(&message);
+  return S_OK;
 }
 
 }  // namespace
@@ -60,7 +71,7 @@ void InPlacePart::activateUi() {
   const ComPointer<IOleInPlaceSite> site = inPlaceSite_;  // may close in its answer
   site->OnUIActivate();
   // In each answer the container may change its mind.
-  if (active_ && GetFocus() != core().window().window()) SetFocus(core().window().window());
+  if (active_ && !core().window().hasFocus()) SetFocus(core().window().window());
   if (active_) nameActiveObject(this);
 }
 
@@ -136,9 +147,17 @@ HRESULT InPlacePart::SetObjectRects(LPCRECT place, LPCRECT clip) {
 HRESULT InPlacePart::TranslateAccelerator(LPMSG message) {
   if (message == nullptr) return E_POINTER;
   return barrier([&]() -> HRESULT {
-    const bool own = message->message == WM_KEYDOWN && std::find(std::begin(kOwnKeys), std::end(kOwnKeys),
-                                                                 message->wParam) != std::end(kOwnKeys);
-    if (own) return S_FALSE;
+    const ComPointer<IUnknown> alive(core().outer());
+    if (core().window().translateKey(*message)) return S_OK;
+    const bool pressed = message->message == WM_KEYDOWN;
+    if ((pressed || message->message == WM_CHAR) && core().window().hasFocus()) {
+      const LRESULT wanted = SendMessageW(message->hwnd, WM_GETDLGCODE, message->wParam,
+                                          reinterpret_cast<LPARAM>(message));
+      if (pressed && (wanted & DLGC_WANTMESSAGE) != 0) return dispatch(*message);
+      const bool own = pressed ? (wanted & DLGC_WANTARROWS) != 0 && isArrow(message->wParam)
+                               : (wanted & DLGC_WANTCHARS) != 0;
+      if (own) return S_FALSE;
+    }
     const auto site = core().site().query<IOleControlSite>();
     return site && site->TranslateAccelerator(message, modifierState()) == S_OK ? S_OK : S_FALSE;
   });

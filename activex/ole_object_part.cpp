@@ -139,13 +139,14 @@ HRESULT OleObjectPart::GetControlInfo(CONTROLINFO* info) {
   info->cb = sizeof *info;
   info->hAccel = nullptr;
   info->cAccel = 0;
-  info->dwFlags = 0;
+  info->dwFlags = core().window().hasFields() ? CTRLINFO_EATS_RETURN : 0;
   return S_OK;
 }
 
 HRESULT OleObjectPart::OnAmbientPropertyChange(DISPID property) {
   return barrier([&] {
-    if (property == DISPID_UNKNOWN || property == DISPID_AMBIENT_USERMODE) core().readAmbients();
+    if (property == DISPID_UNKNOWN || property == DISPID_AMBIENT_USERMODE || property == DISPID_AMBIENT_FONT)
+      core().readAmbients();
   });
 }
 

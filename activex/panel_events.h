@@ -2,7 +2,9 @@
 #pragma once
 
 #include <cstdint>
+#include <vector>
 
+#include "framework/panel/pop_up_menu.h"
 #include "platform/geometry.h"
 
 namespace frontpanels::activex {
@@ -23,11 +25,16 @@ class PanelEvents {
   virtual void paint() = 0;
   // What paint covers, in pixels of the view; the rest is background.
   [[nodiscard]] virtual Rect paintedAreaPx() = 0;
+  // The part of the view that the areas with the fields leave to the graph, from its left upper corner on.
+  [[nodiscard]] virtual Size graphSizePx() = 0;
   virtual void resized() = 0;
   virtual void mouseDown(const MouseEvent& event) = 0;
   virtual void mouseMove(const MouseEvent& event) = 0;
   virtual void mouseUp(const MouseEvent& event) = 0;
   virtual void keyDown(std::int16_t keyCode, std::int16_t shift) = 0;
+  // The graph's own menu, empty for none.
+  [[nodiscard]] virtual std::vector<PanelMenuItem> contextMenu() = 0;
+  virtual void contextMenuClick(std::int16_t id) = 0;
 };
 
 }  // namespace frontpanels::activex

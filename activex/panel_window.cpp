@@ -9,7 +9,9 @@
 #include <utility>
 
 #include "activex/barrier.h"
+#include "activex/context_menu.h"
 #include "activex/module.h"
+#include "activex/printed_window.h"
 
 namespace frontpanels::activex {
 namespace {
@@ -112,14 +114,39 @@ PanelWindow::PanelWindow(WindowOwner& owner, ScreenMetrics metrics, Size initial
 
 PanelWindow::~PanelWindow() { destroy(); }
 
+void PanelWindow::fields(ControlSet* fields) {
+  fields_.reset();
+  FieldsOwner& owner = *this;
+  if (fields != nullptr) fields_.emplace(*fields, owner);
+}
+
+void PanelWindow::font(HFONT font) {
+  font_ = font;
+  if (window_ != nullptr && fields_) fields_->rescale(font_, dpi());
+}
+
+// The fields keep to the scale that the panel lays itself out in, also on a screen with another one.
+int PanelWindow::dpi() const noexcept {
+  constexpr float kTwipsPerInch = 1440;
+  return static_cast<int>(kTwipsPerInch / metrics_.twipsPerPixelX + 0.5F);
+}
+
 void PanelWindow::create(HWND parent, const RECT& place) {
   const wchar_t* const className = windowClass(windowProcedure);
-  window_ = CreateWindowExW(0, className, L"", WS_CHILD | WS_CLIPSIBLINGS | WS_TABSTOP, place.left, place.top,
-                            place.right - place.left, place.bottom - place.top, parent, nullptr,
-                            moduleHandle(), this);
+  window_ = CreateWindowExW(0, className, L"", WS_CHILD | WS_CLIPSIBLINGS | WS_CLIPCHILDREN | WS_TABSTOP,
+                            place.left, place.top, place.right - place.left, place.bottom - place.top, parent,
+                            nullptr, moduleHandle(), this);
   if (window_ == nullptr) throw ComFailure(HRESULT_FROM_WIN32(GetLastError()));
   windowDC_ = GetDC(window_);
   memory_.release();
+  if (fields_) {
+    try {
+      fields_->create(window_, font_, dpi());
+    } catch (...) {
+      destroy();
+      throw;
+    }
+  }
   if (events_ != nullptr) events_->resized();
   if (visible_) ShowWindow(window_, SW_SHOWNA);
 }
@@ -153,6 +180,15 @@ void PanelWindow::render(MemoryPicture& picture) {
   if (events_ == nullptr) return;
   const HDC before = std::exchange(rendering_, picture.dc());
   events_->paint();
+  rendering_ = before;
+  if (window_ != nullptr) printChildren(window_, picture.dc());
+}
+
+void PanelWindow::renderGraph(MemoryPicture& picture) {
+  picture.create(events_ == nullptr ? clientSizePx() : events_->graphSizePx());
+  if (events_ == nullptr) return;
+  const HDC before = std::exchange(rendering_, picture.dc());
+  barrier([&] { events_->paint(); });
   rendering_ = before;
 }
 
@@ -212,26 +248,45 @@ LRESULT CALLBACK PanelWindow::windowProcedure(HWND window, UINT message, WPARAM 
     SetWindowLongPtrW(window, GWLP_USERDATA, 0);
     self->window_ = nullptr;
     self->windowDC_ = nullptr;
+    self->focused_ = false;
+    if (self->fields_) self->fields_->destroy();
     self->owner_.windowDestroyed();
   }
   return result;
 }
 
 LRESULT PanelWindow::handle(UINT message, WPARAM wParam, LPARAM lParam) {
-  for (const ButtonRow& row : kButtons) {
-    if (message == row.down || message == row.doubleClick) return press(row.button, lParam), 0;
-    if (message == row.up) return release(row.button, wParam, lParam), 0;
-  }
+  LRESULT result = 0;
+  if (fields_ && fields_->parentMessage(message, wParam, lParam, result)) return result;
   switch (message) {
     case WM_PAINT:
       return paint(), 0;
     case WM_ERASEBKGND:
       return 1;  // all of the view is painted at once; erasing it before would flicker
+    case WM_PRINT:
     case WM_PRINTCLIENT:
-      return paintInto(reinterpret_cast<HDC>(wParam)), 0;
+      return print(reinterpret_cast<HDC>(wParam)), 0;
     case WM_SIZE:
       if (events_ != nullptr && windowDC_ != nullptr) events_->resized();
       return 0;
+    case WM_SETFOCUS:
+      return takeFocus(), 0;
+    case WM_KILLFOCUS:
+      return focusMoved(reinterpret_cast<HWND>(wParam)), 0;
+    default:
+      return handleInput(message, wParam, lParam);
+  }
+}
+
+LRESULT PanelWindow::handleInput(UINT message, WPARAM wParam, LPARAM lParam) {
+  for (const ButtonRow& row : kButtons) {
+    if (message == row.down || message == row.doubleClick) return press(row.button, lParam), 0;
+    if (message == row.up) {
+      release(row.button, wParam, lParam);
+      return row.up == WM_RBUTTONUP ? DefWindowProcW(window_, message, wParam, lParam) : 0;
+    }
+  }
+  switch (message) {
     case WM_MOUSEACTIVATE:
       if (owner_.inUse()) owner_.pressed();
       return MA_ACTIVATE;
@@ -239,14 +294,15 @@ LRESULT PanelWindow::handle(UINT message, WPARAM wParam, LPARAM lParam) {
       if (events_ != nullptr && owner_.inUse()) events_->mouseMove(mouseEvent(buttonsHeld(wParam), lParam));
       return 0;
     case WM_KEYDOWN:
-      if (events_ != nullptr && owner_.inUse())
-        events_->keyDown(static_cast<std::int16_t>(wParam), shiftState());
-      return 0;
+      return keyDown(wParam), 0;
+    case WM_SYSCHAR:
+      if (untranslatedKey(message, wParam)) return 0;
+      break;
     case WM_GETDLGCODE:
-      return DLGC_WANTARROWS;
-    case WM_SETFOCUS:
-    case WM_KILLFOCUS:
-      return owner_.focusChanged(message == WM_SETFOCUS), 0;
+      return DLGC_WANTARROWS | (fields_ ? DLGC_WANTTAB : 0);
+    case WM_CONTEXTMENU:
+      if (reinterpret_cast<HWND>(wParam) == window_ && showMenu(lParam)) return 0;
+      break;
     case WM_SETCURSOR:
       if (LOWORD(lParam) != HTCLIENT || pointer_ == MousePointer::Default) break;
       return showPointer(), TRUE;
@@ -277,6 +333,11 @@ void PanelWindow::paintInto(HDC dc) {
   rendering_ = before;
 }
 
+void PanelWindow::print(HDC dc) {
+  paintInto(dc);
+  printChildren(window_, dc);
+}
+
 void PanelWindow::fillMargins(HDC dc) {
   const Size size = clientSizePx();
   const RECT all{0, 0, size.width, size.height};
@@ -292,6 +353,7 @@ void PanelWindow::fillMargins(HDC dc) {
 void PanelWindow::press(std::int16_t button, LPARAM position) {
   if (!owner_.inUse()) return;
   SetFocus(window_);
+  if (window_ == nullptr) return;  // a field that lost the focus may have had the panel closed
   SetCapture(window_);
   if (events_ != nullptr) events_->mouseDown(mouseEvent(button, position));
 }
@@ -300,6 +362,69 @@ void PanelWindow::press(std::int16_t button, LPARAM position) {
 void PanelWindow::release(std::int16_t button, WPARAM keys, LPARAM position) {
   if (events_ != nullptr && owner_.inUse()) events_->mouseUp(mouseEvent(button, position));
   if (buttonsHeld(keys) == 0 && window_ != nullptr && GetCapture() == window_) ReleaseCapture();
+}
+
+// --- Keys and focus
+
+void PanelWindow::run(const std::function<void()>& body) noexcept {
+  const HeldControl held(owner_);
+  barrier(body);
+}
+
+bool PanelWindow::translateKey(const MSG& message) {
+  if (!fields_ || window_ == nullptr || !owner_.inUse()) return false;
+  const bool tab = message.message == WM_KEYDOWN && message.wParam == VK_TAB &&
+                   GetKeyState(VK_SHIFT) >= 0 && GetKeyState(VK_CONTROL) >= 0;
+  if (tab && message.hwnd == window_) return fields_->enter(true);
+  return fields_->translateKey(message);
+}
+
+bool PanelWindow::untranslatedKey(UINT message, WPARAM key) {
+  if (!fields_ || !owner_.inUse()) return false;
+  return translateKey(MSG{window_, message, key, 0, 0, {}}) || fields_->untranslatedKey(message, key);
+}
+
+void PanelWindow::keyDown(WPARAM key) {
+  if (untranslatedKey(WM_KEYDOWN, key)) return;
+  if (events_ != nullptr && owner_.inUse()) events_->keyDown(static_cast<std::int16_t>(key), shiftState());
+}
+
+bool PanelWindow::holds(HWND window) const noexcept {
+  return window != nullptr && window_ != nullptr && (window == window_ || IsChild(window_, window));
+}
+
+// What a field does when it is left may have sent the focus elsewhere in the meantime.
+void PanelWindow::focusMoved(HWND to) {
+  const HWND now = GetFocus();
+  const bool focused = holds(now != nullptr ? now : to);
+  if (std::exchange(focused_, focused) != focused) owner_.focusChanged(focused);
+}
+
+// Who comes with Tab from outside wants to go through the fields; who comes with the mouse wants the graph.
+void PanelWindow::takeFocus() {
+  const bool entered = !focused_;
+  focusMoved(window_);
+  if (entered && fields_ && GetFocus() == window_ && GetKeyState(VK_TAB) < 0 && owner_.inUse())
+    fields_->enter(GetKeyState(VK_SHIFT) >= 0);
+}
+
+// --- Mouse and menu
+
+// Without a position it was a key: the menu then opens in the middle of the graph.
+bool PanelWindow::showMenu(LPARAM position) {
+  if (events_ == nullptr || !owner_.inUse()) return false;
+  const std::vector<PanelMenuItem> items = events_->contextMenu();
+  if (items.empty()) return false;
+  POINT at{GET_X_LPARAM(position), GET_Y_LPARAM(position)};
+  if (position == -1) {
+    const Size graph = events_->graphSizePx();
+    at = {graph.width / 2, graph.height / 2};
+    ClientToScreen(window_, &at);
+  }
+  const PanelMenuItem* const chosen = chooseFromMenu(window_, at, items);
+  // The panel may have gone while the menu was open.
+  if (chosen != nullptr && events_ != nullptr && window_ != nullptr) events_->contextMenuClick(chosen->id);
+  return true;
 }
 
 MouseEvent PanelWindow::mouseEvent(std::int16_t button, LPARAM position) const {

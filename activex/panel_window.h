@@ -1,10 +1,14 @@
-// The window of a panel's graph. Before the control is active there is none, and the graph is drawn into a
-// bitmap in memory instead, so that a panel that a script created works like one on a form.
+// The window of a panel: its graph, and round it its fields as child windows. Before the control is active
+// there is none, and the graph is drawn into a bitmap in memory instead, so that a panel that a script created
+// works like one on a form.
 #pragma once
 
 #include <windows.h>
 
+#include <optional>
+
 #include "activex/panel_events.h"
+#include "platform/win32/win32_controls.h"
 #include "platform/windowing.h"
 
 namespace frontpanels::activex {
@@ -18,6 +22,7 @@ class WindowOwner {
   virtual void holdControl() noexcept = 0;
   virtual void releaseControl() noexcept = 0;
   virtual void pressed() = 0;  // with the mouse: the control becomes the active one
+  // The keyboard focus has come to the graph or a field, or has left both.
   virtual void focusChanged(bool focused) = 0;
   virtual void windowDestroyed() noexcept = 0;
   // False while a form is being designed: the panel is a picture then, without input.
@@ -47,12 +52,17 @@ class MemoryPicture {
   Size sizePx_{};
 };
 
-class PanelWindow final : public GraphView {
+class PanelWindow final : public GraphView, private FieldsOwner {
  public:
   PanelWindow(WindowOwner& owner, ScreenMetrics metrics, Size initialSizePx);
   ~PanelWindow() override;
   // What is told about paints and input from now on; null for nobody.
   void events(PanelEvents* events) noexcept { events_ = events; }
+  // What is shown as child windows, null for nothing. Not while there is a window.
+  void fields(ControlSet* fields);
+  [[nodiscard]] bool hasFields() const noexcept { return fields_.has_value(); }
+  // Of the fields, at the screen's scale; it stays the caller's. Null for that of dialogs.
+  void font(HFONT font);
 
   // Makes the child window, hidden when the view is. Raises ComFailure.
   void create(HWND parent, const RECT& place);
@@ -62,8 +72,14 @@ class PanelWindow final : public GraphView {
   void place(const RECT& rect, const RECT* clip);
   // The size of the view while it has no window.
   void resizeMemory(Size sizePx);
-  // Composes the picture anew into memory of the view's size.
+  // Whether the graph or a field has the keyboard focus.
+  [[nodiscard]] bool hasFocus() const noexcept { return holds(GetFocus()); }
+  // For the container's message loop: the keys that move the focus among the fields. False for others.
+  bool translateKey(const MSG& message);
+  // Composes the picture of the whole panel anew, with its fields where they have windows.
   void render(MemoryPicture& picture);
+  // That of the graph alone.
+  void renderGraph(MemoryPicture& picture);
 
   // GraphView
   DcHandle hdc() override;
@@ -78,17 +94,34 @@ class PanelWindow final : public GraphView {
  private:
   static LRESULT CALLBACK windowProcedure(HWND window, UINT message, WPARAM wParam, LPARAM lParam) noexcept;
   [[nodiscard]] LRESULT handle(UINT message, WPARAM wParam, LPARAM lParam);
+  // The rest of the messages, of mouse, keyboard and menu.
+  [[nodiscard]] LRESULT handleInput(UINT message, WPARAM wParam, LPARAM lParam);
   void paint();
   void paintInto(HDC dc);
+  void print(HDC dc);
   void fillMargins(HDC dc);
+  void keyDown(WPARAM key);
+  [[nodiscard]] bool untranslatedKey(UINT message, WPARAM key);
+  void takeFocus();
+  [[nodiscard]] bool holds(HWND window) const noexcept;
+  bool showMenu(LPARAM position);
   void press(std::int16_t button, LPARAM position);
   void release(std::int16_t button, WPARAM keys, LPARAM position);
   [[nodiscard]] MouseEvent mouseEvent(std::int16_t button, LPARAM position) const;
   void showPointer() const;
+  [[nodiscard]] int dpi() const noexcept;
+
+  // FieldsOwner
+  void run(const std::function<void()>& body) noexcept override;
+  void focusMoved(HWND to) override;
+  bool inUse() const override { return owner_.inUse(); }
 
   WindowOwner& owner_;
   ScreenMetrics metrics_;
   PanelEvents* events_ = nullptr;
+  std::optional<Win32Controls> fields_;
+  HFONT font_ = nullptr;
+  bool focused_ = false;
   HWND window_ = nullptr;
   HDC windowDC_ = nullptr;
   Size memorySizePx_;

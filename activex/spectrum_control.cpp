@@ -37,10 +37,14 @@ SpectrumControl::SpectrumControl(IUnknown* outer) : FrontPanelControl(outer, kCl
                                   toUtf8(GetCommandLineW())},
                  requests(), *this);
   window().events(this);
+  window().fields(panel_->control().controls());
   panel_->Form_Resize();
 }
 
-SpectrumControl::~SpectrumControl() { window().events(nullptr); }
+SpectrumControl::~SpectrumControl() {
+  window().fields(nullptr);
+  window().events(nullptr);
+}
 
 void* SpectrumControl::findInterface(REFIID id) noexcept {
   if (id == IID_ISpectrumView || id == IID_IDispatch) return static_cast<ISpectrumView*>(this);

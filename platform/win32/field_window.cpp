@@ -135,8 +135,6 @@ class TextField final : public FieldWindow {
       case WM_LBUTTONUP:
         box_.userClick();
         break;
-      case WM_GETDLGCODE:
-        return original(message, wide, extra) | (wide == VK_RETURN ? DLGC_WANTMESSAGE : 0);
       default:
         break;
     }
@@ -151,6 +149,10 @@ class TextField final : public FieldWindow {
     return heard || turned(key == VK_UP);
   }
 
+  LRESULT wantedKeys(WPARAM key) const override {
+    return FieldWindow::wantedKeys(key) | (key == VK_RETURN ? DLGC_WANTMESSAGE : 0);
+  }
+
   bool turned(bool up) override {
     SpinButton* const spin = site().spinOf(box_);
     if (spin != nullptr) spin->press(up);
@@ -163,7 +165,7 @@ class TextField final : public FieldWindow {
     if (wide == kSelectAll) return box_.selectAll(), 0;
     const auto kept = static_cast<std::uint16_t>(typed(wide));
     // One line has no use for these; its class would beep.
-    const bool unused = kept == VK_RETURN || kept == VK_ESCAPE || kept == VK_TAB;
+    const bool unused = kept == VK_RETURN || kept == VK_ESCAPE;
     return kept == 0 || unused ? 0 : original(WM_CHAR, kept, extra);
   }
 
@@ -190,10 +192,18 @@ class ListField final : public FieldWindow {
         combo_(list.kind() == ControlKind::ComboBox),
         messages_(combo_ ? kComboMessages : kListMessages) {}
 
-  // A combo box is as high as its font wants; its window's height is that of the list when it drops down.
+  // A combo box is as high as what stands in it; its window's height is that of the list when it drops down.
   void place(const RECT& px) override {
+    if (!combo_) return FieldWindow::place(px);
     constexpr LONG kItemsInSight = 10;
-    const auto itemPx = combo_ ? static_cast<LONG>(SendMessageW(window(), CB_GETITEMHEIGHT, 0, 0)) : 0;
+    constexpr WPARAM kField = static_cast<WPARAM>(-1);  // in place of an item's number
+    RECT closed{};
+    GetWindowRect(window(), &closed);
+    const auto fieldPx = static_cast<LONG>(SendMessageW(window(), CB_GETITEMHEIGHT, kField, 0));
+    const LONG framePx = closed.bottom - closed.top - fieldPx;
+    if (!dropped() && px.bottom - px.top > framePx)
+      SendMessageW(window(), CB_SETITEMHEIGHT, kField, px.bottom - px.top - framePx);
+    const auto itemPx = static_cast<LONG>(SendMessageW(window(), CB_GETITEMHEIGHT, 0, 0));
     FieldWindow::place({px.left, px.top, px.right, px.bottom + kItemsInSight * itemPx});
   }
 
@@ -300,7 +310,55 @@ class ButtonField final : public FieldWindow {
     control().userClick();
     return true;
   }
+
+  LRESULT wantedKeys(WPARAM key) const override {
+    const bool enter = key == VK_RETURN && control().kind() == ControlKind::PushButton;
+    const bool arrows = control().kind() == ControlKind::OptionButton;
+    return FieldWindow::wantedKeys(key) | (enter ? DLGC_WANTMESSAGE : 0) | (arrows ? DLGC_WANTARROWS : 0);
+  }
 };
+
+// A push button without a caption: a slim strip along an edge, for the mouse alone.
+class StripField final : public FieldWindow {
+ public:
+  using FieldWindow::FieldWindow;
+
+  // The focus goes to what lies round the strip, which would show it nowhere.
+  void notified(WORD code) override {
+    if (code != BN_CLICKED) return;
+    control().userClick();
+    if (!gone() && GetFocus() == window()) SetFocus(GetParent(window()));
+  }
+
+  void draw(const DRAWITEMSTRUCT& item) override;
+
+ protected:
+  DWORD ownStyle() const override { return BS_OWNERDRAW; }
+
+  LRESULT handle(UINT message, WPARAM wide, LPARAM extra) override {
+    if (message != WM_SETCURSOR || !site().inUse()) return FieldWindow::handle(message, wide, extra);
+    SetCursor(LoadCursorW(nullptr, IDC_HAND));
+    return TRUE;
+  }
+};
+
+// Flat, with a grip in the middle: notches across the strip.
+void StripField::draw(const DRAWITEMSTRUCT& item) {
+  const bool pressed = (item.itemState & ODS_SELECTED) != 0;
+  const RECT& all = item.rcItem;
+  FillRect(item.hDC, &all, GetSysColorBrush(pressed ? COLOR_BTNSHADOW : COLOR_3DLIGHT));
+  const bool upright = all.bottom - all.top > all.right - all.left;
+  const LONG thicknessPx = upright ? all.right - all.left : all.bottom - all.top;
+  const LONG unitPx = std::max<LONG>(thicknessPx / 6, 1);
+  const LONG middlePx = (upright ? all.top + all.bottom : all.left + all.right) / 2;
+  constexpr LONG kNotches = 9;
+  for (LONG notch = -(kNotches / 2); notch <= kNotches / 2; ++notch) {
+    const LONG atPx = middlePx + notch * 4 * unitPx;
+    const RECT line = upright ? RECT{all.left + unitPx, atPx, all.right - unitPx, atPx + unitPx}
+                              : RECT{atPx, all.top + unitPx, atPx + unitPx, all.bottom - unitPx};
+    FillRect(item.hDC, &line, GetSysColorBrush(pressed ? COLOR_BTNHIGHLIGHT : COLOR_BTNSHADOW));
+  }
+}
 
 // --- Spin buttons
 
@@ -329,6 +387,8 @@ std::unique_ptr<FieldWindow> makeFieldWindow(Control& control, FieldSite& site) 
   if (auto* const box = dynamic_cast<TextBox*>(&control)) return std::make_unique<TextField>(*box, site);
   if (auto* const list = dynamic_cast<ItemList*>(&control)) return std::make_unique<ListField>(*list, site);
   if (auto* const spin = dynamic_cast<SpinButton*>(&control)) return std::make_unique<SpinField>(*spin, site);
+  if (control.kind() == ControlKind::PushButton && control.Caption().empty())
+    return std::make_unique<StripField>(control, site);
   if (facetsOf(control.kind()).takesFocus) return std::make_unique<ButtonField>(control, site);
   return std::make_unique<FieldWindow>(control, site);
 }
@@ -344,6 +404,22 @@ DWORD listStyle(const Control& control) {
   return CBS_AUTOHSCROLL | (list->Style() == ListStyle::SimpleCombo ? CBS_SIMPLE : CBS_DROPDOWN);
 }
 
+bool isHighContrast() {
+  HIGHCONTRASTW state{};
+  state.cbSize = sizeof state;
+  return SystemParametersInfoW(SPI_GETHIGHCONTRAST, sizeof state, &state, 0) != 0 &&
+         (state.dwFlags & HCF_HIGHCONTRASTON) != 0;
+}
+
+// A themed frame paints its caption in the theme's colour, whatever it is told.
+void theme(HWND window, bool themed) {
+  const HMODULE library = GetModuleHandleW(L"uxtheme.dll");
+  if (library == nullptr) return;
+  const auto set = reinterpret_cast<HRESULT(WINAPI*)(HWND, LPCWSTR, LPCWSTR)>(
+      reinterpret_cast<void*>(GetProcAddress(library, "SetWindowTheme")));
+  if (set != nullptr) set(window, themed ? nullptr : L"", themed ? nullptr : L"");
+}
+
 }  // namespace
 
 void FieldWindow::create(HWND parent, const RECT& px, DWORD moreStyle) {
@@ -357,8 +433,9 @@ void FieldWindow::create(HWND parent, const RECT& px, DWORD moreStyle) {
   const HWND window =
       CreateWindowExW(kind.extendedStyle, kind.className == nullptr ? areaClass() : kind.className,
                       captioned ? toUtf16(control_.Caption()).c_str() : L"",
-                      WS_CHILD | kind.style | listStyle(control_) | alignment | state | moreStyle, px.left,
-                      px.top, px.right - px.left, px.bottom - px.top, parent, nullptr, thisModule(), nullptr);
+                      WS_CHILD | kind.style | ownStyle() | listStyle(control_) | alignment | state | moreStyle,
+                      px.left, px.top, px.right - px.left, px.bottom - px.top, parent, nullptr, thisModule(),
+                      nullptr);
   if (window == nullptr) raiseOutOfMemory();
   window_ = window;
   SetWindowLongPtrW(window, GWLP_USERDATA, reinterpret_cast<LONG_PTR>(this));
@@ -366,6 +443,7 @@ void FieldWindow::create(HWND parent, const RECT& px, DWORD moreStyle) {
       SetWindowLongPtrW(window, GWLP_WNDPROC, reinterpret_cast<LONG_PTR>(procedure)));
   control_.peer(this);
   showFont();
+  if (control_.ForeColor()) showForeColor();
   showContents();
 }
 
@@ -391,6 +469,19 @@ void FieldWindow::showFont() {
   SendMessageW(window_, WM_SETFONT, reinterpret_cast<WPARAM>(site_.fontOf(control_)), TRUE);
 }
 
+void FieldWindow::showForeColor() {
+  if (control_.kind() == ControlKind::Frame) theme(window_, !control_.ForeColor());
+  InvalidateRect(window_, nullptr, TRUE);
+}
+
+bool FieldWindow::colored(HDC dc, LRESULT& brush) const {
+  if (!control_.ForeColor() || isHighContrast()) return false;
+  SetTextColor(dc, control_.ForeColor()->bgr);
+  SetBkColor(dc, GetSysColor(COLOR_BTNFACE));
+  brush = reinterpret_cast<LRESULT>(GetSysColorBrush(COLOR_BTNFACE));
+  return true;
+}
+
 void FieldWindow::changed(ControlChange what) {
   switch (what) {
     case ControlChange::Caption:
@@ -401,8 +492,10 @@ void FieldWindow::changed(ControlChange what) {
       return site_.showUsability();
     case ControlChange::Font:
       return showFont();
+    case ControlChange::ForeColor:
+      return showForeColor();
     case ControlChange::Place:
-      return site_.arrange();
+      return site_.arrange(control_);
     default:
       return;
   }
@@ -445,21 +538,28 @@ LRESULT FieldWindow::handle(UINT message, WPARAM wide, LPARAM extra) {
   switch (message) {
     case WM_SETFOCUS:
     case WM_KILLFOCUS:
-      result = original(message, wide, extra);
-      wheelRest_ = 0;
-      if (facetsOf(control_.kind()).takesFocus) control_.focusChanged(message == WM_SETFOCUS);
-      return result;
+      return focus(message == WM_SETFOCUS, wide, extra);
+    case WM_GETDLGCODE:
+      return original(message, wide, extra) | wantedKeys(wide);
     case WM_KEYDOWN:
-      if (keyDown(wide)) return 0;
+      if (site_.untranslatedKey(message, wide) || gone() || keyDown(wide)) return 0;
+      break;
+    case WM_SYSCHAR:
+      if (site_.untranslatedKey(message, wide) || gone()) return 0;
       break;
     case WM_CHAR:
       wide = static_cast<std::uint16_t>(typed(wide));
       if (wide == 0) return 0;
       break;
+    case WM_NCHITTEST:
+      if (!site_.inUse()) return HTTRANSPARENT;
+      break;
     case WM_MOUSEWHEEL:
       return wheel(wide, extra);
     case WM_COMMAND:
     case WM_NOTIFY:
+    case WM_CTLCOLORSTATIC:
+    case WM_DRAWITEM:
       if (site_.childMessage(message, wide, extra, result)) return result;
       break;
     case kDeferred:
@@ -470,12 +570,29 @@ LRESULT FieldWindow::handle(UINT message, WPARAM wide, LPARAM extra) {
   return original(message, wide, extra);
 }
 
+// The panel has the focus before its field, and loses it after.
+LRESULT FieldWindow::focus(bool gained, WPARAM wide, LPARAM extra) {
+  const LRESULT result = original(gained ? WM_SETFOCUS : WM_KILLFOCUS, wide, extra);
+  wheelRest_ = 0;
+  if (gained) site_.focusMoved(window_);
+  if (facetsOf(control_.kind()).takesFocus && !gone()) control_.focusChanged(gained);
+  if (!gained) site_.focusMoved(reinterpret_cast<HWND>(wide));
+  return result;
+}
+
+// Tab moves the focus within the panel first, so a dialog must not take it.
+LRESULT FieldWindow::wantedKeys(WPARAM /*key*/) const {
+  return facetsOf(control_.kind()).takesFocus ? DLGC_WANTTAB : 0;
+}
+
 bool FieldWindow::keyDown(WPARAM key) {
   if (control_.KeyDown) control_.KeyDown(static_cast<std::int16_t>(key), shiftState());
   return gone();
 }
 
+// Tab is what the focus has come here by, or leaves by: nothing is typed.
 std::int16_t FieldWindow::typed(WPARAM character) {
+  if (character == VK_TAB) return 0;
   auto kept = static_cast<std::int16_t>(character);
   if (control_.KeyPress) control_.KeyPress(kept);
   return gone() ? std::int16_t{0} : kept;

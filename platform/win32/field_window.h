@@ -18,14 +18,19 @@ class FieldSite : public std::enable_shared_from_this<FieldSite> {
 
   // Runs what a message causes. Nothing that it throws gets out.
   virtual void run(const std::function<void()>& body) noexcept = 0;
-  // Moves every window to the place of its control; shows and enables it as far as its frames are.
-  virtual void arrange() = 0;
+  // Moves the window of a control, and the others that go with it, to their places.
+  virtual void arrange(const Control& moved) = 0;
+  // Shows and enables every window as far as its control's frames are.
   virtual void showUsability() = 0;
   // Valid until the site's fonts change.
   [[nodiscard]] virtual HFONT fontOf(const Control& control) const = 0;
   [[nodiscard]] virtual SpinButton* spinOf(const Control& control) const = 0;
   // What a child tells its parent's window procedure; false for what does not concern a field.
   virtual bool childMessage(UINT message, WPARAM wide, LPARAM extra, LRESULT& result) = 0;
+  // A key that reaches a field without having been translated; false for what does not move the focus.
+  virtual bool untranslatedKey(UINT message, WPARAM key) = 0;
+  virtual void focusMoved(HWND to) = 0;
+  [[nodiscard]] virtual bool inUse() const = 0;
 
   // Keeps the fields, also those that are let go of, until the message at hand is through.
   class Visit {
@@ -69,6 +74,10 @@ class FieldWindow : public ControlPeer {
   virtual void notified(WORD /*code*/) {}
   // An arrow of a spin button was pressed.
   virtual void stepped(bool /*up*/) {}
+  // Colours of a caption; false for those of the system. The brush is the result.
+  [[nodiscard]] bool colored(HDC dc, LRESULT& brush) const;
+  // For windows that leave their painting to their parent.
+  virtual void draw(const DRAWITEMSTRUCT& /*item*/) {}
 
   // ControlPeer
   void changed(ControlChange what) override;
@@ -79,8 +88,12 @@ class FieldWindow : public ControlPeer {
   // One message, with the meaning that the window's class gives to it unless a kind knows better.
   [[nodiscard]] virtual LRESULT handle(UINT message, WPARAM wide, LPARAM extra);
   [[nodiscard]] LRESULT original(UINT message, WPARAM wide, LPARAM extra);
+  // Styles beyond those of its kind.
+  [[nodiscard]] virtual DWORD ownStyle() const { return 0; }
   // Everything of the model that its kind shows beyond the caption.
   virtual void showContents() {}
+  // The keys that a dialog is to leave to the window, beyond those that its class asks for.
+  [[nodiscard]] virtual LRESULT wantedKeys(WPARAM key) const;
   // Work that must wait until the window's own procedure has returned, as it cannot bear to be destroyed.
   void defer(WPARAM work) const { PostMessageW(window_, kDeferred, work, 0); }
   virtual void deferred(WPARAM /*work*/) {}
@@ -97,6 +110,8 @@ class FieldWindow : public ControlPeer {
   static constexpr UINT kDeferred = WM_APP + 70;
 
   static LRESULT CALLBACK procedure(HWND window, UINT message, WPARAM wide, LPARAM extra) noexcept;
+  [[nodiscard]] LRESULT focus(bool gained, WPARAM wide, LPARAM extra);
+  void showForeColor();
   [[nodiscard]] LRESULT wheel(WPARAM wide, LPARAM extra);
   void windowGone();
 

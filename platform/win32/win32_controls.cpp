@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <array>
+#include <cwchar>
 #include <iterator>
 #include <map>
 #include <type_traits>
@@ -42,13 +43,16 @@ int dpiOf(HWND window) {
 
 int pixels(float twips, int dpi) { return MulDiv(static_cast<int>(twips), dpi, kTwipsPerInch); }
 
+// The font that dialogs are laid out for, as panels are: the one of message boxes is wider on some systems
+// and would not find room in places that are fixed.
 LOGFONTW dialogFont(int dpi) {
-  NONCLIENTMETRICSW metrics{};
-  metrics.cbSize = sizeof metrics;
+  constexpr int kPoints = 8;
+  constexpr int kPointsPerInch = 72;
   LOGFONTW font{};
-  if (SystemParametersInfoW(SPI_GETNONCLIENTMETRICS, sizeof metrics, &metrics, 0) != 0)
-    font = metrics.lfMessageFont;
-  font.lfHeight = MulDiv(font.lfHeight, dpi, screenDpi());
+  font.lfHeight = -MulDiv(kPoints, dpi, kPointsPerInch);
+  font.lfWeight = FW_NORMAL;
+  font.lfCharSet = DEFAULT_CHARSET;
+  std::wcscpy(font.lfFaceName, L"MS Shell Dlg 2");
   return font;
 }
 
@@ -88,21 +92,29 @@ const Control* areaOf(const Control& control) {
 
 class FieldWindows final : public FieldSite {
  public:
-  FieldWindows(ControlSet& set, Win32Controls::Barrier barrier) : set_(set), barrier_(std::move(barrier)) {}
+  FieldWindows(ControlSet& set, FieldsOwner& owner) noexcept : set_(set), owner_(&owner) {}
 
-  void create(HWND parent, HFONT font);
+  void create(HWND parent, HFONT font, int dpi);
   void destroy() noexcept;
-  void rescale(HFONT font);
+  void rescale(HFONT font, int dpi);
+  // The owner goes; a message of a field may still be under way.
+  void disown() noexcept { owner_ = nullptr; }
   bool translateKey(const MSG& message);
+  bool enter(bool forward);
   [[nodiscard]] FieldWindow* fieldOf(const Control& control) const noexcept;
 
   // FieldSite
   void run(const std::function<void()>& body) noexcept override;
-  void arrange() override;
+  void arrange(const Control& moved) override;
   void showUsability() override;
   [[nodiscard]] HFONT fontOf(const Control& control) const override { return fonts_.of(control); }
   [[nodiscard]] SpinButton* spinOf(const Control& control) const override;
   bool childMessage(UINT message, WPARAM wide, LPARAM extra, LRESULT& result) override;
+  bool untranslatedKey(UINT message, WPARAM key) override;
+  void focusMoved(HWND to) override {
+    if (owner_ != nullptr) owner_->focusMoved(to);
+  }
+  [[nodiscard]] bool inUse() const override { return owner_ == nullptr || owner_->inUse(); }
 
  protected:
   void allLeft() noexcept override { retired_.clear(); }
@@ -111,16 +123,21 @@ class FieldWindows final : public FieldSite {
   using Fields = std::vector<std::unique_ptr<FieldWindow>>;
 
   void makeWindows();
+  void arrange();
   void orderWindows();
   [[nodiscard]] DWORD tabStyle(const Control& control) const;
   [[nodiscard]] RECT placeOf(const Control& control) const;
   [[nodiscard]] FieldWindow* fieldOf(HWND window) const noexcept;
-  bool pressed(const MSG& message);
+  bool notified(LPARAM extra, LRESULT& result);
+  bool pressed(UINT message, WPARAM key);
+  void showFocus() const;
+  void goOn(bool forward) const;
   void showCues(WORD hidden) const;
 
   ControlSet& set_;
-  Win32Controls::Barrier barrier_;
+  FieldsOwner* owner_;
   HWND parent_ = nullptr;
+  int dpi_ = kUsualDpi;
   FieldFonts fonts_;
   Fields fields_;
   Fields retired_;
@@ -128,10 +145,11 @@ class FieldWindows final : public FieldSite {
 
 // --- Making and placing
 
-void FieldWindows::create(HWND parent, HFONT font) {
+void FieldWindows::create(HWND parent, HFONT font, int dpi) {
   destroy();
   parent_ = parent;
-  fonts_ = FieldFonts(font, dpiOf(parent));
+  dpi_ = dpi > 0 ? dpi : dpiOf(parent);
+  fonts_ = FieldFonts(font, dpi_);
   try {
     makeWindows();
   } catch (...) {
@@ -180,14 +198,16 @@ DWORD FieldWindows::tabStyle(const Control& control) const {
 void FieldWindows::destroy() noexcept {
   Fields gone;
   gone.swap(fields_);
+  parent_ = nullptr;
   for (const auto& field : gone) field->destroy();
   // The procedure of one of them may be what has led here.
   if (visited()) std::move(gone.begin(), gone.end(), std::back_inserter(retired_));
 }
 
-void FieldWindows::rescale(HFONT font) {
+void FieldWindows::rescale(HFONT font, int dpi) {
   if (parent_ == nullptr) return;
-  const FieldFonts before = std::exchange(fonts_, FieldFonts(font, dpiOf(parent_)));
+  dpi_ = dpi > 0 ? dpi : dpiOf(parent_);
+  const FieldFonts before = std::exchange(fonts_, FieldFonts(font, dpi_));
   for (const auto& field : fields_) field->showFont();
   arrange();
 }
@@ -199,14 +219,23 @@ RECT FieldWindows::placeOf(const Control& control) const {
     place.leftTwips += frame->place().leftTwips;
     place.topTwips += frame->place().topTwips;
   }
-  const int dpi = dpiOf(parent_);
-  return {pixels(place.leftTwips, dpi), pixels(place.topTwips, dpi),
-          pixels(place.leftTwips + place.widthTwips, dpi), pixels(place.topTwips + place.heightTwips, dpi)};
+  return {pixels(place.leftTwips, dpi_), pixels(place.topTwips, dpi_),
+          pixels(place.leftTwips + place.widthTwips, dpi_),
+          pixels(place.topTwips + place.heightTwips, dpi_)};
 }
 
 void FieldWindows::arrange() {
   for (const auto& field : fields_)
     if (field->window() != nullptr) field->place(placeOf(field->control()));
+}
+
+// What lies in an area goes with the area's window; a frame holds no windows.
+void FieldWindows::arrange(const Control& moved) {
+  for (const auto& field : fields_) {
+    const Control& control = field->control();
+    const bool goesAlong = areaOf(control) == areaOf(moved) && control.liesIn(moved);
+    if (field->window() != nullptr && (&control == &moved || goesAlong)) field->place(placeOf(control));
+  }
 }
 
 // By index: a field that is disabled loses the focus, and what then happens may take the fields away.
@@ -240,24 +269,38 @@ SpinButton* FieldWindows::spinOf(const Control& control) const {
 // --- Messages
 
 void FieldWindows::run(const std::function<void()>& body) noexcept {
+  if (owner_ != nullptr) return owner_->run(body);
   try {
-    if (barrier_)
-      barrier_(body);
-    else
-      body();
+    body();
   } catch (...) {
-    // Nobody was named who would want to know.
+    // Nobody is left who would want to know.
   }
 }
 
 bool FieldWindows::childMessage(UINT message, WPARAM wide, LPARAM extra, LRESULT& result) {
   result = 0;
-  if (message == WM_COMMAND) {
-    FieldWindow* const field = fieldOf(reinterpret_cast<HWND>(extra));
-    if (field != nullptr) field->notified(HIWORD(wide));
-    return field != nullptr;
+  FieldWindow* field = nullptr;
+  switch (message) {
+    case WM_COMMAND:
+      field = fieldOf(reinterpret_cast<HWND>(extra));
+      if (field != nullptr) field->notified(HIWORD(wide));
+      return field != nullptr;
+    case WM_CTLCOLORSTATIC:
+      field = fieldOf(reinterpret_cast<HWND>(extra));
+      return field != nullptr && field->colored(reinterpret_cast<HDC>(wide), result);
+    case WM_DRAWITEM:
+      field = fieldOf(reinterpret_cast<const DRAWITEMSTRUCT*>(extra)->hwndItem);
+      if (field != nullptr) field->draw(*reinterpret_cast<const DRAWITEMSTRUCT*>(extra));
+      result = TRUE;
+      return field != nullptr;
+    case WM_NOTIFY:
+      return notified(extra, result);
+    default:
+      return false;
   }
-  if (message != WM_NOTIFY) return false;
+}
+
+bool FieldWindows::notified(LPARAM extra, LRESULT& result) {
   const auto& header = *reinterpret_cast<const NMHDR*>(extra);
   FieldWindow* const field = fieldOf(header.hwndFrom);
   if (field == nullptr || header.code != static_cast<UINT>(UDN_DELTAPOS)) return false;
@@ -268,28 +311,56 @@ bool FieldWindows::childMessage(UINT message, WPARAM wide, LPARAM extra, LRESULT
 
 bool FieldWindows::translateKey(const MSG& message) {
   bool used = false;
-  const auto body = [&] { used = pressed(message); };
+  const auto body = [&] { used = pressed(message.message, message.wParam); };
   if (parent_ != nullptr && (message.hwnd == parent_ || IsChild(parent_, message.hwnd))) run(std::cref(body));
   return used;
 }
 
-bool FieldWindows::pressed(const MSG& message) {
-  if (message.message == WM_SYSKEYDOWN && message.wParam == VK_MENU)
-    showCues(UISF_HIDEACCEL | UISF_HIDEFOCUS);
+bool FieldWindows::pressed(UINT message, WPARAM key) {
+  if (message == WM_SYSKEYDOWN && key == VK_MENU) showCues(UISF_HIDEACCEL | UISF_HIDEFOCUS);
   bool moved = false;
-  if (message.message == WM_SYSCHAR) {
-    moved = set_.accessKey(static_cast<char32_t>(message.wParam));
-  } else if (message.message == WM_KEYDOWN && set_.focused() != nullptr && GetKeyState(VK_CONTROL) >= 0) {
-    const WPARAM key = message.wParam;
+  if (message == WM_SYSCHAR) {
+    moved = set_.accessKey(static_cast<char32_t>(key));
+  } else if (message == WM_KEYDOWN && set_.focused() != nullptr && GetKeyState(VK_CONTROL) >= 0) {
     if (key == VK_TAB)
       moved = set_.tab(GetKeyState(VK_SHIFT) >= 0);
     else if (key == VK_UP || key == VK_LEFT || key == VK_DOWN || key == VK_RIGHT)
       moved = set_.arrow(key == VK_DOWN || key == VK_RIGHT);
   }
-  if (!moved) return false;
+  if (moved) showFocus();
+  return moved;
+}
+
+// A text box that is entered by a key is selected, so that what is typed next replaces it.
+void FieldWindows::showFocus() const {
   showCues(UISF_HIDEFOCUS);
   if (auto* const box = dynamic_cast<TextBox*>(set_.focused())) box->selectAll();
-  return true;
+}
+
+bool FieldWindows::enter(bool forward) {
+  bool entered = false;
+  const auto body = [&] {
+    Control* const first = parent_ == nullptr ? nullptr : set_.nextStop(nullptr, forward);
+    if (first == nullptr) return;
+    first->SetFocus();
+    showFocus();
+    entered = true;
+  };
+  run(std::cref(body));
+  return entered;
+}
+
+bool FieldWindows::untranslatedKey(UINT message, WPARAM key) {
+  if (pressed(message, key)) return true;
+  const bool leaves = message == WM_KEYDOWN && key == VK_TAB && GetKeyState(VK_CONTROL) >= 0;
+  if (leaves) goOn(GetKeyState(VK_SHIFT) >= 0);
+  return leaves;
+}
+
+void FieldWindows::goOn(bool forward) const {
+  const HWND next =
+      GetNextDlgTabItem(GetAncestor(parent_, GA_ROOT), parent_, static_cast<BOOL>(!forward));
+  if (next != nullptr && next != parent_ && !IsChild(parent_, next)) SetFocus(next);
 }
 
 // Underlined keys and focus rectangles come into sight with the first key that needs them.
@@ -299,19 +370,22 @@ void FieldWindows::showCues(WORD hidden) const {
 
 // --- The owner's side
 
-Win32Controls::Win32Controls(ControlSet& set, Barrier barrier)
-    : windows_(std::make_shared<FieldWindows>(set, std::move(barrier))) {}
+Win32Controls::Win32Controls(ControlSet& set, FieldsOwner& owner)
+    : windows_(std::make_shared<FieldWindows>(set, owner)) {}
 
-Win32Controls::~Win32Controls() { destroy(); }
+Win32Controls::~Win32Controls() {
+  destroy();
+  windows_->disown();
+}
 
-void Win32Controls::create(HWND parent, HFONT font) { windows_->create(parent, font); }
+void Win32Controls::create(HWND parent, HFONT font, int dpi) { windows_->create(parent, font, dpi); }
 
 void Win32Controls::destroy() noexcept {
   const FieldSite::Visit visit(*windows_);
   windows_->destroy();
 }
 
-void Win32Controls::rescale(HFONT font) { windows_->rescale(font); }
+void Win32Controls::rescale(HFONT font, int dpi) { windows_->rescale(font, dpi); }
 
 bool Win32Controls::parentMessage(UINT message, WPARAM wide, LPARAM extra, LRESULT& result) {
   const FieldSite::Visit visit(*windows_);
@@ -325,6 +399,20 @@ bool Win32Controls::parentMessage(UINT message, WPARAM wide, LPARAM extra, LRESU
 bool Win32Controls::translateKey(const MSG& message) {
   const FieldSite::Visit visit(*windows_);
   return windows_->translateKey(message);
+}
+
+bool Win32Controls::enter(bool forward) {
+  const FieldSite::Visit visit(*windows_);
+  return windows_->enter(forward);
+}
+
+bool Win32Controls::untranslatedKey(UINT message, WPARAM key) {
+  const FieldSite::Visit visit(*windows_);
+  FieldWindows& windows = *windows_;
+  bool used = false;
+  const auto body = [&] { used = windows.untranslatedKey(message, key); };
+  windows.run(std::cref(body));
+  return used;
 }
 
 HWND Win32Controls::window(const Control& control) const noexcept {

@@ -41,7 +41,7 @@ HWND frameWindow() {
 }
 
 // The panel in a window that holds it as a control's window would.
-class WindowPanel final : public SamplePanel {
+class WindowPanel final : public SamplePanel, public FieldsOwner {
  public:
   WindowPanel();
   ~WindowPanel() override {
@@ -65,6 +65,7 @@ class WindowPanel final : public SamplePanel {
   [[nodiscard]] std::string value(Control& control) override;
 
  private:
+  void run(const std::function<void()>& body) noexcept override;
   static LRESULT CALLBACK procedure(HWND window, UINT message, WPARAM wide, LPARAM extra) noexcept;
   void pump();
 };
@@ -80,15 +81,17 @@ WindowPanel::WindowPanel() {
   window = CreateWindowExW(0, L"SamplePanel", L"", WS_CHILD | WS_VISIBLE | WS_CLIPCHILDREN, 0, 0,
                            inPixels(kPanelWidthTwips), inPixels(kPanelHeightTwips), frameWindow(), nullptr,
                            GetModuleHandleW(nullptr), this);
-  controls.emplace(set, [this](const std::function<void()>& body) {
-    try {
-      body();
-    } catch (const RuntimeError&) {
-      ++failures;
-    }
-  });
+  controls.emplace(set, *this);
   controls->create(window);
   pump();
+}
+
+void WindowPanel::run(const std::function<void()>& body) noexcept {
+  try {
+    body();
+  } catch (const RuntimeError&) {
+    ++failures;
+  }
 }
 
 LRESULT CALLBACK WindowPanel::procedure(HWND window, UINT message, WPARAM wide, LPARAM extra) noexcept {

@@ -11,7 +11,7 @@ if [ "${FRONTPANELS_WINE_SESSION:-}" != yes ]; then
   export FRONTPANELS_WINE_SESSION=yes WINEPREFIX="$root/build/wine" WINEDEBUG=-all WINEDLLOVERRIDES='mscoree,mshtml='
   wineserver -k >/dev/null 2>&1
   mkdir -p "$WINEPREFIX"
-  exec xvfb-run -a -s '-screen 0 1024x768x24' bash "$0" "$@"
+  exec xvfb-run -a -s '-screen 0 1280x1024x24' bash "$0" "$@"
 fi
 
 here=$root/tests/wine
@@ -62,17 +62,19 @@ unit_tests() {
   grep -E 'FAILED|Failure' "$out/cross_tests.txt"
 }
 
-# The fields of a panel at the usual scale and at a larger one, which programs learn with the session.
+# The fields of a panel, alone and in the registered control, at the usual scale and at a larger one, which programs
+# learn with the session.
 fields() {
   local dpi key='HKCU\Control Panel\Desktop' pictures=$root/build/screenshots
   mkdir -p "$pictures"
-  rm -f "$pictures"/controls_*.png
+  rm -f "$pictures"/controls_*.png "$pictures"/panel_*.png
   for dpi in 144 96; do
     wine reg add "$key" /v LogPixels /t REG_DWORD /d "$dpi" /f >/dev/null 2>&1
     wineserver -k
     wineserver -w
-    program "fields_$dpi" controls_test "$(windows_path "$pictures")"
-    [ -s "$pictures/controls_$dpi.png" ]
+    program "controls_$dpi" controls_test "$(windows_path "$pictures")"
+    program "fields_$dpi" fields_test "$(windows_path "$pictures")"
+    [ -s "$pictures/controls_$dpi.png" ] && [ -s "$pictures/panel_whole_$dpi.png" ]
     judge $? "the fields are pictured at $dpi dots an inch"
   done
 }
@@ -144,6 +146,7 @@ script late_bound.vbs
 program container container_test "$(windows_path "$out")"
 program contract contract_test
 program foreign_container contract_test atl atl.dll
+fields
 if [ -f "$here/workbench.sh" ]; then
   bash "$here/workbench.sh" >"$out/workbench.txt" 2>&1
   grep -E '^(ok|not ok) ' "$out/workbench.txt"
@@ -155,7 +158,6 @@ export_classes undone
 cmp -s "$out/before.txt" "$out/undone.txt"
 judge $? "the registry is as it was before, key by key"
 for_one_user
-fields
 wineserver -k >/dev/null 2>&1
 
 printf '%d passed, %d failed\n' "$passed" "$failed"
