@@ -151,8 +151,8 @@ HRESULT InPlacePart::TranslateAccelerator(LPMSG message) {
     if (core().window().translateKey(*message)) return S_OK;
     const bool pressed = message->message == WM_KEYDOWN;
     if ((pressed || message->message == WM_CHAR) && core().window().hasFocus()) {
-      const LRESULT wanted = SendMessageW(message->hwnd, WM_GETDLGCODE, message->wParam,
-                                          reinterpret_cast<LPARAM>(message));
+      const LRESULT wanted =
+          SendMessageW(message->hwnd, WM_GETDLGCODE, message->wParam, reinterpret_cast<LPARAM>(message));
       if (pressed && (wanted & DLGC_WANTMESSAGE) != 0) return dispatch(*message);
       const bool own = pressed ? (wanted & DLGC_WANTARROWS) != 0 && isArrow(message->wParam)
                                : (wanted & DLGC_WANTCHARS) != 0;

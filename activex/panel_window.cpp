@@ -373,8 +373,8 @@ void PanelWindow::run(const std::function<void()>& body) noexcept {
 
 bool PanelWindow::translateKey(const MSG& message) {
   if (!fields_ || window_ == nullptr || !owner_.inUse()) return false;
-  const bool tab = message.message == WM_KEYDOWN && message.wParam == VK_TAB &&
-                   GetKeyState(VK_SHIFT) >= 0 && GetKeyState(VK_CONTROL) >= 0;
+  const bool tab = message.message == WM_KEYDOWN && message.wParam == VK_TAB && GetKeyState(VK_SHIFT) >= 0 &&
+                   GetKeyState(VK_CONTROL) >= 0;
   if (tab && message.hwnd == window_) return fields_->enter(true);
   return fields_->translateKey(message);
 }

@@ -1,6 +1,6 @@
 // The window of a panel: its graph, and round it its fields as child windows. Before the control is active
-// there is none, and the graph is drawn into a bitmap in memory instead, so that a panel that a script created
-// works like one on a form.
+// there is none, and the graph is drawn into a bitmap in memory instead, so that a panel that a script
+// created works like one on a form.
 #pragma once
 
 #include <windows.h>

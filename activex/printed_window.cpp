@@ -3,8 +3,8 @@
 namespace frontpanels::activex {
 namespace {
 
-// Edge first, then what the window and its children show inside it. Not all systems that run the control print
-// edges or children by themselves.
+// Edge first, then what the window and its children show inside it. Not all systems that run the control
+// print edges or children by themselves.
 void printWindow(HWND window, HDC dc, const RECT& place) {
   const int saved = SaveDC(dc);
   IntersectClipRect(dc, place.left, place.top, place.right, place.bottom);

@@ -37,7 +37,7 @@ SpectrumControl::SpectrumControl(IUnknown* outer) : FrontPanelControl(outer, kCl
                                   toUtf8(GetCommandLineW())},
                  requests(), *this);
   window().events(this);
-  window().fields(panel_->control().controls());
+  window().fields(panel_->controls());
   panel_->Form_Resize();
 }
 

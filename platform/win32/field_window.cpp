@@ -430,12 +430,11 @@ void FieldWindow::create(HWND parent, const RECT& px, DWORD moreStyle) {
   const DWORD state =
       (control_.reallyVisible() ? WS_VISIBLE : 0) | (control_.reallyEnabled() ? 0 : WS_DISABLED);
   const bool captioned = facetsOf(control_.kind()).hasCaption;
-  const HWND window =
-      CreateWindowExW(kind.extendedStyle, kind.className == nullptr ? areaClass() : kind.className,
-                      captioned ? toUtf16(control_.Caption()).c_str() : L"",
-                      WS_CHILD | kind.style | ownStyle() | listStyle(control_) | alignment | state | moreStyle,
-                      px.left, px.top, px.right - px.left, px.bottom - px.top, parent, nullptr, thisModule(),
-                      nullptr);
+  const HWND window = CreateWindowExW(
+      kind.extendedStyle, kind.className == nullptr ? areaClass() : kind.className,
+      captioned ? toUtf16(control_.Caption()).c_str() : L"",
+      WS_CHILD | kind.style | ownStyle() | listStyle(control_) | alignment | state | moreStyle, px.left,
+      px.top, px.right - px.left, px.bottom - px.top, parent, nullptr, thisModule(), nullptr);
   if (window == nullptr) raiseOutOfMemory();
   window_ = window;
   SetWindowLongPtrW(window, GWLP_USERDATA, reinterpret_cast<LONG_PTR>(this));

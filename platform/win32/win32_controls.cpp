@@ -220,8 +220,7 @@ RECT FieldWindows::placeOf(const Control& control) const {
     place.topTwips += frame->place().topTwips;
   }
   return {pixels(place.leftTwips, dpi_), pixels(place.topTwips, dpi_),
-          pixels(place.leftTwips + place.widthTwips, dpi_),
-          pixels(place.topTwips + place.heightTwips, dpi_)};
+          pixels(place.leftTwips + place.widthTwips, dpi_), pixels(place.topTwips + place.heightTwips, dpi_)};
 }
 
 void FieldWindows::arrange() {
@@ -358,8 +357,7 @@ bool FieldWindows::untranslatedKey(UINT message, WPARAM key) {
 }
 
 void FieldWindows::goOn(bool forward) const {
-  const HWND next =
-      GetNextDlgTabItem(GetAncestor(parent_, GA_ROOT), parent_, static_cast<BOOL>(!forward));
+  const HWND next = GetNextDlgTabItem(GetAncestor(parent_, GA_ROOT), parent_, static_cast<BOOL>(!forward));
   if (next != nullptr && next != parent_ && !IsChild(parent_, next)) SetFocus(next);
 }
 

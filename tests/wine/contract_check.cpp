@@ -455,10 +455,10 @@ void capturesTheMouse(HWND window) {
   const HWND view = hosted.window();
   SendMessageW(view, WM_LBUTTONDOWN, MK_LBUTTON, MAKELPARAM(50, 50));
   expect(GetCapture() == view, "a press takes the capture");
-  SendMessageW(view, WM_RBUTTONDOWN, MK_LBUTTON | MK_RBUTTON, MAKELPARAM(50, 50));
-  SendMessageW(view, WM_LBUTTONUP, MK_RBUTTON, MAKELPARAM(-500, 50));
+  SendMessageW(view, WM_MBUTTONDOWN, MK_LBUTTON | MK_MBUTTON, MAKELPARAM(50, 50));
+  SendMessageW(view, WM_LBUTTONUP, MK_MBUTTON, MAKELPARAM(-500, 50));
   expect(GetCapture() == view, "which lasts while a button is down");
-  SendMessageW(view, WM_RBUTTONUP, 0, MAKELPARAM(50, 50));
+  SendMessageW(view, WM_MBUTTONUP, 0, MAKELPARAM(50, 50));
   expect(GetCapture() == nullptr, "and ends with the last one");
 }
 

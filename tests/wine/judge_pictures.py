@@ -38,8 +38,13 @@ def traced_columns(rows):
     return sum(any(map(is_trace, column)) for column in zip(*rows)) / len(rows[0])
 
 
+# In the window the strips that collapse the areas lie on the graph's right and lower edge.
+STRIP_PX = 6
+
+
 def stands_in(window, graph):
     """Whether the graph's rows are found in the window, one below the other."""
+    graph = [row[:-STRIP_PX] for row in graph[:-STRIP_PX]]
     lines = [bytes(v for pixel in row for v in pixel) for row in window]
     wanted = [bytes(v for pixel in row for v in pixel) for row in graph]
     for top in range(len(lines) - len(wanted) + 1):
