@@ -146,6 +146,7 @@ script late_bound.vbs
 program container container_test "$(windows_path "$out")"
 program contract contract_test
 program foreign_container contract_test atl atl.dll
+program closed_loop closed_loop_test
 fields
 if [ -f "$here/workbench.sh" ]; then
   bash "$here/workbench.sh" >"$out/workbench.txt" 2>&1

@@ -93,12 +93,34 @@ leaves() {
   until [ -s "$hands/$1" ] || [ "$SECONDS" -ge "$deadline" ]; do sleep 0.1; done
   if [ -s "$hands/$1" ]; then ok "by hand: $2"; else not_ok "by hand: $2"; fi
 }
+# stands FILE PLACE WHAT: within half a minute the carrier comes to stand there, in thousandths of the graph.
+stands() {
+  local deadline=$((SECONDS + 30)) place=
+  until [ "$((${place:-0} - $2))" -ge -6 ] && [ "$((${place:-0} - $2))" -le 6 ] || [ "$SECONDS" -ge "$deadline" ]; do
+    place=$(python3 "$root/tests/wine/peak_place.py" "$hands/whole.png" "$hands/$1" 2>/dev/null) || sleep 0.1
+  done
+  if [ "$SECONDS" -lt "$deadline" ]; then ok "by hand: $3"; else not_ok "by hand: $3: the carrier stands at ${place:-no place}"; fi
+}
 hands=$out/hands
 timeout 120 wine "$program" "$(windows_path "$recording")" --screenshots "$(windows_path "$hands")" --sweeps 1 &
 workbench=$!
 leaves spectrum-0001.png "plays as soon as it is open"
 tell FrontPanelsWorkbench key:$F7
 leaves spectrum-0002.png "F7 takes one sweep"
+
+# 100 to 101.99 MHz; the carrier is at 100.2, 100.4 and 100.6 MHz.
+cp "$hands/spectrum-0002.png" "$hands/whole.png"
+tell FrontPanelsWorkbench 'type:<Center>=100.4M'
+stands spectrum-0002.png 500 "a centre typed into the panel tunes to the carrier at once"
+tell FrontPanelsWorkbench 'type:<Span>=800k'
+tell FrontPanelsWorkbench 'click:<Single>'
+stands spectrum-0003.png 750 "the next sweep is one of the range asked for"
+tell FrontPanelsWorkbench 'click:<Single>'
+stands spectrum-0001.png 250 "a single sweep at the end begins anew, in the same range"
+tell FrontPanelsWorkbench key:$F8 'click:<Cont.>'
+stands spectrum-0003.png 302 "begun anew it plays whole sweeps again"
+rm "$hands"/*-0003.png
+
 tell FrontPanelsWorkbench command:$CLOSE_PANEL key:$F8 key:$F7 key:$F7 key:$F7
 leaves window-0003.png "steps without a panel"
 [ ! -e "$hands/spectrum-0003.png" ] && ok "by hand: no panel, no picture of one" || not_ok "by hand: a picture of a closed panel"
