@@ -1,13 +1,13 @@
 #include "activex/printed_window.h"
 
+#include "activex/panel_window.h"
+
 namespace frontpanels::activex {
 namespace {
 
-// Edge first, then what the window and its children show inside it. Not all systems that run the control
-// print edges or children by themselves.
+// Each into memory of its own: some systems that run the control clip a window's picture as if it began at
+// the context's corner, and print neither edges nor children by themselves.
 void printWindow(HWND window, HDC dc, const RECT& place) {
-  const int saved = SaveDC(dc);
-  IntersectClipRect(dc, place.left, place.top, place.right, place.bottom);
   if ((GetWindowLongW(window, GWL_EXSTYLE) & WS_EX_CLIENTEDGE) != 0) {
     RECT edge = place;
     DrawEdge(dc, &edge, EDGE_SUNKEN, BF_RECT);
@@ -15,13 +15,17 @@ void printWindow(HWND window, HDC dc, const RECT& place) {
   RECT client{};
   GetClientRect(window, &client);
   MapWindowPoints(window, GetParent(window), reinterpret_cast<POINT*>(&client), 2);
-  IntersectClipRect(dc, client.left, client.top, client.right, client.bottom);
-  OffsetViewportOrgEx(dc, client.left, client.top, nullptr);
-  const auto context = reinterpret_cast<WPARAM>(dc);
+  const Size size{client.right - client.left, client.bottom - client.top};
+  if (size.width <= 0 || size.height <= 0) return;
+  MemoryPicture picture;
+  picture.create(size);
+  // What lies below shines through a frame.
+  BitBlt(picture.dc(), 0, 0, size.width, size.height, dc, client.left, client.top, SRCCOPY);
+  const auto context = reinterpret_cast<WPARAM>(picture.dc());
   SendMessageW(window, WM_ERASEBKGND, context, 0);
   SendMessageW(window, WM_PRINTCLIENT, context, PRF_CLIENT);
-  printChildren(window, dc);
-  RestoreDC(dc, saved);
+  printChildren(window, picture.dc());
+  BitBlt(dc, client.left, client.top, size.width, size.height, picture.dc(), 0, 0, SRCCOPY);
 }
 
 }  // namespace

@@ -6,7 +6,7 @@
 namespace frontpanels::activex {
 
 // Paints what lies in a window, windows within windows too, into a context whose origin is that of the
-// window's client area. The window itself is the caller's to paint.
+// window's client area. The window itself is the caller's to paint. Raises std::bad_alloc.
 void printChildren(HWND window, HDC dc);
 
 }  // namespace frontpanels::activex

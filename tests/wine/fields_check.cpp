@@ -3,8 +3,10 @@
 #include <windows.h>
 
 #include <objbase.h>
+#include <olectl.h>
 
 #include <algorithm>
+#include <cstdio>
 #include <functional>
 #include <span>
 #include <string>
@@ -24,6 +26,8 @@ int screenDpi() {
   ReleaseDC(nullptr, screen);
   return dpi;
 }
+
+constexpr const wchar_t* kMenuClass = L"#32768";
 
 int inPixels(int twips) { return MulDiv(twips, screenDpi(), 1440); }
 
@@ -306,6 +310,161 @@ void isPartOfTheControl() {
   POINT inBox{3, 3};
   ClientToScreen(centerBox(designer), &inBox);
   expect(WindowFromPoint(inBox) == designer.hosted.window(), "in a designer the mouse passes through it");
+  SendMessageW(designer.hosted.window(), WM_RBUTTONUP, 0, MAKELPARAM(50, 50));
+  expect(FindWindowW(kMenuClass, nullptr) == nullptr, "and there is no menu");
+}
+
+void areasCollapse() {
+  Form form(Form::Loop::Container);
+  struct Row {
+    const wchar_t* area;
+    bool upright;
+  };
+  for (const Row& row : {Row{L"DisplayPanelVisible", true}, Row{L"MeasurementPanelVisible", false}}) {
+    const auto strip = [&] {
+      for (const HWND button : windowsOf(form.hosted.window(), L"Button")) {
+        RECT client{};
+        GetClientRect(button, &client);
+        const bool slim = std::min(client.right, client.bottom) == inPixels(90);
+        if (slim && (client.bottom > client.right) == row.upright) return button;
+      }
+      return HWND{nullptr};
+    };
+    const auto toggled = [&](int state) {
+      Form::click(strip());
+      form.pump();
+      return call(form.members(), row.area).number() == state && GetFocus() == form.hosted.window();
+    };
+    SendMessageW(strip(), WM_SETCURSOR, reinterpret_cast<WPARAM>(strip()),
+                 MAKELPARAM(HTCLIENT, WM_MOUSEMOVE));
+    expect(GetCursor() == LoadCursorW(nullptr, IDC_HAND),
+           toUtf8(row.area) + ": the pointer says: to be pressed");
+    expect(toggled(0) && toggled(-1), toUtf8(row.area) + ": goes and comes with a click on its strip");
+  }
+}
+
+// --- Menu
+
+HWND menuOwner = nullptr;
+
+void CALLBACK chooseTheFirstItem(HWND, UINT, UINT_PTR timer, DWORD) {
+  if (FindWindowW(kMenuClass, nullptr) == nullptr) return;
+  KillTimer(nullptr, timer);
+  PostMessageW(menuOwner, WM_KEYDOWN, VK_DOWN, 0);
+  PostMessageW(menuOwner, WM_KEYDOWN, VK_RETURN, 0);
+}
+
+// The first item shows and hides the display area.
+void menuOpens() {
+  Form form(Form::Loop::Dialog);
+  menuOwner = form.hosted.window();
+  SetFocus(menuOwner);
+  int shown = -1;
+  const auto chosen = [&](const char* how, const std::function<void()>& open) {
+    SetTimer(nullptr, 0, 10, chooseTheFirstItem);
+    open();
+    shown = -1 - shown;
+    expect(call(form.members(), L"DisplayPanelVisible").number() == shown,
+           std::string("the graph's menu opens by ") + how + ", and its first item is chosen");
+  };
+  chosen("a right click", [&] {
+    SendMessageW(menuOwner, WM_RBUTTONDOWN, MK_RBUTTON, MAKELPARAM(50, 50));
+    SendMessageW(menuOwner, WM_RBUTTONUP, 0, MAKELPARAM(50, 50));
+  });
+  chosen("Shift+F10", [&] { form.press(VK_F10, VK_SHIFT); });
+  chosen("the menu key", [&] { form.press(VK_APPS); });
+}
+
+// --- Looks
+
+// A field's inside is there where it has its window.
+bool showsTheCenterBox(const Form& form, HDC dc) {
+  RECT box{};
+  GetWindowRect(centerBox(form), &box);
+  MapWindowPoints(nullptr, form.hosted.window(), reinterpret_cast<POINT*>(&box), 2);
+  const LONG area = (box.right - box.left) * (box.bottom - box.top);
+  return pixelsOf(dc, box, GetSysColor(COLOR_WINDOW)) > area / 2;
+}
+
+void isWholeInPictures() {
+  Form form(Form::Loop::Container);
+  publish(carrier());
+  form.pump();
+  const SIZE size{form.container.place.right, form.container.place.bottom};
+  const HDC screen = GetDC(nullptr);
+  const HDC dc = CreateCompatibleDC(screen);
+  const HBITMAP bitmap = CreateCompatibleBitmap(screen, size.cx, size.cy);
+  HGDIOBJ const previous = SelectObject(dc, bitmap);
+  const RECT all{0, 0, size.cx, size.cy};
+  const RECT graph{0, 0, inPixels(9270), inPixels(7470)};
+  const RECTL bounds{0, 0, size.cx, size.cy};
+  FillRect(dc, &all, static_cast<HBRUSH>(GetStockObject(BLACK_BRUSH)));
+  form.hosted.object.query<IViewObject2>()->Draw(DVASPECT_CONTENT, -1, nullptr, nullptr, nullptr, dc, &bounds,
+                                                 nullptr, nullptr, 0);
+  expect(showsTheCenterBox(form, dc) && pixelsOf(dc, graph, kTraceColor) > 200,
+         "drawn by the container, graph and fields are there");
+  for (const UINT message : {WM_PRINT, WM_PRINTCLIENT}) {
+    FillRect(dc, &all, static_cast<HBRUSH>(GetStockObject(BLACK_BRUSH)));
+    SendMessageW(form.hosted.window(), message, reinterpret_cast<WPARAM>(dc), PRF_CLIENT | PRF_CHILDREN);
+    expect(showsTheCenterBox(form, dc) && pixelsOf(dc, graph, kTraceColor) > 200, "printed as well");
+  }
+  const RECT right{inPixels(9270), 0, size.cx, inPixels(7470)};
+  expect(pixelsOf(dc, right, kTraceColor) > 20, "the markers' frame has the trace's colour");
+  SelectObject(dc, previous);
+  DeleteObject(bitmap);
+  DeleteDC(dc);
+  ReleaseDC(nullptr, screen);
+}
+
+// Width and height as the head of a PNG file has them.
+SIZE sizeOfPng(const std::string& path) {
+  unsigned char head[24] = {};
+  if (FILE* const file = std::fopen(path.c_str(), "rb")) {
+    if (std::fread(head, 1, sizeof head, file) != sizeof head) head[0] = 0;
+    std::fclose(file);
+  }
+  const auto number = [&head](int at) { return head[at + 2] * 256 + head[at + 3]; };
+  return {number(16), number(20)};
+}
+
+void graphIsSavedAlone(const std::string& folder) {
+  Form form(Form::Loop::Container);
+  const std::string path = folder + "\\graph_alone.png";
+  call(form.members(), L"SavePicture", {toUtf16(path).c_str()});
+  const SIZE size = sizeOfPng(path);
+  DeleteFileA(path.c_str());
+  expect(size.cx == inPixels(9270) && size.cy == inPixels(7470),
+         "a saved picture ends where the areas begin");
+}
+
+int fontHeight(HWND window) {
+  LOGFONTW font{};
+  GetObjectW(reinterpret_cast<HFONT>(SendMessageW(window, WM_GETFONT, 0, 0)), sizeof font, &font);
+  return static_cast<int>(font.lfHeight);
+}
+
+ComPointer<IDispatch> makeFont(int points) {
+  wchar_t name[] = L"Tahoma";
+  FONTDESC description{sizeof description, name, {}, FW_NORMAL, DEFAULT_CHARSET, FALSE, FALSE, FALSE};
+  description.cySize.int64 = points * 10000LL;
+  ComPointer<IDispatch> font;
+  OleCreateFontIndirect(&description, IID_IDispatch, reinterpret_cast<void**>(font.receive()));
+  return font;
+}
+
+void containersFontIsTaken() {
+  Form form(Form::Loop::Container);
+  const auto inFont = [&form](int points) {
+    return fontHeight(centerBox(form)) == -MulDiv(points, screenDpi(), 72);
+  };
+  expect(inFont(8), "without a font of the container's the fields have that of dialogs");
+  const auto larger = makeFont(10);
+  form.container.font = larger.get();
+  form.hosted.object.query<IOleControl>()->OnAmbientPropertyChange(DISPID_AMBIENT_FONT);
+  expect(inFont(10), "with one they have it");
+  form.container.font = nullptr;
+  form.hosted.object.query<IOleControl>()->OnAmbientPropertyChange(DISPID_UNKNOWN);
+  expect(inFont(8), "as long as it is the container's");
 }
 
 // --- Pictures
@@ -344,7 +503,14 @@ int check(const std::string& folder) {
   tabInADialog();
   isClickedAndTypedInto();
   isPartOfTheControl();
+  areasCollapse();
+  menuOpens();
+  isWholeInPictures();
+  graphIsSavedAlone(folder);
+  containersFontIsTaken();
   isPictured(folder);
+  expect(call(*diagnostics.get(), L"Count").number() == 0 && FindWindowW(L"#32770", nullptr) == nullptr,
+         "nothing was reported, and no box is open");
   OleUninitialize();
   return verdict();
 }

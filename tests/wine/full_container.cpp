@@ -64,6 +64,11 @@ HRESULT FullContainer::GetExtendedControl(IDispatch** extended) {
 
 HRESULT FullContainer::Invoke(DISPID member, REFIID, LCID, WORD, DISPPARAMS*, VARIANT* result, EXCEPINFO*,
                               UINT*) {
+  if (member == DISPID_AMBIENT_FONT && font != nullptr) {
+    V_VT(result) = VT_DISPATCH;
+    V_DISPATCH(result) = font;
+    return font->AddRef(), S_OK;
+  }
   if (member != DISPID_AMBIENT_USERMODE) return DISP_E_MEMBERNOTFOUND;
   V_VT(result) = VT_BOOL;
   V_BOOL(result) = userMode ? VARIANT_TRUE : VARIANT_FALSE;

@@ -87,6 +87,7 @@ class FullContainer final
 
   std::vector<std::string> told;
   bool userMode = true;
+  IDispatch* font = nullptr;  // ambient
   IDispatch* extender = nullptr;
   RECT place{10, 20, 410, 320};
   [[nodiscard]] int count(const std::string& what) const;
