@@ -357,6 +357,9 @@ void CALLBACK chooseTheFirstItem(HWND, UINT, UINT_PTR timer, DWORD) {
 // The first item shows and hides the display area.
 void menuOpens() {
   Form form(Form::Loop::Dialog);
+  // A pointer over the form would take the keys' choice in the menu back.
+  SetCursorPos(GetSystemMetrics(SM_CXSCREEN) - 1, GetSystemMetrics(SM_CYSCREEN) - 1);
+  form.pump();
   menuOwner = form.hosted.window();
   SetFocus(menuOwner);
   int shown = -1;
