@@ -101,7 +101,7 @@ void limits(PanelUnderTest& test, FuzzInput& input) {
       std::vector<HostRecordList::Record>{{order, takeVariant(input), takeVariant(input)}});
   enter(test, [&] { return test.panel().Limits(parameterType, records); });
   test.panel().channels().setChannelLookup("0", &records);
-  test.panel().channels().setChannelZero(takeVariant(input).toText(), &records);
+  test.panel().channels().setChannelZero(numberToText(input.number<double>()), &records);
   test.panel().channels().setChannelSpacing("30000", &records);
 }
 

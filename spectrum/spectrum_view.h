@@ -30,6 +30,7 @@ class SpectrumView final : public HostedPanel {
   static constexpr std::int32_t kMaxPoints = 513;
 
   SpectrumView(const PanelEnvironment& environment, PanelHost& host, PanelContainer& container);
+  ~SpectrumView() override = default;
   SpectrumView(const SpectrumView&) = delete;
   SpectrumView& operator=(const SpectrumView&) = delete;
 
