@@ -17,12 +17,6 @@ constexpr char upperCased(char c) noexcept {
   return c >= 'a' && c <= 'z' ? static_cast<char>(c - 'a' + 'A') : c;
 }
 
-bool beginsWith(std::string_view name, std::string_view typed) noexcept {
-  return typed.size() <= name.size() &&
-         std::equal(typed.begin(), typed.end(), name.begin(),
-                    [](char a, char b) { return upperCased(a) == upperCased(b); });
-}
-
 std::string_view trimmed(std::string_view text) noexcept {
   text.remove_prefix(std::min(text.find_first_not_of(kBlanks), text.size()));
   return text.substr(0, text.find_last_not_of(kBlanks) + 1);
@@ -102,12 +96,19 @@ const SuffixRecord* suffixNamed(const SuffixTable& suffixes, std::string_view na
   return found;
 }
 
-bool beginsSuffix(const SuffixTable& suffixes, std::int16_t character) noexcept {
+bool beginsWith(std::string_view name, std::string_view typed) noexcept {
+  return typed.size() <= name.size() &&
+         std::equal(typed.begin(), typed.end(), name.begin(),
+                    [](char a, char b) { return upperCased(a) == upperCased(b); });
+}
+
+const SuffixRecord* suffixBegunBy(const SuffixTable& suffixes, std::int16_t character) noexcept {
+  if (character <= 0 || character > '~') return nullptr;
   const auto letter = static_cast<char>(character);
-  if (character <= 0 || character > '~') return false;
-  return std::any_of(suffixes.begin(), suffixes.end(), [letter](const SuffixRecord& record) {
-    return beginsWith(record.name, std::string_view(&letter, 1));
-  });
+  const auto* const found = std::find_if(
+      suffixes.begin(), suffixes.end(),
+      [letter](const SuffixRecord& record) { return beginsWith(record.name, std::string_view(&letter, 1)); });
+  return found == suffixes.end() ? nullptr : found;
 }
 
 std::optional<double> parseEntryText(std::string_view text, const SuffixTable& suffixes, double shownScale,

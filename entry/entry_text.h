@@ -17,8 +17,10 @@ namespace frontpanels {
 // before others. Null where none or more than one is meant.
 [[nodiscard]] const SuffixRecord* suffixNamed(const SuffixTable& suffixes, std::string_view name) noexcept;
 
-// Whether a typed character is the first letter of a unit, in either case.
-[[nodiscard]] bool beginsSuffix(const SuffixTable& suffixes, std::int16_t character) noexcept;
+// Whether a name begins with what was typed, in either case of its letters.
+[[nodiscard]] bool beginsWith(std::string_view name, std::string_view typed) noexcept;
+// The first unit that a typed character is the first letter of, in either case; null when there is none.
+[[nodiscard]] const SuffixRecord* suffixBegunBy(const SuffixTable& suffixes, std::int16_t character) noexcept;
 
 // The number in base units that a text means, if it means one: blanks around, a sign, digits with the user's
 // decimal separator or ".", an exponent, and a unit behind it. Without a unit it counts in units of

@@ -237,7 +237,7 @@ class clsNumericEntry {
   void upClick() noexcept;
   void downClick() noexcept;
   // Enter and the first letter of a unit take the text over, "&" and "(" step. What has an effect is
-  // consumed.
+  // consumed, and so are the unit's other letters when they follow.
   void KeyPress(std::int16_t& character) noexcept;
   // The arrow keys up and down step.
   void KeyDown(std::int16_t keyCode, std::int16_t shift) noexcept;
@@ -331,6 +331,7 @@ class clsNumericEntry {
   void click(const char* message, StepDirection direction) noexcept;
   // Commits a text while the box keeps the focus.
   void takeOver(const std::string& typed, bool& changed);
+  [[nodiscard]] bool spellsOn(std::int16_t character);
   void selectText() const;
 
   TextBox* textBox_ = nullptr;
@@ -353,6 +354,7 @@ class clsNumericEntry {
   double formatScale_ = 1;
   double formatOffset_ = 0;
   std::string lastText_;  // as written to the box
+  std::string unspelt_;   // what is left of a unit whose first letter has taken the text over
 
   std::vector<RangedDiscontinuity> discontinuities_;  // as added
   std::array<std::vector<frontpanels::ChannelDiscontinuity>, EntryRanges::kCount> rangeDiscontinuities_;

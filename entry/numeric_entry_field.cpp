@@ -198,6 +198,7 @@ void clsNumericEntry::downClick() noexcept {
 
 void clsNumericEntry::click(const char* message, StepDirection direction) noexcept {
   onEvent(message, [&](bool& changed) {
+    unspelt_.clear();
     const std::optional<double> from = shownValue();
     if (!from) {
       errorHandler().Assert(message);
@@ -209,16 +210,30 @@ void clsNumericEntry::click(const char* message, StepDirection direction) noexce
   });
 }
 
+// Whoever types a unit to its end must not type over the text that its first letter has completed.
+bool clsNumericEntry::spellsOn(std::int16_t character) {
+  const std::string unspelt = std::exchange(unspelt_, {});
+  const auto letter = static_cast<char>(character);
+  if (unspelt.empty() || text() != lastText_ || character > '~') return false;
+  if (!beginsWith(unspelt, std::string_view(&letter, 1))) return false;
+  unspelt_ = unspelt.substr(1);
+  return true;
+}
+
 void clsNumericEntry::KeyPress(std::int16_t& character) noexcept {
   onEvent("clsNumericEntry::KeyPress() failed. ", [&](bool& changed) {
     const std::int16_t typed = character;
-    if (typed == kUp || typed == kDown) {
+    if (spellsOn(typed)) {
+      character = 0;
+    } else if (typed == kUp || typed == kDown) {
       character = 0;
       typed == kUp ? upClick() : downClick();
       changed = newValue_;
-    } else if (textBox_ != nullptr && (typed == kEnter || beginsSuffix(shownSuffixes(), typed))) {
+    } else if (const SuffixRecord* const unit = suffixBegunBy(shownSuffixes(), typed);
+               textBox_ != nullptr && (typed == kEnter || unit != nullptr)) {
       character = 0;
       takeOver(typed == kEnter ? text() : text() + static_cast<char>(typed), changed);
+      if (unit != nullptr) unspelt_ = unit->name.substr(1);
     }
   });
 }
@@ -241,7 +256,10 @@ void clsNumericEntry::KeyDown(std::int16_t keyCode, std::int16_t shift) noexcept
 }
 
 void clsNumericEntry::GotFocus() noexcept {
-  onEvent("clsNumericEntry::GotFocus() failed. ", [&](bool&) { selectText(); });
+  onEvent("clsNumericEntry::GotFocus() failed. ", [&](bool&) {
+    unspelt_.clear();
+    selectText();
+  });
 }
 
 void clsNumericEntry::LostFocus() noexcept {

@@ -118,7 +118,17 @@ TEST_F(EntryEventsTest, KeysTakeATextOverOrStep) {
     return state() + (box.allSelected() ? "" : " going on");
   };
   EXPECT_EQ(testing::found(keys, press), keys);
+  const testing::Rows units = {"700 kHz -> 700 kHz", "5 mhZ -> 5 MHz", "12hz -> 12 Hz",
+                               "3kHz4 -> 4",         "3kz -> z",       "3kHzz -> z"};
+  const auto spell = [this](const std::string& typed) {
+    box.selectAll();
+    for (const char letter : typed) box.userKey(letter);
+    return std::string(box.Text());
+  };
+  EXPECT_EQ(testing::found(units, spell), units);
+  entry.valueNoUpdate(900e3);
   entry.reformat();
+  static_cast<void>(state());
   play(
       {{[&] { box.KeyDown(38, 0); }, "901 kHz = 901000 told 901000"},
        {[&] { box.KeyDown(38, 1), box.KeyDown(39, 0); }, "901 kHz = 901000"},  // with shift it is another key

@@ -243,9 +243,12 @@ TEST_F(SpectrumFieldsTest, MarkerButtonsWorkOnTheActiveMarkerAndAreEnabledByIt) 
   EXPECT_EQ(requests(), "Set 5 7 13 0 97500000");
   set(322, 1);
   EXPECT_EQ(markerButtons(), "1010");
+  click("MarkerAddButton");
+  EXPECT_EQ(markerButtons(), "1110");
   set(322, 0);
-  EXPECT_EQ(markerButtons(), "1011");
-  click("MarkerDeleteButton");  // with its delta marker
+  EXPECT_EQ(markerButtons(), "1111");
+  click("MarkerDeleteButton");
+  click("MarkerDeleteButton");  // the first one with its delta marker
   EXPECT_EQ(markerButtons(), "0000");
   click("MarkerAddButton");
   panel->vfpOp(0, 11, 25);

@@ -38,6 +38,16 @@ TEST_F(SpectrumViewTest, ASweepShowsItsOwnPointsOfWhichMoreThan513AreAnErrorThat
   EXPECT_EQ(traceLines()[1].points.size(), 3U);
 }
 
+TEST_F(SpectrumViewTest, ASweepMayHaveNoPointOneOrTwo) {
+  for (const std::size_t points : {0U, 1U, 2U, 0U, 3U}) {
+    gdi.clear();
+    publish(std::vector<float>(points, -50.0F));
+    EXPECT_EQ(traceLines().size(), points == 0 ? 0U : 1U) << points;
+    EXPECT_EQ(gdi.blits().size(), 1U) << points;
+  }
+  EXPECT_EQ(messages(), Messages{});
+}
+
 TEST_F(SpectrumViewTest, ASweepInAResultBufferIsDrawnLikeOneFromTheHub) {
   const auto display = [this](const std::vector<float>& levels) {
     ResultWriter writer;
