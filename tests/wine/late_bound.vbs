@@ -150,6 +150,35 @@ Sub Results()
   diagnostics.Clear
 End Sub
 
+Sub Channels()
+  Dim tuned, center
+  Set tuned = CreateObject("FrontPanels.SpectrumView")
+  Set center = tuned.Constituent("CenterFrequencyTextBox")
+  Check "bands are taken", tuned.Limits(13, Array(0, 869040000, 893970000, 1, 824040000, 848970000)), 0
+  Check "limits of what has no entry are refused", tuned.Limits(99, Array(0, 1, 2)), -8
+  tuned.ChannelZero 0, 870000000
+  tuned.ChannelZero 1, 825000000
+  tuned.ChannelSpacing 0, 30000
+  tuned.ChannelSpacing 1, 30000
+  tuned.ChannelLookup 0, 0, 1
+  tuned.vfpSet 0, 333, 0, 0
+  tuned.vfpSet 0, 14, 0, 2000000
+  tuned.vfpSet 0, 13, 0, 836520000
+  Check "a centre chooses its band", tuned.Constituent("UplinkOption").Value, True
+  tuned.vfpSet 0, 750, 0, 0
+  Check "and reads as a channel", center.Text, "384"
+  tuned.Constituent("DownlinkOption").Click
+  Check "which the other band has, too", center.Text & " " & tuned.initializeLinkValue(3, 13), "384 881520000"
+  hub.Publish SpectrumPath, Array(-60, -20, -60)
+  tuned.addMarker
+  tuned.markerToMax
+  tuned.addDeltaMarker
+  Check "one delta marker is enough", tuned.Constituent("MarkerDeltaButton").Enabled, False
+  tuned.deleteMarker
+  Check "nothing is left to delete", tuned.Constituent("MarkerDeleteButton").Enabled, False
+  Check "an area answers", tuned.displayPanel.Visible, True
+End Sub
+
 Sub Closing()
   Check "closing answers 0", panel.vfpOp(0, 1), 0
   Check "then everything does", panel.vfpSet(0, 312, 0, "abc"), 0
@@ -170,6 +199,7 @@ Statuses
 Errors
 Sweep
 Results
+Channels
 Closing
 Set panel = Nothing
 WScript.Echo "script finished"
