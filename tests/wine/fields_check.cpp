@@ -35,10 +35,10 @@ int inPixels(int twips) { return MulDiv(twips, screenDpi(), 1440); }
 constexpr const wchar_t* kStops[] = {
     L"CenterFrequencyTextBox", L"FrequencySpanTextBox", L"FrequencyRbwTextBox",
     L"StartFrequencyTextBox",  L"StopFrequencyTextBox", L"SingleSweepButton",
-    L"ContinuousSweepButton",  L"StopSweepButton",      L"AverageCountTextBox",
+    L"ContinuousSweepButton",  L"StopSweepButton",      L"FrequencyOption",
+    L"ChannelizationCombo",    L"IntervalTimeOption",   L"SweepRateTextBox",
+    L"DownlinkOption",         L"WidebandOption",       L"AverageCountTextBox",
     L"AverageTypeCombo",       L"DisplayLengthTextBox", L"LogPwrOption",
-    L"FrequencyOption",        L"ChannelizationCombo",  L"DownlinkOption",
-    L"IntervalTimeOption",     L"SweepRateTextBox",     L"WidebandOption",
     L"VerticalScaleTextBox",   L"AutoScaleBox",         L"VerticalOffsetTextBox",
     L"MarkerAddButton",        L"MarkerDeleteButton",   L"MarkerToMaxButton",
     L"MarkerDeltaButton",      L"MarkerToCenterButton", L"CloseButton"};
@@ -472,6 +472,25 @@ void containersFontIsTaken() {
 
 // --- Pictures
 
+// Long numbers, a noisy band and a pair of markers: what an operator has before him.
+void showWorkingPanel(Form& form) {
+  call(form.members(), L"vfpSet", {0, 13, 0, 2412123456.78});
+  call(form.members(), L"vfpSet", {0, 14, 0, 19980468.75});
+  call(form.members(), L"vfpSet", {0, 500, 0, 1});
+  std::vector<float> levels(512);
+  for (std::size_t i = 0; i < levels.size(); ++i) {
+    levels[i] = -95 + static_cast<float>(i * i * 7919 % 97) / 12;
+    for (const std::size_t peak : {80U, 200U, 333U, 460U}) {
+      const auto away = static_cast<float>(i > peak ? i - peak : peak - i);
+      levels[i] = std::max(levels[i], -30 - static_cast<float>(peak) / 16 - away * 4);
+    }
+  }
+  publish(levels);
+  for (const wchar_t* const member : {L"addMarker", L"markerToMax", L"addDeltaMarker"})
+    call(form.members(), member);
+  form.pump();
+}
+
 void isPictured(const std::string& folder) {
   struct Shot {
     const char* name;
@@ -488,8 +507,7 @@ void isPictured(const std::string& folder) {
     Form form(Form::Loop::Container, shot.twips);
     put(form.members(), L"DisplayPanelVisible", shot.right);
     put(form.members(), L"MeasurementPanelVisible", shot.bottom);
-    publish(carrier());
-    form.pump();
+    showWorkingPanel(form);
     const std::string stem = folder + "\\panel_" + shot.name + "_" + std::to_string(screenDpi());
     workbench::saveWindowPicture(form.hosted.window(), stem + ".png");
   }
