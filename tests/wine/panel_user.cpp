@@ -6,15 +6,15 @@
 namespace frontpanels::testing {
 namespace {
 
+// A function and not a lambda, which has no calling convention of its own to be given in 32 bits.
+BOOL CALLBACK addToList(HWND window, LPARAM list) {
+  reinterpret_cast<std::vector<HWND>*>(list)->push_back(window);
+  return TRUE;
+}
+
 std::vector<HWND> descendants(HWND panel) {
   std::vector<HWND> all;
-  EnumChildWindows(
-      panel,
-      [](HWND window, LPARAM list) -> BOOL {
-        reinterpret_cast<std::vector<HWND>*>(list)->push_back(window);
-        return TRUE;
-      },
-      reinterpret_cast<LPARAM>(&all));
+  EnumChildWindows(panel, addToList, reinterpret_cast<LPARAM>(&all));
   return all;
 }
 
