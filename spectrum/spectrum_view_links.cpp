@@ -130,7 +130,7 @@ Variant SpectrumView::initializeLinkValue(std::int16_t linkType, std::int32_t ge
     return {};
   }
   if (const clsNumericEntry* const entry = linkedEntry(genericId)) return entry->value();
-  PanelSettings own;
+  PanelSettings own{{TIME_MEASUREMENT_PERIOD, base_.measurementPeriod}};
   appendSettings(own);
   const auto found = std::find_if(own.begin(), own.end(), [genericId](const PanelSetting& setting) {
     return setting.parameterType == genericId;

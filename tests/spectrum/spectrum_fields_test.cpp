@@ -347,6 +347,9 @@ TEST_F(SpectrumFieldsTest, LinksShowOnTheirFieldsAndNameTheOneInUse) {
   EXPECT_EQ(look("CenterFrequencyTextBox"), "e");
   EXPECT_EQ(base.initializeLinkValue(3, 94), Variant(513.0));
   EXPECT_EQ(base.initializeLinkValue(3, 17), Variant(0.0));
+  set(43, 0.5);
+  set(804, 0);  // the entry holds a distance now
+  EXPECT_EQ(base.initializeLinkValue(3, 43), Variant(0.5));
   EXPECT_EQ(base.activeControlLink(), "");
   controls().control("StartFrequencyTextBox").SetFocus();
   EXPECT_EQ(base.activeControlLink(), "STARTFREQUENCYTEXTBOX");
