@@ -122,7 +122,10 @@ HRESULT SpectrumControl::ChannelLookup(short channelization, short lowestOrder, 
 }
 
 HRESULT SpectrumControl::ClearChannels() {
-  return perform([&] { panel_->channels().reinitialize(); });
+  return perform([&] {
+    panel_->channels().reinitialize();
+    panel_->ChannelizationCombo_Change();
+  });
 }
 
 }  // namespace frontpanels::activex

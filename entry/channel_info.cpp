@@ -83,11 +83,11 @@ void clsChannelInfo::setChannelLookup(std::string_view value, const HostRecordSe
 
 // --- Their application
 
-void clsChannelInfo::selectChannelization(std::int16_t id, clsNumericEntry& entry) const noexcept {
+bool clsChannelInfo::selectChannelization(std::int16_t id, clsNumericEntry& entry) const noexcept {
   constexpr std::string_view kRoutine = "::selectChannelization()";
-  guard(named(kRoutine), [&] {
+  return guarded(named(kRoutine), false, [&] {
     const ChannelLookup* const chosen = lookup(kRoutine, id);
-    if (chosen == nullptr) return;
+    if (chosen == nullptr) return false;
     const RangePlans plans = plansOf(*chosen);
     entry.ChannelDiscontinuity(0);
     for (std::int32_t range = 0; const RangePlan& plan : plans) {
@@ -99,6 +99,7 @@ void clsChannelInfo::selectChannelization(std::int16_t id, clsNumericEntry& entr
     }
     entry.channelUnits(true);
     entry.reformat();
+    return true;
   });
 }
 

@@ -59,9 +59,9 @@ class clsChannelInfo {
   // Gives the entry's ranges the channel zeros, spacings and discontinuities of one channelization; of two
   // lookups the one added last counts, of two zeros or spacings of a band the one added first. The entry then
   // has channel units and its text is written anew. An id that no lookup has, and a channelization that no
-  // entry can take (a spacing of 0, blocks that overlap, more bands than ranges), are reported and leave the
-  // entry as it was.
-  void selectChannelization(std::int16_t id, clsNumericEntry& entry) const noexcept;
+  // entry can take (a spacing of 0, blocks that overlap, more bands than ranges), are reported, leave the
+  // entry as it was and answer false.
+  bool selectChannelization(std::int16_t id, clsNumericEntry& entry) const noexcept;
   // The spacings alone, for an entry that holds the distance of two frequencies: it counts from no channel
   // zero and knows no discontinuity.
   void selectChannelSpacing(std::int16_t id, clsNumericEntry& entry) const noexcept;

@@ -216,19 +216,20 @@ void clsNumericEntry::setRangeField(std::string_view routine, std::int32_t index
         [&] { set(*ranges_.find(index), finite(value)); });
 }
 
-void clsNumericEntry::Limits(const HostRecordSet& records) noexcept {
-  guard("clsNumericEntry::Limits() failed. ", [&] {
+bool clsNumericEntry::Limits(const HostRecordSet& records) noexcept {
+  return guarded("clsNumericEntry::Limits() failed. ", false, [&] {
     EntryRanges::Limits limits;
     if (const std::string_view wrong = readLimits(records, limits); !wrong.empty()) {
       errorHandler().Assert(std::string(kTypeName).append(wrong));
-      return;
+      return false;
     }
-    if (records.count() == 0) return;
+    if (records.count() == 0) return true;
     ranges_.limits(limits);
     if (const EntryRange& chosen = *ranges_.find(range_); chosen.defined)
       limits_ = chosen.limits;
     else
       choose(*ranges_.firstDefined());
+    return true;
   });
 }
 

@@ -94,8 +94,9 @@ class clsNumericEntry {
   void FormatScaleForRange(std::int32_t index, double scale) noexcept;
 
   // The limits of a host parameter: a record gives those of the range that its order names, other ranges are
-  // no longer defined. The chosen range stays if it can, and its limits come in force.
-  void Limits(const HostRecordSet& records) noexcept;
+  // no longer defined. The chosen range stays if it can, and its limits come in force. Unusable ones are
+  // reported, change nothing and answer false.
+  bool Limits(const HostRecordSet& records) noexcept;
   // The limits of another entry, its ranges' and its choice among them; how values are shown stays this
   // one's.
   void CopyLimits(const clsNumericEntry& source) noexcept;

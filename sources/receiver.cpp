@@ -47,12 +47,15 @@ bool isTuning(std::int16_t code) { return code == Receiver::kCenterHz || code ==
 bool Receiver::request(std::int16_t code, double value) {
   const auto* const row = std::find_if(std::begin(kRows), std::end(kRows),
                                        [code](const SettingRow& r) { return r.code == code; });
-  if (row == std::end(kRows) || !std::isfinite(value) || !row->accepts(value)) return false;
-  if (std::find(unanswered_.begin(), unanswered_.end(), code) == unanswered_.end())
-    unanswered_.push_back(code);
-  values_[code] = value;
-  tuned_ = tuned_ || isTuning(code);
-  return true;
+  if (row == std::end(kRows)) return false;
+  const bool taken = std::isfinite(value) && row->accepts(value);
+  if (taken) {
+    values_[code] = value;
+    tuned_ = tuned_ || isTuning(code);
+  }
+  const bool waiting = std::find(unanswered_.begin(), unanswered_.end(), code) != unanswered_.end();
+  if (!waiting && values_.count(code) != 0) unanswered_.push_back(code);
+  return taken;
 }
 
 // Not before centre and span are asked for again: a panel that has changed both says so one after the other.

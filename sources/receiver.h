@@ -28,7 +28,7 @@ class Receiver {
   static constexpr std::int16_t kSpanHz = 14;
 
   // A panel's request. False, and nothing has changed, for a code that the receiver does not have and for a
-  // value that it cannot take, not-a-number among them.
+  // value that it cannot take, not-a-number among them; the panel is then answered with the value that holds.
   [[nodiscard]] bool request(std::int16_t code, double value);
   // What was requested since the last call, each code once, with the value that the receiver has now.
   [[nodiscard]] std::vector<ReceiverSetting> takeAnswers();

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <limits>
 
 #include "framework/support/numeric.h"
 
@@ -41,10 +42,10 @@ FrequencyEntries::FrequencyEntries() {
     entry->frequencySuffix();
     entry->formatString(kFrequencyFormat);
     entry->Arbitrary(true);
-    entry->autoChoose(true);
     entry->MINIMUM(0);
     entry->MAXIMUM(kHighestFrequencyHz);
   }
+  center.autoChoose(true);  // the edges keep to the centre's band
   center.valueNoUpdate(kDefaultCenterHz);
   span.valueNoUpdate(kDefaultSpanHz);
   placeEdges();
@@ -70,8 +71,12 @@ void FrequencyEntries::setCenter(double centerHz) noexcept {
 void FrequencyEntries::fitCenter() noexcept {
   followRange();
   const double half = span.value() * 0.5;
-  if (center.value() + half > stop.MAXIMUM()) center.valueNoUpdate(stop.MAXIMUM() - half);
-  if (center.value() - half < start.MINIMUM()) center.valueNoUpdate(start.MINIMUM() + half);
+  double centerHz = center.value();
+  if (centerHz + half > stop.MAXIMUM()) centerHz = stop.MAXIMUM() - half;
+  if (centerHz - half < start.MINIMUM()) centerHz = start.MINIMUM() + half;
+  // A sweep wider than the band asks for a centre outside it, which must not choose another band.
+  centerHz = std::min(std::max(centerHz, center.MINIMUM()), center.MAXIMUM());
+  if (centerHz != center.value()) center.valueNoUpdate(centerHz);
   placeEdges();
 }
 
@@ -86,14 +91,18 @@ void FrequencyEntries::followSpan() noexcept {
   if (!(span.value() > 0)) return;
   const double stepHz = stepForSpan(span.value());
   start.step(stepHz);
-  start.resolution(start.channelChoose() ? Variant() : Variant(stepHz));  // channels have a grid of their own
+  // Channels have a grid of their own, and resolutions are counted in 32 bits.
+  const bool rounds =
+      !start.channelChoose() && start.MAXIMUM() / stepHz <= std::numeric_limits<std::int32_t>::max();
+  start.resolution(rounds ? Variant(stepHz) : Variant());
   stop.step(stepHz);
   center.step(stepHz);
 }
 
 void FrequencyEntries::joinEdges(bool startChanged) noexcept {
-  double lowHz = start.value();
-  double highHz = stop.value();
+  // The entry of the other edge may show it rounded.
+  double lowHz = startChanged ? start.value() : std::max(axisStartHz(), start.MINIMUM());
+  double highHz = startChanged ? std::min(axisStopHz(), stop.MAXIMUM()) : stop.value();
   if (lowHz > highHz) (startChanged ? highHz : lowHz) = startChanged ? lowHz : highHz;
   const double centerHz = (lowHz + highHz) / 2;
   const double spanHz = highHz - lowHz;
@@ -121,20 +130,17 @@ void FrequencyEntries::setBand(std::int32_t range) noexcept {
   fitCenter();
 }
 
-void FrequencyEntries::limits(const HostRecordSet& records) noexcept {
-  center.Limits(records);
+bool FrequencyEntries::limits(const HostRecordSet& records) noexcept {
+  if (!center.Limits(records)) return false;
   start.CopyLimits(center);
   stop.CopyLimits(center);
+  return true;
 }
 
 bool FrequencyEntries::showChannels(const clsChannelInfo& channels, std::int16_t channelization) noexcept {
-  const std::vector<ChannelLookup>& lookups = channels.channelLookups();
-  const bool known = std::any_of(lookups.begin(), lookups.end(), [channelization](const ChannelLookup& row) {
-    return row.id == channelization;
-  });
-  channels.selectChannelization(channelization, center);  // says so where it is not
-  if (!known) return false;
-  for (clsNumericEntry* const edge : {&start, &stop}) channels.selectChannelization(channelization, *edge);
+  if (!channels.selectChannelization(channelization, center)) return false;
+  for (clsNumericEntry* const edge : {&start, &stop})
+    if (!channels.selectChannelization(channelization, *edge)) return false;
   channels.selectChannelSpacing(channelization, span);
   start.resolution({});
   for (clsNumericEntry* const entry : {&center, &span, &start, &stop}) entry->channelChoose(true);

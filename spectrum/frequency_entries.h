@@ -37,21 +37,22 @@ class FrequencyEntries {
   // After the user has changed an edge: centre and span become what lies between the edges. A start above the
   // stop drags the other edge along.
   void joinEdges(bool startChanged) noexcept;
+  // The edges round the centre, after one of them was changed in vain.
+  void placeEdges() noexcept;
   // The centre goes over to a band: to the same channel where channels are shown, else as far from the lower
   // limit as before. Nothing happens where the band has no limits.
   void setBand(std::int32_t range) noexcept;
 
-  // A host's limits of frequencies: of centre and edges alike.
-  void limits(const HostRecordSet& records) noexcept;
-  // Shows channels of the channelization, or frequencies. One that `channels` has not is reported, nothing
-  // changes, and the answer is false.
+  // A host's limits of frequencies: of centre and edges alike. False, after a report, for unusable ones.
+  bool limits(const HostRecordSet& records) noexcept;
+  // Shows channels of the channelization, or frequencies. One that `channels` has not, or that no entry can
+  // take, is reported and the answer is false.
   bool showChannels(const clsChannelInfo& channels, std::int16_t channelization) noexcept;
   void showFrequencies() noexcept;
 
  private:
   // The edges' band is the centre's.
   void followRange() noexcept;
-  void placeEdges() noexcept;
   void followSpan() noexcept;
 };
 

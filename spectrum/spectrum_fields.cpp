@@ -128,16 +128,16 @@ void SpectrumFields::showInterval(MeasurementInterval interval, double value) no
   });
 }
 
-void SpectrumFields::intervalLimits(MeasurementInterval kind, const HostRecordSet& records) noexcept {
+bool SpectrumFields::intervalLimits(MeasurementInterval kind, const HostRecordSet& records) noexcept {
   clsNumericEntry reader;
-  reader.MAXIMUM(kIntervals[static_cast<std::size_t>(kind)].maximum);
-  reader.MINIMUM(kIntervals[static_cast<std::size_t>(kind)].minimum);
-  reader.Limits(records);  // reports what is wrong with them
+  if (!reader.Limits(records)) return false;
+  if (records.count() == 0) return true;
   intervalLimits_[static_cast<std::size_t>(kind)] = EntryLimits{reader.MINIMUM(), reader.MAXIMUM()};
   if (interval() == kind) {
     sweepRate.MINIMUM(reader.MINIMUM());
     sweepRate.MAXIMUM(reader.MAXIMUM());
   }
+  return true;
 }
 
 }  // namespace frontpanels

@@ -55,8 +55,8 @@ class SpectrumFields {
   }
   // The sweep-rate entry goes over to seconds or metres and shows the value, which is no news.
   void showInterval(MeasurementInterval interval, double value) noexcept;
-  // A host's limits of one kind of interval; they outlast the other kind's turn.
-  void intervalLimits(MeasurementInterval kind, const HostRecordSet& records) noexcept;
+  // A host's limits of one kind of interval; they outlast the other kind's turn. False for unusable ones.
+  bool intervalLimits(MeasurementInterval kind, const HostRecordSet& records) noexcept;
 
  private:
   static constexpr std::size_t kIntervalKinds = 2;

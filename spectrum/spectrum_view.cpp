@@ -24,7 +24,6 @@ SpectrumView::SpectrumView(const PanelEnvironment& environment, PanelHost& host,
   base_.SupportsMarkerToCenter = true;
   bindFields();
   updateMarkerButtons();
-  evaluateEnablingMarkerToCenter();
   fields_.averageCount.Enabled(fields_.averageType.value() != kAveragingOff);
   DFISpectrum_.subscribe(kSpectrumPath);
 }
@@ -177,23 +176,20 @@ double SpectrumView::intervalValue() const {
 
 std::int32_t SpectrumView::Limits(std::int16_t parameterType, const HostRecordSet& records) {
   if (base_.closing()) return kStatusDone;
-  switch (parameterType) {
-    case kCenterFrequencyParameter:
-      fields_.frequency.limits(records);
-      return kStatusDone;
-    case TIME_MEASUREMENT_PERIOD:
-    case kDistanceIntervalParameter:
-      fields_.intervalLimits(parameterType == TIME_MEASUREMENT_PERIOD ? MeasurementInterval::Time
-                                                                      : MeasurementInterval::Distance,
-                             records);
-      return kStatusDone;
-    default:
-      break;
-  }
-  clsNumericEntry* const entry = linkedEntry(parameterType);
-  if (entry == nullptr) return kStatusUnusableParameter;
-  entry->Limits(records);
-  return kStatusDone;
+  const auto taken = [&] {
+    switch (parameterType) {
+      case kCenterFrequencyParameter:
+        return fields_.frequency.limits(records);
+      case TIME_MEASUREMENT_PERIOD:
+        return fields_.intervalLimits(MeasurementInterval::Time, records);
+      case kDistanceIntervalParameter:
+        return fields_.intervalLimits(MeasurementInterval::Distance, records);
+      default:
+        clsNumericEntry* const entry = linkedEntry(parameterType);
+        return entry != nullptr && entry->Limits(records);
+    }
+  };
+  return taken() ? kStatusDone : kStatusUnusableParameter;
 }
 
 // --- What the host keeps
@@ -242,7 +238,6 @@ void SpectrumView::refreshControls() {
   guard("SpectrumView::refreshControls()...", [this] {
     showVerticalAxis();
     updateMarkerButtons();
-    evaluateEnablingMarkerToCenter();
     updateXAxisLabels();
     refreshTraces();
   });

@@ -52,9 +52,11 @@ class SpectrumView final : public HostedPanel {
   }
   void PopUp_Click(std::int32_t subjectId, std::int32_t buttonId) { base_.PopUp_Click(subjectId, buttonId); }
   // The limits of a parameter that has an entry here, in place of those that hold from the beginning: ranges
-  // by order, for the frequencies one a band. Answers unusable parameter for another one.
+  // by order, for the frequencies one a band. Answers unusable parameter for another one and for what are no
+  // limits.
   std::int32_t Limits(std::int16_t parameterType, const HostRecordSet& records);
-  // The host's channelizations. Whoever adds some says so by ChannelizationCombo_Change.
+  // The host's channelizations. Whoever changes them says so by ChannelizationCombo_Change, or by sending
+  // which one to show.
   [[nodiscard]] clsChannelInfo& channels() noexcept { return fields_.channels; }
   void ChannelizationCombo_Change();
 
@@ -81,7 +83,8 @@ class SpectrumView final : public HostedPanel {
   void markerToMin();
   // The active marker's frequency becomes the centre; also a request to the host.
   void markerToCenter();
-  // Enables the buttons that need a marker exactly when the active trace has one.
+  // Enables the buttons that need a marker exactly when the active trace has one, as far as that of
+  // evaluateEnablingMarkerToCenter may be.
   void updateMarkerButtons();
   // There is an active marker, and neither logging nor playback holds the receiver where it is.
   void evaluateEnablingMarkerToCenter() override;
@@ -161,7 +164,10 @@ class SpectrumView final : public HostedPanel {
   void SingleSweepButton_Click();
   void ContinuousSweepButton_Click();
   void StopSweepButton_Click();
-  void toggleMeasurementArea() { base_.bottomPanelVisible(!base_.bottomPanelVisible()); }
+  // Logging and playback keep the measurement area away.
+  void toggleMeasurementArea() {
+    if (base_.bottomPanelEnabled()) base_.bottomPanelVisible(!base_.bottomPanelVisible());
+  }
   void toggleDisplayArea() { base_.rightPanelVisible(!base_.rightPanelVisible()); }
 
   // What the host sends
@@ -175,6 +181,7 @@ class SpectrumView final : public HostedPanel {
   void showBand();
   [[nodiscard]] std::int32_t addTrace(const Variant& parameter);
   [[nodiscard]] double intervalValue() const;
+  [[nodiscard]] bool mayCenterMarker();
 
   // Data and traces
   void DFISpectrum_DataChanged(std::int32_t index);

@@ -128,8 +128,10 @@ void SpectrumView::ContinuousSweepButton_Click() {
 
 // --- Frequencies
 
+// What a user enters while an earlier entry is still with the host has to wait: the field goes back.
 void SpectrumView::newCenterFrequency() {
-  if (updateInProgress_) return;
+  clsNumericEntry& center = fields_.frequency.center;
+  if (updateInProgress_) return center.valueNoUpdate(center.previousValue());
   const FlagScope inProgress(updateInProgress_);
   guard("SpectrumView::newCenterFrequency()", [this] {
     showBand();
@@ -141,22 +143,25 @@ void SpectrumView::newCenterFrequency() {
 
 // A host that is told of the span alone would tune past the limit that the centre has given way to.
 void SpectrumView::newFrequencySpan() {
-  if (updateInProgress_) return;
+  clsNumericEntry& span = fields_.frequency.span;
+  if (updateInProgress_) return span.valueNoUpdate(span.previousValue());
   const FlagScope inProgress(updateInProgress_);
-  guard("SpectrumView::newFrequencySpan()", [this] {
+  guard("SpectrumView::newFrequencySpan()", [&] {
     FrequencyEntries& frequency = fields_.frequency;
     const double centerHz = frequency.center.value();
-    frequency.setSpan(frequency.span.value());
+    frequency.setSpan(span.value());
+    // What the host answers to the first request must not change the second one.
+    const double spanHz = span.value();
     updateXAxisLabels();
     adjustResolution();
     const bool moved = frequency.center.value() != centerHz;
     if (moved && !request("newFrequencySpan()", kCenterFrequencyParameter, frequency.center.value())) return;
-    request("newFrequencySpan()", kSpanParameter, frequency.span.value());
+    request("newFrequencySpan()", kSpanParameter, spanHz);
   });
 }
 
 void SpectrumView::newStartStopFrequency(bool startChanged) {
-  if (updateInProgress_) return;
+  if (updateInProgress_) return fields_.frequency.placeEdges();
   const FlagScope inProgress(updateInProgress_);
   guard("SpectrumView::newStartStopFrequency()", [&] {
     FrequencyEntries& frequency = fields_.frequency;
@@ -164,8 +169,7 @@ void SpectrumView::newStartStopFrequency(bool startChanged) {
     showBand();
     updateXAxisLabels();
     adjustResolution();
-    // What the host answers to the first request must not change the second one.
-    const double spanHz = frequency.span.value();
+    const double spanHz = frequency.span.value();  // whatever the host answers to the first request
     if (request("newStartStopFrequency()", kCenterFrequencyParameter, frequency.center.value()))
       request("newStartStopFrequency()", kSpanParameter, spanHz);
   });
@@ -179,6 +183,7 @@ void SpectrumView::bandClick(std::string_view routine, std::int32_t range) {
           fields_.frequency.setBand(range);
           updateXAxisLabels();
           request(routine, kCenterFrequencyParameter, fields_.frequency.center.value());
+          showBand();
         });
 }
 

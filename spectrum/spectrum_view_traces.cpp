@@ -100,7 +100,6 @@ void SpectrumView::changedTraceConfiguration(TraceState state, TraceObject* acti
   };
   guard("SpectrumView::changedTraceConfiguration() failed ... ", [&] {
     updateMarkerButtons();
-    evaluateEnablingMarkerToCenter();
     if (state == TraceState::Removed) return;
     if (state != TraceState::Added) return fail("unrecognized trace state");
     if (resultType == 0) return fail("missing result type");
@@ -193,7 +192,6 @@ void SpectrumView::addMarker() {
     if (painter == nullptr || painter->numberOfTraces() == 0) return;
     base_.traceManager().addMarker(painter->traceId(painter->selectedTraceIndex()));
     updateMarkerButtons();
-    evaluateEnablingMarkerToCenter();
   });
 }
 
@@ -214,7 +212,6 @@ void SpectrumView::deleteMarker() {
     if (painter == nullptr || painter->activeMarker() == nullptr) return;
     painter->deleteActiveMarker();
     updateMarkerButtons();
-    evaluateEnablingMarkerToCenter();
     refreshTraces();
   });
 }
@@ -235,7 +232,7 @@ void SpectrumView::markerToCenter() {
   if (base_.closing()) return;
   guard("SpectrumView::markerToCenter()", [this] {
     clsMultiTracePainter* const painter = activePainter();
-    if (painter == nullptr || painter->activeMarker() == nullptr) return;
+    if (painter == nullptr || !mayCenterMarker()) return;
     painter->updateActiveMarker();
     fields_.frequency.center.valueNoUpdateAutoChoose(painter->activeMarker()->valueX);
     newCenterFrequency();
@@ -251,14 +248,17 @@ void SpectrumView::updateMarkerButtons() {
          {"MarkerDeleteButton", "MarkerDeltaButton", "MarkerToMaxButton", "MarkerToCenterButton"})
       fields_.controls.control(button).Enabled(any);
   });
+  evaluateEnablingMarkerToCenter();
+}
+
+bool SpectrumView::mayCenterMarker() {
+  const TraceObject* const active = base_.traceManager().activeTrace();
+  return active != nullptr && active->activeMarker() != nullptr && !base_.recordMode && !base_.playback;
 }
 
 void SpectrumView::evaluateEnablingMarkerToCenter() {
-  guard("SpectrumView::evaluateEnablingMarkerToCenter()", [this] {
-    const TraceObject* const active = base_.traceManager().activeTrace();
-    MarkerToCenterButton()->Enabled(active != nullptr && active->activeMarker() != nullptr &&
-                                    !base_.recordMode && !base_.playback);
-  });
+  guard("SpectrumView::evaluateEnablingMarkerToCenter()",
+        [this] { MarkerToCenterButton()->Enabled(mayCenterMarker()); });
 }
 
 void SpectrumView::setMarkerFrameColor(Color color) {

@@ -331,8 +331,8 @@ std::int32_t Workbench::frontPanelOp(std::int32_t, std::int32_t, std::int16_t op
       return empty ? kUnknownRequest : afterwards(IDM_SOURCE_PLAY);
     case kStopSweeps:
       pause();
-      return afterwards(
-          IDM_SOURCE_PAUSE);  // what was asked for before it and has not begun is stopped as well
+      // What was asked for before it and has not begun is stopped as well.
+      return afterwards(IDM_SOURCE_PAUSE);
     default:
       return kUnknownRequest;
   }
@@ -340,9 +340,9 @@ std::int32_t Workbench::frontPanelOp(std::int32_t, std::int32_t, std::int16_t op
 
 std::int32_t Workbench::frontPanelSet(std::int32_t, std::int32_t, std::int16_t parameterType, std::int16_t,
                                       double value) {
-  if (!receiver_.request(parameterType, value)) return kUnusableValue;
-  PostMessageW(window_.handle(), WM_COMMAND, IDM_ANSWER_PANEL, 0);
-  return kDone;
+  const bool taken = receiver_.request(parameterType, value);
+  const BOOL answered = PostMessageW(window_.handle(), WM_COMMAND, IDM_ANSWER_PANEL, 0);
+  return taken && answered ? kDone : kUnusableValue;
 }
 
 void Workbench::showStatus() {

@@ -56,6 +56,15 @@ TEST_F(FrequencyEntriesTest, EntriesFollowEachOtherWithinTheLimitsAndTheStartRou
       {"stop below start",
        [](FrequencyEntries& f) { f.setSpan(10e6), typed(f.stop, 3000e6), f.joinEdges(false); },
        "3000 0 3000 3000"},
+      {"small spans", [](FrequencyEntries& f) { f.setSpan(1), f.setCenter(4e9), f.setCenter(3e9); },
+       "3000 0.000001 2999.9999995 3000.0000005"},
+      {"the other edge is what it is, not what it reads",
+       [](FrequencyEntries& f) {
+         f.setSpan(10e6), f.setCenter(1000.3e6), typed(f.stop, 1006.3e6), f.joinEdges(false);
+       },
+       "1000.8 11 995 1006.3"},
+      {"together", [](FrequencyEntries& f) { f.setSpan(0), f.setCenter(3000e6), f.setSpan(0); },
+       "3000 0 3000 3000"},
       {"edges apart", [](FrequencyEntries& f) { typed(f.stop, 3001e6), f.joinEdges(false); },
        "3000.5 1 3000 3001"},
       {"typed centre at the edge",

@@ -164,7 +164,6 @@ TEST_F(SpectrumFieldsTest, ButtonsAndOptionsAskTheHostAndItsRefusalIsReported) {
       {"ContinuousSweepButton", "Op 5 7 3", "ContinuousSweepButton_Click()"},
       {"StopSweepButton", "Op 5 7 4", "StopSweepButton_Click()"},
       {"UplinkOption", "Set 5 7 13 0 1000000000", "UplinkOption_Click()"},
-      {"DownlinkOption", "Set 5 7 13 0 1000000000", "DownlinkOption_Click()"},
       {"NarrowbandOption", "Set 5 7 17 0 1", "NarrowbandOption_Click()"},
       {"WidebandOption", "Set 5 7 17 0 0", "WidebandOption_Click()"},
       {"IntervalDistanceOption", "Set 5 7 804 0 0", "IntervalDistanceOption_Click()"},
@@ -195,6 +194,54 @@ TEST_F(SpectrumFieldsTest, ButtonsAndOptionsAskTheHostAndItsRefusalIsReported) {
   EXPECT_EQ(requests(),  // the refused centre of the start was not followed by its span
             "Set 5 7 13 0 2000000000, Set 5 7 14 0 1000000, Set 5 7 13 0 1999750000, Set 5 7 16 0 1000, "
             "Set 5 7 94 0 9, Set 5 7 43 0 9");
+}
+
+TEST_F(SpectrumFieldsTest, BandOptionsShowTheBandInForceAndItsLimitsHoldASweepThatIsTooWide) {
+  click("UplinkOption");  // there are no bands
+  EXPECT_TRUE(chosen("DownlinkOption"));
+  EXPECT_EQ(requests(), "Set 5 7 13 0 1000000000");
+  panel->Limits(13, ListedRecords({{{"[Order]", 0}, {"[Minimum]", 869e6}, {"[Maximum]", 894e6}},
+                                   {{"[Order]", 1}, {"[Minimum]", 824e6}, {"[Maximum]", 849e6}}}));
+  set(14, 2e6);
+  set(13, 880e6);
+  owner.status = 4;
+  click("UplinkOption");  // 11 MHz above the lower limit
+  EXPECT_EQ(requests(), "Set 5 7 13 0 835000000");
+  EXPECT_EQ(said(), "SpectrumView::UplinkOption_Click() status = 4");
+  owner.status = 0;
+  click("DownlinkOption");
+  EXPECT_EQ(requests(), "Set 5 7 13 0 880000000");
+  type("FrequencySpan", "100M");
+  EXPECT_EQ(requests(), "Set 5 7 13 0 894000000, Set 5 7 14 0 100000000");
+  EXPECT_EQ(text("StartFrequency") + ", " + text("StopFrequency"), "869 MHz, 894 MHz");
+  EXPECT_TRUE(chosen("DownlinkOption"));
+}
+
+TEST_F(SpectrumFieldsTest, LimitsThatAreNoneAreRefusedAndTheOthersStay) {
+  const auto limits = [this](std::int16_t code, const Variant& minimum, const Variant& maximum) {
+    return panel->Limits(code,
+                         ListedRecords({{{"[Order]", 0}, {"[Minimum]", minimum}, {"[Maximum]", maximum}}}));
+  };
+  for (const std::int16_t code : {std::int16_t{13}, std::int16_t{16}, std::int16_t{43}})
+    EXPECT_EQ(limits(code, 2, 5), 0) << code;
+  for (const std::int16_t code : {std::int16_t{13}, std::int16_t{16}, std::int16_t{43}})
+    EXPECT_EQ(limits(code, "x", 5), -8) << code;
+  EXPECT_EQ(limits(99, 2, 5), -8);
+  type("SweepRate", "100");
+  EXPECT_EQ(text("SweepRate"), "5 s");
+}
+
+TEST_F(SpectrumFieldsTest, WhatIsEnteredWhileARequestRunsGoesBack) {
+  owner.settingChanged = [this](std::int16_t, const Variant&) {
+    owner.settingChanged = nullptr;  // a host that lets the user go on inside its event
+    type("FrequencySpan", "2M");
+    type("StopFrequency", "1003M");
+    type("CenterFrequency", "500M");
+  };
+  type("CenterFrequency", "900M");
+  EXPECT_EQ(requests(), "Set 5 7 13 0 900000000");
+  EXPECT_EQ(text("CenterFrequency") + ", " + text("FrequencySpan") + ", " + text("StopFrequency"),
+            "900 MHz, 10 MHz, 905 MHz");
 }
 
 TEST_F(SpectrumFieldsTest, TheVerticalFieldsAndTheTraceFollowEachOther) {
@@ -396,6 +443,8 @@ TEST_F(SpectrumFieldsTest, EveryControlMayBeUsedInEveryState) {
   set(322, 0);
   panel->vfpOp(0, 15, 0);
   useAll();
+  click("MeasurementFrameInvisibleButton");
+  EXPECT_FALSE(panel->base().bottomPanelVisible());
   clearMessages();
   panel->vfpOp(0, 1, {});
   owner.take();
