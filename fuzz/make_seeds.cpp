@@ -2,11 +2,12 @@
 // same with something wrong.
 #include <algorithm>
 #include <array>
+#include <bit>
 #include <cstdio>
-#include <cstring>
 #include <filesystem>
 #include <fstream>
 #include <string>
+#include <type_traits>
 #include <vector>
 
 #include "platform/result_reader.h"
@@ -30,20 +31,25 @@ constexpr std::int32_t kOther = 50;
 constexpr std::size_t kLengthAt = 16;  // of the first record: behind four ids
 constexpr std::size_t kCountAt = 18;   // of its array
 
-void append(Bytes& bytes, const Bytes& more) { bytes.insert(bytes.end(), more.begin(), more.end()); }
-
-template <class T>
-Bytes raw(T value) {
-  Bytes bytes(sizeof(T));
-  std::memcpy(bytes.data(), &value, sizeof(T));
-  return bytes;
-}
-
+// Numbers as they lie in memory, texts and bytes as they are, one behind the other.
 template <class... Parts>
 Bytes joined(const Parts&... parts) {
   Bytes bytes;
-  (append(bytes, raw(parts)), ...);
+  const auto append = [&bytes]<class T>(const T& part) {
+    if constexpr (std::is_class_v<T>) {
+      bytes.insert(bytes.end(), part.begin(), part.end());
+    } else {
+      const auto raw = std::bit_cast<std::array<std::uint8_t, sizeof(T)>>(part);
+      bytes.insert(bytes.end(), raw.begin(), raw.end());
+    }
+  };
+  (append(parts), ...);
   return bytes;
+}
+
+template <class T>
+std::uint8_t sizeByte(const T& part) {
+  return static_cast<std::uint8_t>(part.size());
 }
 
 // --- Result buffers
@@ -145,15 +151,10 @@ Seeds resultReaderSeeds() {
       {14, 4, 3, 2, 1}, {16, 3, 2, 1}, {9, 10, 8, 7, 6, 5, 11, 15, 18, 18, 18, 18, 18}, {12, 13, 17}};
   Seeds seeds;
   for (std::size_t i = 0; i < std::size(inARecord); ++i) {
-    Bytes script = ids;
-    append(script, inARecord[i]);
-    for (const Seed& seed : buffers()) {
-      Bytes input{static_cast<std::uint8_t>(script.size())};
-      append(input, script);
-      input.push_back(0);  // the cursor at the buffer's begin
-      append(input, seed.bytes);
-      seeds.push_back({seed.name + "_" + std::to_string(i), input});
-    }
+    const Bytes script = joined(ids, inARecord[i]);
+    for (const Seed& seed : buffers())  // the cursor at the buffer's begin
+      seeds.push_back({seed.name + "_" + std::to_string(i),
+                       joined(sizeByte(script), script, std::uint8_t{0}, seed.bytes)});
   }
   return seeds;
 }
@@ -161,17 +162,12 @@ Seeds resultReaderSeeds() {
 // The bits of the first byte stand in display_data_fuzz.cpp.
 Seeds displayDataSeeds() {
   constexpr std::uint8_t kResourceKnownTraceAdded = 3;
-  constexpr std::uint8_t kCursorGiven = 4;
-  constexpr std::uint8_t kTwice = 8;
+  constexpr std::uint8_t kCursorGivenTwice = 4 | 8;
   Seeds seeds;
   for (const Seed& seed : buffers()) {
-    Bytes plain{kResourceKnownTraceAdded};
-    append(plain, seed.bytes);
-    seeds.push_back({seed.name, plain});
-    Bytes placed{kCursorGiven | kTwice};
-    append(placed, joined(std::int32_t{0}, static_cast<std::int32_t>(seed.bytes.size())));
-    append(placed, seed.bytes);
-    seeds.push_back({seed.name + "_placed", placed});
+    const auto size = static_cast<std::int32_t>(seed.bytes.size());
+    seeds.push_back({seed.name, joined(kResourceKnownTraceAdded, seed.bytes)});
+    seeds.push_back({seed.name + "_placed", joined(kCursorGivenTwice, std::int32_t{0}, size, seed.bytes)});
   }
   return seeds;
 }
@@ -197,15 +193,11 @@ constexpr std::int16_t kParameterCodes[] = {11,  13,  14,  15,  18,  43,  44,  4
                                             726, 727, 735, 736, 737, 740, 741, 742, 743, 744, 799, 810};
 
 Bytes operation(std::int16_t code, const Bytes& parameter) {
-  Bytes bytes = joined(Call::vfpOp, kHardwareId, code);
-  append(bytes, parameter);
-  return bytes;
+  return joined(Call::vfpOp, kHardwareId, code, parameter);
 }
 
 Bytes parameter(std::int16_t code, const Bytes& value) {
-  Bytes bytes = joined(Call::vfpSet, kHardwareId, code, std::int16_t{0});
-  append(bytes, value);
-  return bytes;
+  return joined(Call::vfpSet, kHardwareId, code, std::int16_t{0}, value);
 }
 
 Bytes mouse(Call event, std::int16_t xTwips, std::int16_t yTwips) {
@@ -214,75 +206,61 @@ Bytes mouse(Call event, std::int16_t xTwips, std::int16_t yTwips) {
 
 // A panel with a trace and levels in it.
 Bytes running() {
-  Bytes bytes = joined(kFlags, kShown);
-  append(bytes, operation(10, joined(Kind::Int16, std::int16_t{10})));
-  append(bytes, operation(12, joined(Kind::Empty)));
-  append(bytes, joined(Call::Publish, Kind::Singles, std::uint8_t{16}));
-  for (int i = 0; i < 16; ++i) append(bytes, raw(static_cast<float>(-100 + 7 * (i % 5))));
-  return bytes;
+  Bytes levels;
+  for (int i = 0; i < 16; ++i) levels = joined(levels, static_cast<float>(-100 + 7 * (i % 5)));
+  return joined(kFlags, kShown, operation(10, joined(Kind::Int16, std::int16_t{10})),
+                operation(12, joined(Kind::Empty)), Call::Publish, Kind::Singles, std::uint8_t{16}, levels);
 }
 
-Bytes session(std::initializer_list<Bytes> calls) {
-  Bytes bytes = running();
-  for (const Bytes& call : calls) append(bytes, call);
-  append(bytes, joined(Call::Paint));
-  return bytes;
+template <class... Calls>
+Bytes session(const Calls&... calls) {
+  return joined(running(), calls..., Call::Paint);
 }
 
 // Three traces, and the pointer taken down the view: the bar between them is under it somewhere.
 Bytes draggedBar() {
-  const Bytes traces[] = {joined(kAddTraceObject, std::int16_t{26}),
-                          joined(kAddTraceObject, std::int16_t{27}), joined(Call::Paint)};
-  Bytes bytes = running();
-  for (const Bytes& call : traces) append(bytes, call);
+  Bytes bytes =
+      joined(running(), kAddTraceObject, std::int16_t{26}, kAddTraceObject, std::int16_t{27}, Call::Paint);
   for (std::int16_t y = 900; y < 1800; y = static_cast<std::int16_t>(y + 60)) {
-    append(bytes, mouse(Call::MouseMove, 1800, y));
-    append(bytes, mouse(Call::MouseDown, 1800, y));
-    append(bytes, mouse(Call::MouseMove, 1800, static_cast<std::int16_t>(y + 300)));
-    append(bytes, mouse(Call::MouseUp, 1800, static_cast<std::int16_t>(y + 300)));
+    const auto to = static_cast<std::int16_t>(y + 300);
+    bytes = joined(bytes, mouse(Call::MouseMove, 1800, y), mouse(Call::MouseDown, 1800, y),
+                   mouse(Call::MouseMove, 1800, to), mouse(Call::MouseUp, 1800, to));
   }
   return bytes;
 }
 
 Seeds entryPointSeeds() {
   const Bytes one = joined(Kind::Int16, std::int16_t{1});
-  Seeds seeds{
-      {"markers", session({joined(kAddMarker), joined(kMarkerToMax), joined(kAddMarker), joined(kMarkerToMin),
-                           joined(kKeyDown, std::int16_t{39}, std::int8_t{0})})},
-      {"drag", session({joined(kAddMarker), mouse(Call::MouseDown, 1800, 1300),
-                        mouse(Call::MouseMove, 900, 1300), mouse(Call::MouseUp, 900, 1300)})},
-      {"markers_by_code",
-       session({parameter(740, one), parameter(741, joined(Kind::Boolean, std::uint8_t{1})),
-                parameter(744, one), parameter(743, one), parameter(742, one), parameter(735, one),
-                parameter(737, one)})},
-      {"saving",
-       session({joined(kFlags, std::uint8_t{kShown | kObeys}), operation(9, one), operation(13, one)})},
-      {"bar", draggedBar()},
-      {"two_traces", session({running(), joined(Call::Resize, std::int16_t{320}, std::int16_t{200})})}};
-  for (std::int16_t code = 0; code <= 22; ++code)
-    seeds.push_back({"operation_" + std::to_string(code), session({operation(code, one)})});
+  const Bytes yes = joined(Kind::Boolean, std::uint8_t{1});
+  const Bytes obeying = joined(kFlags, std::uint8_t{kShown | kObeys});
+  Seeds seeds{{"markers", session(kAddMarker, kMarkerToMax, kAddMarker, kMarkerToMin, kKeyDown,
+                                  std::int16_t{39}, std::int8_t{0})},
+              {"drag", session(kAddMarker, mouse(Call::MouseDown, 1800, 1300),
+                               mouse(Call::MouseMove, 900, 1300), mouse(Call::MouseUp, 900, 1300))},
+              {"markers_by_code",
+               session(parameter(740, one), parameter(741, yes), parameter(744, one), parameter(743, one),
+                       parameter(742, one), parameter(735, one), parameter(737, one))},
+              {"saving", session(obeying, operation(9, one), operation(13, one))},
+              {"bar", draggedBar()},
+              {"two_traces", session(running(), Call::Resize, std::int16_t{320}, std::int16_t{200})}};
+  const auto add = [&seeds](const std::string& name, int number, const Bytes& bytes) {
+    seeds.push_back({name + "_" + std::to_string(number), bytes});
+  };
+  for (std::int16_t code = 0; code <= 22; ++code) add("operation", code, session(operation(code, one)));
   for (const std::int16_t code : kParameterCodes) {
     const std::string name = "parameter_" + std::to_string(code);
-    seeds.push_back({name + "_number", session({parameter(code, joined(Kind::Double, 2.5))})});
-    seeds.push_back({name + "_text", session({parameter(code, joined(Kind::Text, std::uint8_t{2}, '1', '2')),
-                                              parameter(code, joined(Kind::Boolean, std::uint8_t{1}))})});
+    seeds.push_back({name + "_number", session(parameter(code, joined(Kind::Double, 2.5)))});
+    seeds.push_back({name + "_text", session(parameter(code, joined(Kind::Text, std::uint8_t{2}, '1', '2')),
+                                             parameter(code, yes))});
   }
   for (const std::int16_t button : kButtons)
-    seeds.push_back(
-        {"button_" + std::to_string(button),
-         session({joined(kFlags, std::uint8_t{kShown | kObeys}), joined(kPopUpClick, kHardwareId, button)})});
-  for (std::uint8_t call = 0; call <= kAddTraceObject; ++call)
-    seeds.push_back({"call_" + std::to_string(call), session({joined(call, 0, 0, 0, 0)})});
-  for (const Seed& seed : wholeBuffers()) {
-    Bytes call = joined(kDisplayData, static_cast<std::uint16_t>(seed.bytes.size()));
-    append(call, seed.bytes);
-    seeds.push_back({"display_" + seed.name, session({call})});
-  }
-  for (std::uint8_t kind = 0; kind < kKinds; ++kind) {
-    Bytes value{kind};
-    append(value, joined(std::uint8_t{2}, 1.5, 2.5));
-    seeds.push_back({"value_" + std::to_string(kind), session({parameter(717, value)})});
-  }
+    add("button", button, session(obeying, kPopUpClick, kHardwareId, button));
+  for (std::uint8_t call = 0; call <= kAddTraceObject; ++call) add("call", call, session(call, 0, 0, 0, 0));
+  for (const Seed& seed : wholeBuffers())
+    seeds.push_back({"display_" + seed.name,
+                     session(kDisplayData, static_cast<std::uint16_t>(seed.bytes.size()), seed.bytes)});
+  for (std::uint8_t kind = 0; kind < kKinds; ++kind)
+    add("value", kind, session(parameter(717, joined(kind, std::uint8_t{2}, 1.5, 2.5))));
   return seeds;
 }
 
@@ -295,16 +273,10 @@ Seeds entryParserSeeds() {
   constexpr std::uint8_t kFirstOfUnits = 24;
   Seeds seeds;
   for (const std::string text : {"98.1", "900k", "1.6 GHz", "-5e3 m", "1,5", "1e400", "nan", "k", ""})
-    for (std::uint8_t units = kFirstOfUnits; units < kFirstOfUnits + 5; ++units) {
-      Bytes steps = joined(units, kMaximum, 1e9);
-      for (const std::uint8_t way : {kLeave, kKey}) {
-        append(steps, joined(way, static_cast<std::uint8_t>(text.size())));
-        steps.insert(steps.end(), text.begin(), text.end());
-        if (way == kKey) append(steps, joined(std::int16_t{13}));
-      }
-      append(steps, joined(kFirstOfClicks, std::uint8_t{kFirstOfClicks + 1}));
-      seeds.push_back({"typed_" + std::to_string(seeds.size()), steps});
-    }
+    for (std::uint8_t units = kFirstOfUnits; units < kFirstOfUnits + 5; ++units)
+      seeds.push_back({"typed_" + std::to_string(seeds.size()),
+                       joined(units, kMaximum, 1e9, kLeave, sizeByte(text), text, kKey, sizeByte(text), text,
+                              std::int16_t{13}, kFirstOfClicks, std::uint8_t{kFirstOfClicks + 1})});
   return seeds;
 }
 
