@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <tuple>
+
 #include "painters/multi_trace_painter.h"
 #include "platform/result_writer.h"
 #include "tests/support/fake_panel_control.h"
@@ -42,6 +44,14 @@ class BaseVfpTest : public ReportingTest {
   std::int32_t op(std::int16_t operation, const Variant& parameter = {}) {
     return panel.op(operation, parameter);
   }
+  // Settings as a host sends them, each of which is taken.
+  struct Code {
+    int code;
+    Variant value;
+  };
+  void take(std::initializer_list<Code> codes) {
+    for (const auto& [code, value] : codes) EXPECT_EQ(set(static_cast<std::int16_t>(code), value), 0) << code;
+  }
   clsMultiTracePainter& addPainter() {
     auto painter = std::make_shared<clsMultiTracePainter>(gdi);
     panel.base.traceManager().addTraceObject(painter, 25);
@@ -65,24 +75,20 @@ class BaseVfpTest : public ReportingTest {
 };
 
 TEST_F(BaseVfpTest, NumbersAreStoredFromAnythingThatReadsAsOneElseReportedAndUnchanged) {
-  struct Row {
-    std::int16_t code;
-    Variant number;
-    const char* name;
-  };
-  const Row rows[] = {{43, " 0.25 ", "vfpSet() TIME_MEASUREMENT_PERIOD"},
-                      {44, std::int16_t{3}, "vfpSet() TIME_DATABASE_PERIOD"},
-                      {45, 4.0F, "vfpSet() TIME_DISPLAY_PERIOD"},
-                      {312, 2.5, "vfpSet() PARM_MEASUREMENT_ID"},
-                      {322, 0, "vfpSet() PARM_LOGGING_FLAG"},
-                      {704, 1, "vfpset() PARM_WINDOW_STATE"},
-                      {315, "12", "vfpSet() PARM_RESOURCE_ID"}};
-  for (const Row& row : rows) {
+  const std::tuple<std::int16_t, Variant, const char*> rows[] = {
+      {43, " 0.25 ", "vfpSet() TIME_MEASUREMENT_PERIOD"},
+      {44, std::int16_t{3}, "vfpSet() TIME_DATABASE_PERIOD"},
+      {45, 4.0F, "vfpSet() TIME_DISPLAY_PERIOD"},
+      {312, 2.5, "vfpSet() PARM_MEASUREMENT_ID"},
+      {322, 0, "vfpSet() PARM_LOGGING_FLAG"},
+      {704, 1, "vfpset() PARM_WINDOW_STATE"},
+      {315, "12", "vfpSet() PARM_RESOURCE_ID"}};
+  for (const auto& [code, number, name] : rows) {
     EXPECT_FALSE(base.resourceIdValid());
-    EXPECT_EQ(set(row.code, row.number), 0);
+    EXPECT_EQ(set(code, number), 0);
     for (const Variant& wrong : {Variant("abc"), Variant::null(), Variant(DateValue{1})}) {
-      EXPECT_EQ(set(row.code, wrong), -8);
-      EXPECT_EQ(reported(), Messages{std::string("clsBaseVFP::") + row.name + " must be numeric\r"});
+      EXPECT_EQ(set(code, wrong), -8);
+      EXPECT_EQ(reported(), Messages{std::string("clsBaseVFP::") + name + " must be numeric\r"});
     }
   }
   EXPECT_EQ(set(312, 1e10), -8);
@@ -106,13 +112,7 @@ TEST_F(BaseVfpTest, UnknownOperationsAnswerMinusOneAndUnhandledParametersAreRepo
 }
 
 TEST_F(BaseVfpTest, WindowParametersActOnTheWindowOnlyWhereThePanelOwnsIt) {
-  struct Row {
-    std::int16_t code;
-    Variant value;
-    std::int32_t status;
-    Messages calls;
-  };
-  const Row rows[] = {
+  const std::tuple<std::int16_t, Variant, std::int32_t, Messages> rows[] = {
       {700, 150, 0, {"visible off", "viewState 0", "left 150"}},
       {701, "-15.5", 0, {"visible off", "viewState 0", "top -15.5"}},
       {702, 3e3, 0, {"visible off", "viewState 0", "width 3000"}},
@@ -122,13 +122,13 @@ TEST_F(BaseVfpTest, WindowParametersActOnTheWindowOnlyWhereThePanelOwnsIt) {
       {727, " True ", 0, {"visible on"}},
       {727, 0, 0, {"visible off"}},
   };
-  for (const Row& row : rows) {
+  for (const auto& [code, value, status, calls] : rows) {
     base.windowOwner = true;
-    EXPECT_EQ(set(row.code, row.value), row.status) << row.code;
-    EXPECT_EQ(panel.calls(), row.calls) << row.code;
+    EXPECT_EQ(set(code, value), status) << code;
+    EXPECT_EQ(panel.calls(), calls) << code;
     base.windowOwner = false;
-    EXPECT_EQ(set(row.code, row.value), 0) << row.code;
-    EXPECT_EQ(panel.calls(), Messages{}) << row.code;
+    EXPECT_EQ(set(code, value), 0) << code;
+    EXPECT_EQ(panel.calls(), Messages{}) << code;
   }
   EXPECT_EQ(reported(), Messages{"clsBaseVFP::vfpSet() ... \rType mismatch"});
 }
@@ -149,12 +149,7 @@ TEST_F(BaseVfpTest, ShowingHidesNormalisesAndShowsAWindowThatThePanelOwns) {
 
 // Each row goes on from the one before.
 TEST_F(BaseVfpTest, TheCaptionEndsInOneStatusWordByPlaybackLoggingAndSaving) {
-  struct Row {
-    const char* what;
-    std::function<void()> step;
-    const char* caption;
-  };
-  const Row rows[] = {
+  const std::tuple<const char*, std::function<void()>, const char*> rows[] = {
       {"caption", [&] { set(314, "RX "); }, "RX "},
       {"unsaved", [&] { set(810, 0); }, "RX Unsaved"},
       {"saved", [&] { set(810, true); }, "RX LOG OFF"},
@@ -171,9 +166,9 @@ TEST_F(BaseVfpTest, TheCaptionEndsInOneStatusWordByPlaybackLoggingAndSaving) {
       {"saved is applied at once", [&] { set(810, "True"); }, "RX LOG OFF"},
       {"a word that is no boolean", [&] { set(810, "yes"); }, "RX LOG OFF"},
   };
-  for (const Row& row : rows) {
-    row.step();
-    EXPECT_EQ(base.Caption(), row.caption) << row.what;
+  for (const auto& [what, step, caption] : rows) {
+    step();
+    EXPECT_EQ(base.Caption(), caption) << what;
   }
   EXPECT_EQ(reported(), Messages{"clsBaseVFP::vfpSet() ... \rType mismatch"});
   base.multipleMeasurementVfp = true;
@@ -247,25 +242,20 @@ TEST_F(BaseVfpTest, MenuItemsAskTheHostOrSwitchTheAreas) {
 TEST_F(BaseVfpTest, RequestsToTheHostReportRefusals) {
   set(315, 5);
   base.virtualFrontPanelId = 6;
-  struct Row {
-    std::function<void()> ask;
-    const char* call;
-    const char* message;
-  };
-  const Row rows[] = {
+  const std::tuple<std::function<void()>, const char*, const char*> rows[] = {
       {[&] { base.closeVfp(); }, "frontPanelOp 5 6 1", "QUILL_VFP_CLOSE failed"},
       {[&] { base.saveVfp(); }, "frontPanelOp 5 6 9", "QUILL_VFP_SAVE failed"},
       {[&] { op(9); }, "saveDisplaySettings 5 6", "SpectrumView::saveBase() status = -3"},
       {[&] { op(13, "77"); }, "saveSetup 77 5 6", "SpectrumView::saveSetup() status = -3"},
   };
-  for (const Row& row : rows) {
+  for (const auto& [ask, call, message] : rows) {
     control.owner().status = 0;
-    row.ask();
-    EXPECT_EQ(panel.calls(), Messages{row.call});
+    ask();
+    EXPECT_EQ(panel.calls(), Messages{call});
     EXPECT_EQ(reported(), Messages{});
     control.owner().status = -3;
-    row.ask();
-    EXPECT_EQ(reported(), Messages{row.message});
+    ask();
+    EXPECT_EQ(reported(), Messages{message});
     panel.calls();
   }
   EXPECT_EQ(op(13, "set-up"), -8);
@@ -374,11 +364,8 @@ TEST_F(BaseVfpTest, AxisCodesReachTheActivePainterAndNeedOne) {
   Messages log;
   base.traceManager().addTraceObject(std::make_shared<FakeTraceObject>("clsMultiTracePainter", &log), 25);
   log.clear();
-  EXPECT_EQ(set(714, 2), 0);
-  EXPECT_EQ(set(716, 0.1F), 0);  // through text: 0.1, not the 0.100000001 of single precision
-  EXPECT_EQ(set(717, -20), 0);
-  EXPECT_EQ(set(719, 1), 0);
-  EXPECT_EQ(set(722, true), 0);
+  // 716 goes through text: 0.1, not the 0.100000001 of single precision.
+  take({{714, 2}, {716, 0.1F}, {717, -20}, {719, 1}, {722, true}});
   EXPECT_EQ(log, (Messages{"25 xAxisStyle 2", "25 verticalResolution 0.100000", "25 gridScaleTop -20.000000",
                            "25 yAxisStyle 1", "25 setAutoScale on"}));
   EXPECT_EQ(set(799, 0), 0);
@@ -394,9 +381,7 @@ TEST_F(BaseVfpTest, TracesAndMarkersAreMadeByASequenceOfCodes) {
   EXPECT_EQ(reported(), Messages{"clsBaseVFP::vfpSet() ... marker request without a trace\r"});
   EXPECT_EQ(set(736, 40), 0);  // without a trace there is no next one
   clsMultiTracePainter& painter = addPainter();
-  EXPECT_EQ(set(735, 0), 0);
-  EXPECT_EQ(set(736, "300"), 0);
-  EXPECT_EQ(set(735, 2.5), 0);
+  take({{735, 0}, {736, "300"}, {735, 2.5}});
   EXPECT_EQ(painter.findATraceByPN(0), 0);
   EXPECT_EQ(painter.findATraceByPN(300), 1);
   EXPECT_EQ(painter.traceValue(1), 2.5);
@@ -407,9 +392,7 @@ TEST_F(BaseVfpTest, TracesAndMarkersAreMadeByASequenceOfCodes) {
   EXPECT_EQ(reported(), (Messages{"clsBaseVFP::vfpSet() ... \rObject variable or With block variable not set",
                                   "clsBaseVFP::vfpSet() ... \rInvalid procedure call or argument"}));
   panel.calls();
-  for (const auto& [code, value] : std::vector<std::pair<std::int16_t, Variant>>{
-           {740, 4}, {744, 12}, {743, 300}, {742, true}, {740, 4}, {741, "TRUE"}, {744, 15}, {743, 999}})
-    EXPECT_EQ(set(code, value), 0) << code;
+  take({{740, 4}, {744, 12}, {743, 300}, {742, true}, {740, 4}, {741, "TRUE"}, {744, 15}, {743, 999}});
   ASSERT_EQ(painter.markerCollection().count(), 2U);  // PN 999 is nobody's: the selected trace
   const clsMarker& plain = *painter.markerCollection().item("4");
   const clsMarker& delta = *painter.markerCollection().item("4d");
@@ -434,27 +417,10 @@ TEST_F(BaseVfpTest, TracesAndMarkersAreMadeByASequenceOfCodes) {
 }
 
 TEST_F(BaseVfpTest, WhatASaveHandsOverRestoresAnotherPanel) {
-  for (const auto& [code, value] : std::vector<std::pair<std::int16_t, Variant>>{
-           {43, 0.5}, {44, 60}, {45, 2}, {705, false}, {799, false}})
-    set(code, value);
+  take({{43, 0.5}, {44, 60}, {45, 2}, {705, false}, {799, false}});
   addPainter().numberOfTraces(1);
-  for (const auto& [code, value] : std::vector<std::pair<std::int16_t, Variant>>{{714, 3},
-                                                                                 {719, 1},
-                                                                                 {716, 2.5},
-                                                                                 {717, -17},
-                                                                                 {722, true},
-                                                                                 {740, 2},
-                                                                                 {744, 30},
-                                                                                 {743, 0},
-                                                                                 {740, 1},
-                                                                                 {744, 7},
-                                                                                 {743, 0},
-                                                                                 {742, 1},
-                                                                                 {740, 2},
-                                                                                 {741, true},
-                                                                                 {744, 9},
-                                                                                 {743, 0}})
-    EXPECT_EQ(set(code, value), 0) << code;
+  take({{714, 3}, {719, 1}, {716, 2.5}, {717, -17}, {722, true}, {740, 2}, {744, 30}, {743, 0}});
+  take({{740, 1}, {744, 7}, {743, 0}, {742, 1}, {740, 2}, {741, true}, {744, 9}, {743, 0}});
   op(9);
   const PanelSettings kept = control.owner().kept;
   EXPECT_EQ(kept.front(), (PanelSetting{43, 0.5}));
@@ -521,28 +487,23 @@ class DisplayDataTest : public BaseVfpTest {
 };
 
 TEST_F(DisplayDataTest, EveryRecordReachesThePanelAndUnreadOnesAreSteppedOver) {
-  struct Row {
-    const char* what;
-    int readsOf99;
-    Messages messages;
-  };
   const std::string panelName = "SpectrumView::DisplayData() ... ";
-  const Row rows[] = {{"all", 2, {}},
-                      {"half", 1, {panelName + "partial data read for result type 99\r"}},
-                      {"none", 0, {panelName + "no data read for result type 99\r"}}};
+  const std::pair<int, Messages> rows[] = {{2, {}},
+                                           {1, {panelName + "partial data read for result type 99\r"}},
+                                           {0, {panelName + "no data read for result type 99\r"}}};
   base.measurementId = 2;
-  for (const Row& row : rows) {
+  for (const auto& [readsOf99, texts] : rows) {
     Messages values;
-    control.readResult = [&](std::int32_t type, ResultReader& reader) {
-      for (int i = 0; i < (type == 25 ? 1 : row.readsOf99); ++i)
+    control.readResult = [&values, reads = readsOf99](std::int32_t type, ResultReader& reader) {
+      for (int i = 0; i < (type == 25 ? 1 : reads); ++i)
         values.push_back(std::to_string(reader.GetMeasurementInt32()));
     };
-    EXPECT_EQ(display(buffer()), 0) << row.what;
-    EXPECT_EQ(values.size(), 2U + static_cast<std::size_t>(row.readsOf99)) << row.what;
-    EXPECT_EQ(values[1], "11") << row.what;
-    EXPECT_EQ(dataCount, 0) << row.what;
-    EXPECT_EQ(dataPointer, static_cast<std::int32_t>(buffer().size())) << row.what;
-    EXPECT_EQ(reported(), row.messages) << row.what;
+    EXPECT_EQ(display(buffer()), 0) << readsOf99;
+    EXPECT_EQ(values.size(), 2U + static_cast<std::size_t>(readsOf99));
+    EXPECT_EQ(values[1], "11") << readsOf99;
+    EXPECT_EQ(dataCount, 0) << readsOf99;
+    EXPECT_EQ(dataPointer, static_cast<std::int32_t>(buffer().size())) << readsOf99;
+    EXPECT_EQ(reported(), texts) << readsOf99;
   }
   control.readResult = nullptr;
   base.multipleMeasurementVfp = true;
