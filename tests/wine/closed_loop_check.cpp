@@ -36,14 +36,14 @@ class Host final : public Listener {
  public:
   std::vector<std::string> heard;  // "set 13 881520000" or "op 2"
 
-  explicit Host(IDispatch& panel) : panel_(panel), sweep_(recordedSweep()) {}
+  explicit Host(const Hosted& panel) : panel_(panel), sweep_(recordedSweep()) {}
   HRESULT STDMETHODCALLTYPE Invoke(DISPID member, REFIID, LCID, WORD, DISPPARAMS* parameters, VARIANT*,
                                    EXCEPINFO*, UINT*) override;
   void show();
   void answer();
 
  private:
-  IDispatch& panel_;
+  const Hosted& panel_;
   Receiver receiver_;
   Sweep sweep_;
 };
@@ -72,7 +72,7 @@ void Host::show() {
 void Host::answer() {
   pumpMessages();
   for (const ReceiverSetting& answer : receiver_.takeAnswers())
-    call(panel_, L"vfpSet", {0, static_cast<int>(answer.code), 0, answer.value});
+    panel_.call(L"vfpSet", {0, static_cast<int>(answer.code), 0, answer.value});
   show();
 }
 
@@ -160,24 +160,18 @@ void buttonsAskForSweeps(HWND view, Host& host) {
 }
 
 void goesRound(HWND window) {
-  FullContainer container(window);
-  container.place = {0, 0, kSizePx.cx, kSizePx.cy};
-  Hosted hosted;
-  if (!hosted.object) return expect(false, "the registered control is created");
-  IDispatch& panel = *hosted.members.get();
-  hosted.object->SetClientSite(&container);
+  Sited hosted(window);
+  hosted.container.place = {0, 0, kSizePx.cx, kSizePx.cy};
   hosted.verb(OLEIVERB_UIACTIVATE);
-  Host host(panel);
-  DWORD cookie = 0;
-  const auto point = pointOf(panel, eventsOf(panel));
-  point->Advise(&host, &cookie);
+  Host host(hosted);
+  hosted.advise(host);
   for (const auto& [code, value] : {std::pair{13, 880e6}, {14, 40e6}})
-    call(panel, L"vfpSet", {0, code, 0, value});
+    hosted.call(L"vfpSet", {0, code, 0, value});
   host.show();
   expect(host.heard.empty(), "what a host sends does not come back to it");
   eachEntryGoesRoundOnce(hosted.window(), host);
   buttonsAskForSweeps(hosted.window(), host);
-  point->Unadvise(cookie);
+  hosted.close();  // before its host goes
 }
 
 }  // namespace
@@ -185,20 +179,6 @@ void goesRound(HWND window) {
 
 int main() {
   using namespace frontpanels::testing;
-  OleInitialize(nullptr);
   chapter("closed loop");
-  {
-    const auto diagnostics = create<IDispatch>(L"FrontPanels.Diagnostics");
-    if (diagnostics) put(*diagnostics.get(), L"ShowMessages", false);
-    const HWND window = CreateWindowExW(0, L"STATIC", L"container", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 0, 0,
-                                        kSizePx.cx + 20, kSizePx.cy + 40, nullptr, nullptr, nullptr, nullptr);
-    SetForegroundWindow(window);
-    pumpMessages();
-    goesRound(window);
-    expect(diagnostics && call(*diagnostics.get(), L"Count").number() == 0,
-           "nothing was reported on the way");
-    DestroyWindow(window);
-  }
-  OleUninitialize();
-  return verdict();
+  return runChecks({kSizePx.cx + 20, kSizePx.cy + 40}, [](const Desk& desk) { goesRound(desk.window); });
 }

@@ -1,5 +1,8 @@
 #include "tests/wine/com_client.h"
 
+#include <ole2.h>
+
+#include <algorithm>
 #include <cstdio>
 #include <cstring>
 
@@ -23,6 +26,28 @@ void chapter(std::string name) { about = std::move(name); }
 int verdict() {
   std::printf("%d passed, %d failed\n", passed, failed);
   return failed == 0 && passed > 0 ? 0 : 1;
+}
+
+int runChecks(SIZE windowPx, const std::function<void(const Desk&)>& checks,
+              const std::function<void()>& after) {
+  OleInitialize(nullptr);
+  if (const auto diagnostics = create<IDispatch>(L"FrontPanels.Diagnostics")) {
+    put(*diagnostics.get(), L"ShowMessages", false);
+    call(*diagnostics.get(), L"Clear");
+    const HWND window = CreateWindowExW(0, L"STATIC", L"container", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 0, 0,
+                                        windowPx.cx, windowPx.cy, nullptr, nullptr, nullptr, nullptr);
+    SetForegroundWindow(window);
+    pumpMessages();
+    checks({*diagnostics.get(), window});
+    expect(call(*diagnostics.get(), L"Count").number() == 0 && FindWindowW(L"#32770", nullptr) == nullptr,
+           "nothing was reported on the way, and no box is open");
+    DestroyWindow(window);
+  } else {
+    expect(false, "the classes can be created");
+  }
+  after();
+  OleUninitialize();
+  return verdict();
 }
 
 Value::Value(const std::vector<float>& singles) : Value() {
@@ -61,9 +86,14 @@ DISPID memberOf(IDispatch& object, const wchar_t* name) {
 }
 
 Value call(IDispatch& object, const wchar_t* name, std::initializer_list<Value> arguments) {
-  std::vector<VARIANT> reversed;
-  for (const Value& argument : arguments) reversed.insert(reversed.begin(), argument.variant());
-  DISPPARAMS parameters{reversed.data(), nullptr, static_cast<UINT>(reversed.size()), 0};
+  std::vector<VARIANT> raw;
+  for (const Value& argument : arguments) raw.push_back(argument.variant());
+  return callRaw(object, name, std::move(raw));
+}
+
+Value callRaw(IDispatch& object, const wchar_t* name, std::vector<VARIANT> arguments) {
+  std::reverse(arguments.begin(), arguments.end());
+  DISPPARAMS parameters{arguments.data(), nullptr, static_cast<UINT>(arguments.size()), 0};
   Value result;
   object.Invoke(memberOf(object, name), IID_NULL, LOCALE_USER_DEFAULT, DISPATCH_METHOD | DISPATCH_PROPERTYGET,
                 &parameters, result.get(), nullptr, nullptr);

@@ -6,6 +6,7 @@
 #include <oleauto.h>
 
 #include <cstdint>
+#include <functional>
 #include <initializer_list>
 #include <string>
 #include <utility>
@@ -52,6 +53,17 @@ class Value {
   VARIANT variant_;
 };
 
+// What all checks of a program share: the reports, and a window of the foreground to site controls on.
+struct Desk {
+  IDispatch& diagnostics;
+  HWND window;
+};
+// Runs checks, then demands that nothing was reported nor asked of the user on the way; `after` follows when
+// nothing of the library is held any more. Answers as verdict() does.
+[[nodiscard]] int runChecks(
+    SIZE windowPx, const std::function<void(const Desk&)>& checks,
+    const std::function<void()>& after = [] {});
+
 [[nodiscard]] CLSID classOf(const wchar_t* progId);
 
 template <class Interface>
@@ -65,6 +77,8 @@ template <class Interface>
 [[nodiscard]] DISPID memberOf(IDispatch& object, const wchar_t* name);
 // A method or a property; arguments in the order of the declaration.
 Value call(IDispatch& object, const wchar_t* name, std::initializer_list<Value> arguments = {});
+// The same with values as they are, nobody's to be copied or freed.
+Value callRaw(IDispatch& object, const wchar_t* name, std::vector<VARIANT> arguments);
 HRESULT put(IDispatch& object, const wchar_t* name, Value value);
 
 void pumpMessages();

@@ -18,9 +18,8 @@ namespace {
 constexpr SIZE kSizePx{640, 480};
 constexpr int kDotsPerInch = 96;
 
-void sitAndActivate(Hosted& hosted, FullContainer& container) {
-  container.place = {0, 0, kSizePx.cx, kSizePx.cy};
-  hosted.object->SetClientSite(&container);
+void activate(Sited& hosted) {
+  hosted.container.place = {0, 0, kSizePx.cx, kSizePx.cy};
   hosted.object.query<IPersistStreamInit>()->InitNew();
   SIZEL extent{1000, 1000};
   hosted.object->SetExtent(DVASPECT_CONTENT, &extent);
@@ -35,11 +34,9 @@ int tracePixelsOf(HWND window) {
 }
 
 void showsASweep(HWND window) {
-  FullContainer container(window);
-  Hosted hosted;
-  expect(static_cast<bool>(hosted.object), "the registered control is created");
-  if (!hosted.object) return;
-  sitAndActivate(hosted, container);
+  Sited hosted(window);
+  FullContainer& container = hosted.container;
+  activate(hosted);
   DWORD status = 0;
   hosted.object->GetMiscStatus(DVASPECT_CONTENT, &status);
   expect(status == 131473, "its status bits are those of an inside-out control");
@@ -140,14 +137,12 @@ std::uintptr_t highestHandle() {
 void leavesNothingBehind(HWND window) {
   constexpr int kCycles = 50;
   const auto cycle = [window] {
-    FullContainer container(window);
-    {
-      Hosted hosted;
-      sitAndActivate(hosted, container);
-      publish(carrier());
-      pumpMessages();
-    }
-    return container.references == 1 && container.count("OnInPlaceDeactivate") == 1;
+    Sited hosted(window);
+    activate(hosted);
+    publish(carrier());
+    pumpMessages();
+    hosted.close();
+    return hosted.container.references == 1 && hosted.container.count("OnInPlaceDeactivate") == 1;
   };
   bool clean = cycle();
   const DWORD gdiBefore = GetGuiResources(GetCurrentProcess(), GR_GDIOBJECTS);
@@ -164,28 +159,19 @@ void leavesNothingBehind(HWND window) {
 }  // namespace
 
 int check() {
-  OleInitialize(nullptr);
   chapter("container");
-  {
-    const auto diagnostics = create<IDispatch>(L"FrontPanels.Diagnostics");
-    if (diagnostics) put(*diagnostics.get(), L"ShowMessages", false);
-    const HWND window = CreateWindowExW(0, L"STATIC", L"container", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 0, 0,
-                                        800, 700, nullptr, nullptr, nullptr, nullptr);
-    pumpMessages();
-    showsASweep(window);
+  const auto checks = [](const Desk& desk) {
+    showsASweep(desk.window);
     drawsWithoutAWindow();
     keepsItsPropertiesInAStream();
     isPartOfAnAggregate();
-    leavesNothingBehind(window);
-    expect(diagnostics && call(*diagnostics.get(), L"Count").number() == 0,
-           "nothing was reported on the way");
-    DestroyWindow(window);
-  }
-  CoFreeUnusedLibrariesEx(0, 0);
-  expect(GetModuleHandleW(L"frontpanels.ocx") == nullptr,
-         "the library is unloaded once nothing of it is in use");
-  OleUninitialize();
-  return verdict();
+    leavesNothingBehind(desk.window);
+  };
+  return runChecks({800, 700}, checks, [] {
+    CoFreeUnusedLibrariesEx(0, 0);
+    expect(GetModuleHandleW(L"frontpanels.ocx") == nullptr,
+           "the library is unloaded once nothing of it is in use");
+  });
 }
 
 }  // namespace frontpanels::testing

@@ -17,6 +17,7 @@
 
 #include "tests/wine/com_client.h"
 #include "tests/wine/full_container.h"
+#include "tests/wine/panel_user.h"
 
 namespace frontpanels::testing {
 namespace {
@@ -24,47 +25,73 @@ namespace {
 constexpr int kHardwareId = 7;
 
 using Texts = std::vector<std::string>;
+using Lines = std::vector<std::wstring>;
 
-std::wstring takeMessages(IDispatch& diagnostics) {
+std::wstring takeMessages(const Desk& desk) {
   std::wstring all;
-  const int messages = call(diagnostics, L"Count").number();
-  for (int i = 0; i < messages; ++i) all += call(diagnostics, L"Message", {i}).text() + L"|";
-  call(diagnostics, L"Clear");
+  const int messages = call(desk.diagnostics, L"Count").number();
+  for (int i = 0; i < messages; ++i) all += call(desk.diagnostics, L"Message", {i}).text() + L"|";
+  call(desk.diagnostics, L"Clear");
   return all;
 }
 
 // --- Requests
 
-void answersOfTheHost(IDispatch& diagnostics) {
-  chapter("requests");
+// Notes any event: its number, then the arguments as texts, none for an empty one, the status as it came in.
+class EventSink final : public Listener {
+ public:
+  Lines received;
+  std::function<void()> during = [] {};  // in the middle of the event
+  HRESULT answer = S_OK;                 // DISP_E_MEMBERNOTFOUND: no handler
+  LONG status = 0;                       // what is written into the status
+
+  HRESULT STDMETHODCALLTYPE Invoke(DISPID member, REFIID, LCID, WORD, DISPPARAMS* parameters, VARIANT*,
+                                   EXCEPINFO*, UINT*) override {
+    if (answer != S_OK) return answer;
+    VARIANT* const arguments = parameters->rgvarg;  // the last comes first
+    if (V_VT(&arguments[0]) != (VT_BYREF | VT_I4)) return DISP_E_TYPEMISMATCH;
+    std::wstring line = std::to_wstring(member);
+    for (UINT i = parameters->cArgs; i > 0; --i) {
+      Value text;
+      const bool plain = SUCCEEDED(VariantChangeType(text.get(), &arguments[i - 1], 0, VT_BSTR));
+      line += L" " + (plain ? text.text() : std::wstring(L"?"));
+    }
+    received.push_back(line);
+    *V_I4REF(&arguments[0]) = status;
+    during();
+    return S_OK;
+  }
+};
+
+void answersOfTheHost(const Desk& desk) {
   Hosted hosted;
-  call(*hosted.members.get(), L"vfpSet", {0, 315, 0, kHardwareId});
-  call(*hosted.members.get(), L"closeVfp");
-  expect(takeMessages(diagnostics).empty(), "without a sink the answer is 0");
+  hosted.call(L"vfpSet", {0, 315, 0, kHardwareId});
+  hosted.call(L"closeVfp");
+  expect(takeMessages(desk).empty(), "without a sink the answer is 0");
 
   const auto point = pointOf(*hosted.members.get(), eventsOf(*hosted.members.get()));
-  RequestSink first;
-  RequestSink second;
+  EventSink first;
+  EventSink second;
   DWORD firstCookie = 0;
   DWORD secondCookie = 0;
   point->Advise(&first, &firstCookie);
   point->Advise(&second, &secondCookie);
   first.status = 5;
-  call(*hosted.members.get(), L"closeVfp");
-  expect(first.received == std::vector<int>{kHardwareId, 0, 1, 0}, "resource, panel and operation arrive");
-  expect(second.received == std::vector<int>{kHardwareId, 0, 1, 5}, "the next sink sees the answer so far");
-  expect(takeMessages(diagnostics).empty(), "the last sink decides");
+  hosted.call(L"closeVfp");
+  expect(first.received == Lines{L"1 7 0 1  0"}, "resource, panel and operation arrive");
+  expect(second.received == Lines{L"1 7 0 1  5"}, "the next sink sees the answer so far");
+  expect(takeMessages(desk).empty(), "the last sink decides");
 
   second.answer = DISP_E_MEMBERNOTFOUND;
-  call(*hosted.members.get(), L"closeVfp");
-  expect(takeMessages(diagnostics) == L"QUILL_VFP_CLOSE failed|",
+  hosted.call(L"closeVfp");
+  expect(takeMessages(desk) == L"QUILL_VFP_CLOSE failed|",
          "a sink without a handler leaves the answer alone");
 
   second.answer = S_OK;
   second.received.clear();
   first.during = [&] { point->Unadvise(secondCookie); };
-  call(*hosted.members.get(), L"closeVfp");
-  expect(second.received.empty() && takeMessages(diagnostics) == L"QUILL_VFP_CLOSE failed|",
+  hosted.call(L"closeVfp");
+  expect(second.received.empty() && takeMessages(desk) == L"QUILL_VFP_CLOSE failed|",
          "a sink that has left in the meantime hears nothing");
   first.during = [] {};
 
@@ -73,10 +100,10 @@ void answersOfTheHost(IDispatch& diagnostics) {
   control->FreezeEvents(TRUE);
   control->FreezeEvents(FALSE);
   first.received.clear();
-  call(*hosted.members.get(), L"closeVfp");
+  hosted.call(L"closeVfp");
   expect(first.received.empty(), "frozen twice and thawed once is still frozen");
   control->FreezeEvents(FALSE);
-  call(*hosted.members.get(), L"closeVfp");
+  hosted.call(L"closeVfp");
   expect(!first.received.empty(), "thawed twice is not");
   point->Unadvise(firstCookie);
   DWORD again = 0;
@@ -88,38 +115,13 @@ void answersOfTheHost(IDispatch& diagnostics) {
   expect(first.references == 1 && second.references == 1, "no reference to a sink is left");
 }
 
-// Notes any event: its number, then the arguments as text, the status left out.
-class EventSink final : public Listener {
- public:
-  std::vector<std::wstring> received;
-  std::function<void()> during = [] {};
-  LONG status = 0;
-
-  HRESULT STDMETHODCALLTYPE Invoke(DISPID member, REFIID, LCID, WORD, DISPPARAMS* parameters, VARIANT*,
-                                   EXCEPINFO*, UINT*) override {
-    std::wstring line = std::to_wstring(member);
-    for (UINT i = parameters->cArgs - 1; i > 0; --i) {
-      Value text;
-      const bool plain = SUCCEEDED(VariantChangeType(text.get(), &parameters->rgvarg[i], 0, VT_BSTR));
-      line += L" " + (plain ? text.text() : std::wstring(L"?"));
-    }
-    received.push_back(line);
-    *V_I4REF(&parameters->rgvarg[0]) = status;
-    during();
-    return S_OK;
-  }
-};
-
-void settingsForKeeping(IDispatch& diagnostics) {
-  chapter("settings for keeping");
+void settingsForKeeping(const Desk& desk) {
+  EventSink sink;
   Hosted hosted;
   IDispatch& panel = *hosted.members.get();
   put(panel, L"virtualFrontPanelId", 6);
   call(panel, L"vfpSet", {0, 315, 0, kHardwareId});
-  EventSink sink;
-  DWORD cookie = 0;
-  const auto point = pointOf(panel, eventsOf(panel));
-  point->Advise(&sink, &cookie);
+  hosted.advise(sink);
   LONG kept = 0;
   sink.during = [&] {
     const Value list = call(panel, L"Settings");
@@ -127,20 +129,17 @@ void settingsForKeeping(IDispatch& diagnostics) {
       SafeArrayGetUBound(V_ARRAY(&list.variant()), 1, &kept);
   };
   sink.status = 2;
-  call(diagnostics, L"Clear");
+  call(desk.diagnostics, L"Clear");
   expect(call(panel, L"vfpOp", {0, 9}).number() == 0 && call(panel, L"vfpOp", {0, 13, 77}).number() == 0,
          "both saves answer 0");
-  const std::wstring resource = std::to_wstring(kHardwareId);
-  expect(sink.received == std::vector<std::wstring>{L"3 " + resource + L" 6 ?", L"4 77 " + resource + L" 6"},
+  expect(sink.received == Lines{L"3 7 6 ? 0", L"4 77 7 6 0"},
          "a list is handed over, and the id of a set-up");
   expect(kept > 10, "whose settings can be read inside the event");
-  expect(takeMessages(diagnostics) ==
-             L"SpectrumView::saveBase() status = 2|SpectrumView::saveSetup() status = 2|",
+  expect(takeMessages(desk) == L"SpectrumView::saveBase() status = 2|SpectrumView::saveSetup() status = 2|",
          "a host that refuses is reported");
   call(panel, L"PopUp_Click", {0, 1002});
-  expect(sink.received.back() == L"1 " + resource + L" 6 21 0", "the menu's request carries its argument");
-  call(diagnostics, L"Clear");
-  point->Unadvise(cookie);
+  expect(sink.received.back() == L"1 7 6 21 0 0", "the menu's request carries its argument");
+  call(desk.diagnostics, L"Clear");
 }
 
 constexpr VARTYPE kAutomationTypes[] = {
@@ -183,17 +182,7 @@ bool isStatus(const Value& answer) {
   return V_VT(&answer.variant()) == VT_I4 && (status == 0 || status == -1 || status == -8);
 }
 
-Value callWith(IDispatch& object, const wchar_t* name, std::vector<VARIANT> arguments) {
-  std::reverse(arguments.begin(), arguments.end());
-  DISPPARAMS parameters{arguments.data(), nullptr, static_cast<UINT>(arguments.size()), 0};
-  Value result;
-  object.Invoke(memberOf(object, name), IID_NULL, LOCALE_USER_DEFAULT, DISPATCH_METHOD, &parameters,
-                result.get(), nullptr, nullptr);
-  return result;
-}
-
-void anyValueAtAll(IDispatch& diagnostics) {
-  chapter("any value at all");
+void anyValueAtAll(const Desk& desk) {
   Hosted hosted;
   IDispatch& panel = *hosted.members.get();
   std::vector<Value> owned;
@@ -204,9 +193,9 @@ void anyValueAtAll(IDispatch& diagnostics) {
     for (const int code : {9, 10, 13, 15, 21, 43, 312, 314, 315, 322, 700, 704, 706, 716, 727, 740, 810}) {
       const Value number(code);
       strange +=
-          !isStatus(callWith(panel, L"vfpSet", {zero.variant(), number.variant(), zero.variant(), value}));
-      strange += !isStatus(callWith(panel, L"vfpOp", {zero.variant(), number.variant(), value}));
-      strange += !isStatus(callWith(panel, L"displayParameter", {number.variant(), value}));
+          !isStatus(callRaw(panel, L"vfpSet", {zero.variant(), number.variant(), zero.variant(), value}));
+      strange += !isStatus(callRaw(panel, L"vfpOp", {zero.variant(), number.variant(), value}));
+      strange += !isStatus(callRaw(panel, L"displayParameter", {number.variant(), value}));
     }
     LONG cursor = 0;
     LONG left = 2;
@@ -216,33 +205,23 @@ void anyValueAtAll(IDispatch& diagnostics) {
     VARIANT byLeft = byCursor;
     V_I4REF(&byLeft) = &left;
     strange += !isStatus(
-        callWith(panel, L"displayData", {value, value, byCursor, byLeft, zero.variant(), zero.variant()}));
+        callRaw(panel, L"displayData", {value, value, byCursor, byLeft, zero.variant(), zero.variant()}));
   }
   expect(strange == 0, "every entry point answers a status to " + std::to_string(values.size()) + " values" +
                            (strange == 0 ? "" : ", but not " + std::to_string(strange) + " times"));
-  call(diagnostics, L"Clear");
+  call(desk.diagnostics, L"Clear");
 }
 
-void closedInItsOwnRequest(HWND window) {
-  chapter("closed in its own request");
-  FullContainer container(window);
-  RequestSink sink;
-  {
-    Hosted hosted;
-    hosted.object->SetClientSite(&container);
-    hosted.verb(OLEIVERB_UIACTIVATE);
-    DWORD cookie = 0;
-    const auto point = pointOf(*hosted.members.get(), eventsOf(*hosted.members.get()));
-    point->Advise(&sink, &cookie);
-    IDispatch* const members = hosted.members.get();
-    sink.during = [&] {
-      hosted.close();
-      const_cast<ComPointer<IConnectionPoint>&>(point).reset();
-    };
-    call(*members, L"closeVfp");
-  }
-  expect(container.count("OnInPlaceDeactivate") == 1, "it is deactivated once");
-  expect(container.references == 1 && sink.references == 1, "and holds nothing any more");
+void closedInItsOwnRequest(const Desk& desk) {
+  EventSink sink;
+  Sited hosted(desk.window, OLEIVERB_UIACTIVATE);
+  hosted.advise(sink);
+  sink.during = [&] { hosted.close(); };
+  IDispatch* const members = hosted.members.get();
+  call(*members, L"closeVfp");
+  expect(hosted.container.count("OnInPlaceDeactivate") == 1, "it is deactivated once");
+  expect(hosted.container.references == 1 && sink.references == 1, "and holds nothing any more");
+  takeMessages(desk);  // what closing in the middle of a request reports is not looked at
 }
 
 // --- Messages
@@ -255,89 +234,73 @@ void CALLBACK answerTheBox(HWND, UINT, UINT_PTR timer, DWORD) {
 }
 
 // A box that nobody answers would hold this up until its time is over.
-void showsBoxesToUsersOnly(IDispatch& diagnostics, HWND window) {
-  chapter("messages");
-  const auto wrong = [](Hosted& hosted) {
-    return call(*hosted.members.get(), L"vfpSet", {0, 312, 0, L"abc"}).number();
-  };
+void showsBoxesToUsersOnly(const Desk& desk) {
+  const auto wrong = [](Hosted& hosted) { return hosted.call(L"vfpSet", {0, 312, 0, L"abc"}).number(); };
   const std::wstring text = L"clsBaseVFP::vfpSet() PARM_MEASUREMENT_ID must be numeric\r|";
-  put(diagnostics, L"ShowMessages", true);
+  put(desk.diagnostics, L"ShowMessages", true);
   {
     Hosted script;
-    expect(wrong(script) == -8 && takeMessages(diagnostics) == text,
-           "without a window a message is kept only");
+    expect(wrong(script) == -8 && takeMessages(desk) == text, "without a window a message is kept only");
   }
-  FullContainer container(window);
-  Hosted hosted;
-  hosted.object->SetClientSite(&container);
-  hosted.verb(OLEIVERB_INPLACEACTIVATE);
+  Sited hosted(desk.window, OLEIVERB_INPLACEACTIVATE);
+  FullContainer& container = hosted.container;
   SetTimer(nullptr, 0, 10, answerTheBox);
-  expect(wrong(hosted) == -8 && takeMessages(diagnostics) == text, "with one a box shows it");
+  expect(wrong(hosted) == -8 && takeMessages(desk) == text, "with one a box shows it");
   expect(container.count("EnableModeless(off)") == 1 && container.count("EnableModeless") == 1,
          "and the host waits for its end");
-  put(diagnostics, L"ShowMessages", false);
+  put(desk.diagnostics, L"ShowMessages", false);
 }
 
 // --- The container's place
 
-void tellsItsPlace(HWND window) {
-  chapter("place");
-  FullContainer container(window);
+void tellsItsPlace(const Desk& desk) {
+  FullContainer container(desk.window);
   PlaceProperties place;
   container.extender = &place;
   Hosted hosted;
   hosted.object->SetClientSite(&container);
-  call(*hosted.members.get(), L"vfpSet", {0, 314, 0, L"Receiver 1"});
-  call(*hosted.members.get(), L"vfpSet", {0, 702, 0, 4500});
-  call(*hosted.members.get(), L"vfpOp", {0, 12});
-  const std::vector<std::wstring> expected = {L"Caption=Receiver 1", L"Visible=False",     L"ViewState=0",
-                                              L"Width=4500",         L"Visible=False",     L"ViewState=0",
-                                              L"Visible=True",       L"Caption=Receiver 1"};
+  hosted.call(L"vfpSet", {0, 314, 0, L"Receiver 1"});
+  hosted.call(L"vfpSet", {0, 702, 0, 4500});
+  hosted.call(L"vfpOp", {0, 12});
+  const Lines expected = {L"Caption=Receiver 1", L"Visible=False", L"ViewState=0",  L"Width=4500",
+                          L"Visible=False",      L"ViewState=0",   L"Visible=True", L"Caption=Receiver 1"};
   expect(place.told == expected, "caption, size, visibility and state reach the container's place");
   container.extender = hosted.members.get();
-  expect(call(*hosted.members.get(), L"vfpOp", {0, 12}).number() == 0,
+  expect(hosted.call(L"vfpOp", {0, 12}).number() == 0,
          "a container that answers the control itself is not asked in circles");
   container.extender = nullptr;
-  expect(call(*hosted.members.get(), L"vfpOp", {0, 12}).number() == 0, "a container without a place will do");
+  expect(hosted.call(L"vfpOp", {0, 12}).number() == 0, "a container without a place will do");
   hosted.close();
   expect(container.references == 1 && place.references == 1, "no reference is left");
 }
 
-void staysQuietInADesigner(HWND window) {
-  chapter("designer");
-  FullContainer container(window);
+void staysQuietInADesigner(const Desk& desk) {
+  FullContainer container(desk.window);
   container.userMode = false;
+  EventSink sink;
   Hosted hosted;
   hosted.object->SetClientSite(&container);
-  RequestSink sink;
-  DWORD cookie = 0;
-  const auto point = pointOf(*hosted.members.get(), eventsOf(*hosted.members.get()));
-  point->Advise(&sink, &cookie);
-  call(*hosted.members.get(), L"closeVfp");
+  hosted.advise(sink);
+  hosted.call(L"closeVfp");
   expect(sink.received.empty(), "raises nothing");
   hosted.verb(OLEIVERB_INPLACEACTIVATE);
   SendMessageW(hosted.window(), WM_LBUTTONDOWN, MK_LBUTTON, MAKELPARAM(50, 50));
   expect(GetCapture() == nullptr && GetFocus() != hosted.window(), "takes neither mouse nor focus");
   container.userMode = true;
   hosted.members.query<IOleControl>()->OnAmbientPropertyChange(DISPID_UNKNOWN);
-  call(*hosted.members.get(), L"closeVfp");
+  hosted.call(L"closeVfp");
   expect(!sink.received.empty(), "until the container runs");
-  point->Unadvise(cookie);
 }
 
 // --- Activation
 
-void activatesStepByStep(HWND window) {
-  chapter("activation");
-  FullContainer container(window);
-  Hosted hosted;
-  hosted.object->SetClientSite(&container);
-  SetFocus(window);
+void activatesStepByStep(const Desk& desk) {
+  Sited hosted(desk.window);
+  FullContainer& container = hosted.container;
+  SetFocus(desk.window);
   expect(hosted.verb(OLEIVERB_INPLACEACTIVATE) == S_OK, "in place");
   expect(container.told == Texts{"OnInPlaceActivate", "ShowObject"}, "takes neither focus nor frame");
-  RECT rect{};
-  GetWindowRect(hosted.window(), &rect);
-  MapWindowPoints(nullptr, window, reinterpret_cast<POINT*>(&rect), 2);
+  const RECT rect = placeIn(desk.window, hosted.window());
   expect(EqualRect(&rect, &container.place) != 0, "stands where the container said");
   container.told.clear();
   expect(hosted.verb(0xFFFC) == S_OK, "a verb passed as 16 bits is understood");  // OLEIVERB_UIACTIVATE
@@ -364,35 +327,15 @@ void activatesStepByStep(HWND window) {
   expect(container.told == left, "leaves the frame first and the place last");
   hosted.inPlace->InPlaceDeactivate();
   expect(container.count("OnInPlaceDeactivate") == 1, "once");
-  expect(call(*hosted.members.get(), L"ViewScaleWidth").number() == 400 * 15,
-         "keeps its size without a window");
+  expect(hosted.call(L"ViewScaleWidth").number() == 400 * 15, "keeps its size without a window");
   expect(container.count("OnPosRectChange") == 0, "never asks for another place by itself");
 }
 
-void focusByTab(HWND window) {
-  chapter("focus by Tab");
-  FullContainer container(window);
-  Hosted hosted;
-  hosted.object->SetClientSite(&container);
-  hosted.verb(OLEIVERB_INPLACEACTIVATE);
-  SetFocus(hosted.window());
-  expect(container.count("OnUIActivate") == 1 && container.count("OnFocus") == 1,
-         "makes it the active object");
-  hosted.inPlace->UIDeactivate();
-  container.told.clear();
-  const LRESULT answer = SendMessageW(hosted.window(), WM_MOUSEACTIVATE, reinterpret_cast<WPARAM>(window),
-                                      MAKELPARAM(HTCLIENT, WM_LBUTTONDOWN));
-  expect(answer == MA_ACTIVATE && container.count("OnUIActivate") == 1, "like a click");
-}
-
-void losesItsWindow() {
-  chapter("lost window");
+void losesItsWindow(const Desk&) {
   const HWND parent = CreateWindowExW(0, L"STATIC", L"", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 0, 0, 500, 400,
                                       nullptr, nullptr, nullptr, nullptr);
-  FullContainer container(parent);
-  Hosted hosted;
-  hosted.object->SetClientSite(&container);
-  hosted.verb(OLEIVERB_INPLACEACTIVATE);
+  Sited hosted(parent, OLEIVERB_INPLACEACTIVATE);
+  const FullContainer& container = hosted.container;
   publish(carrier());
   DestroyWindow(parent);
   publish(carrier());
@@ -400,23 +343,17 @@ void losesItsWindow() {
   hosted.close();
   expect(container.count("OnInPlaceDeactivate") == 1 && container.references == 1, "closes all the same");
 
-  FullContainer careless(GetDesktopWindow());
-  {
-    Hosted released;
-    released.object->SetClientSite(&careless);
-    released.verb(OLEIVERB_INPLACEACTIVATE);
-    const HWND view = released.window();
-    released.release();  // without a close
-    expect(!IsWindow(view), "goes with the last reference");
-  }
-  expect(careless.count("OnInPlaceDeactivate") == 1 && careless.references == 1,
+  Sited released(GetDesktopWindow(), OLEIVERB_INPLACEACTIVATE);
+  const HWND view = released.window();
+  released.release();  // without a close
+  expect(!IsWindow(view), "goes with the last reference");
+  expect(released.container.count("OnInPlaceDeactivate") == 1 && released.container.references == 1,
          "and the container hears of it");
 }
 
-void changesItsSite(HWND window) {
-  chapter("sites");
-  FullContainer first(window);
-  FullContainer second(window);
+void changesItsSite(const Desk& desk) {
+  FullContainer first(desk.window);
+  FullContainer second(desk.window);
   Hosted hosted;
   hosted.object->SetClientSite(&first);
   hosted.verb(OLEIVERB_INPLACEACTIVATE);
@@ -429,12 +366,9 @@ void changesItsSite(HWND window) {
 
 // --- Keys and mouse
 
-void sharesTheKeys(HWND window) {
-  chapter("keys");
-  FullContainer container(window);
-  Hosted hosted;
-  hosted.object->SetClientSite(&container);
-  hosted.verb(OLEIVERB_UIACTIVATE);
+void sharesTheKeys(const Desk& desk) {
+  Sited hosted(desk.window, OLEIVERB_UIACTIVATE);
+  FullContainer& container = hosted.container;
   put(*hosted.members.get(), L"DisplayPanelVisible", false);
   put(*hosted.members.get(), L"MeasurementPanelVisible", false);
   const auto active = hosted.object.query<IOleInPlaceActiveObject>();
@@ -446,13 +380,13 @@ void sharesTheKeys(HWND window) {
          "Tab is the container's where no field is in sight");
 }
 
-void capturesTheMouse(HWND window) {
-  chapter("mouse");
-  FullContainer container(window);
-  Hosted hosted;
-  hosted.object->SetClientSite(&container);
-  hosted.verb(OLEIVERB_UIACTIVATE);
+void capturesTheMouse(const Desk& desk) {
+  Sited hosted(desk.window, OLEIVERB_INPLACEACTIVATE);
   const HWND view = hosted.window();
+  const LRESULT answer = SendMessageW(view, WM_MOUSEACTIVATE, reinterpret_cast<WPARAM>(desk.window),
+                                      MAKELPARAM(HTCLIENT, WM_LBUTTONDOWN));
+  expect(answer == MA_ACTIVATE && hosted.container.count("OnUIActivate") == 1,
+         "a click makes it the active object");
   SendMessageW(view, WM_LBUTTONDOWN, MK_LBUTTON, MAKELPARAM(50, 50));
   expect(GetCapture() == view, "a press takes the capture");
   SendMessageW(view, WM_MBUTTONDOWN, MK_LBUTTON | MK_MBUTTON, MAKELPARAM(50, 50));
@@ -464,13 +398,9 @@ void capturesTheMouse(HWND window) {
 
 // --- Pictures
 
-void paintsAllOfItself(HWND window) {
-  chapter("window");
-  FullContainer container(window);
-  Hosted hosted;
-  hosted.object->SetClientSite(&container);
-  hosted.verb(OLEIVERB_INPLACEACTIVATE);
-  const int contextBefore = call(*hosted.members.get(), L"ViewHDC").number();
+void paintsAllOfItself(const Desk& desk) {
+  Sited hosted(desk.window, OLEIVERB_INPLACEACTIVATE);
+  const int contextBefore = hosted.call(L"ViewHDC").number();
   publish(carrier());
   pumpMessages();  // the form paints its background first
   const HWND view = hosted.window();
@@ -484,16 +414,12 @@ void paintsAllOfItself(HWND window) {
              GetPixel(dc, all.right - 1, all.bottom - 1) == GetSysColor(COLOR_BTNFACE),
          "the margins are painted, too");
   expect(pixelsOf(dc, all, kTraceColor) > 200, "with the trace");
-  const int left = container.place.right - container.place.left;
-  expect(call(*hosted.members.get(), L"ViewScaleWidth").number() == left * 15,
-         "its scale is twips: 15 a pixel");
-  expect(call(*hosted.members.get(), L"ViewHDC").number() == contextBefore,
-         "its device context stays the same");
+  expect(hosted.call(L"ViewScaleWidth").number() == 400 * 15, "its scale is twips: 15 a pixel");
+  expect(hosted.call(L"ViewHDC").number() == contextBefore, "its device context stays the same");
   ReleaseDC(view, dc);
 }
 
-void drawsIntoMetafiles() {
-  chapter("metafile");
+void drawsIntoMetafiles(const Desk&) {
   Hosted hosted;
   publish(carrier());
   const auto view = hosted.object.query<IViewObject2>();
@@ -536,7 +462,7 @@ class TextBag final : public Counted<IPropertyBag> {
 
 class ErrorLog final : public Counted<IErrorLog> {
  public:
-  std::vector<std::wstring> names;
+  Lines names;
   HRESULT STDMETHODCALLTYPE AddError(LPCOLESTR name, EXCEPINFO*) override {
     return names.push_back(name), S_OK;
   }
@@ -547,8 +473,8 @@ class ErrorLog final : public Counted<IErrorLog> {
 
 using Bag = std::map<std::wstring, std::wstring>;
 
-void keepsPropertiesInABag() {
-  chapter("property bag");
+void keepsPropertiesInABag(const Desk&) {
+  ChangeSink changes;
   Hosted hosted;
   const auto persist = hosted.object.query<IPersistPropertyBag>();
   TextBag bag;
@@ -557,13 +483,10 @@ void keepsPropertiesInABag() {
   persist->Save(&bag, TRUE, TRUE);
   expect(bag.texts == Bag{{L"DisplayPanelVisible", L"True"}, {L"MeasurementPanelVisible", L"True"}},
          "unless all is asked for");
-  ChangeSink changes;
   DWORD cookie = 0;
-  const auto point = pointOf(*hosted.members.get(), IID_IPropertyNotifySink);
-  point->Advise(&changes, &cookie);
+  pointOf(*hosted.members.get(), IID_IPropertyNotifySink)->Advise(&changes, &cookie);
   put(*hosted.members.get(), L"DisplayPanelVisible", false);
   expect(changes.changed == std::vector<DISPID>{26}, "a change is told");
-  point->Unadvise(cookie);
   expect(hosted.object.query<IPersistStreamInit>()->IsDirty() == S_OK, "and makes the control dirty");
   bag.texts.clear();
   persist->Save(&bag, TRUE, FALSE);
@@ -572,18 +495,17 @@ void keepsPropertiesInABag() {
   Hosted other;
   const auto loading = other.object.query<IPersistPropertyBag>();
   loading->Load(&bag, nullptr);
-  expect(call(*other.members.get(), L"DisplayPanelVisible").number() == 0 &&
-             call(*other.members.get(), L"MeasurementPanelVisible").number() == -1,
+  expect(other.call(L"DisplayPanelVisible").number() == 0 &&
+             other.call(L"MeasurementPanelVisible").number() == -1,
          "and comes back from a text");
   ErrorLog log;
   bag.texts = {{L"DisplayPanelVisible", L"perhaps"}, {L"MeasurementPanelVisible", L"0"}};
-  expect(loading->Load(&bag, &log) == S_OK && log.names == std::vector<std::wstring>{L"DisplayPanelVisible"},
+  expect(loading->Load(&bag, &log) == S_OK && log.names == Lines{L"DisplayPanelVisible"},
          "a bad value is logged");
-  expect(call(*other.members.get(), L"DisplayPanelVisible").number() == -1, "and the usual one kept");
+  expect(other.call(L"DisplayPanelVisible").number() == -1, "and the usual one kept");
 }
 
-void keepsStateInAStorage() {
-  chapter("storage");
+void keepsStateInAStorage(const Desk&) {
   Hosted hosted;
   ComPointer<IStorage> storage;
   StgCreateDocfile(nullptr, STGM_CREATE | STGM_READWRITE | STGM_SHARE_EXCLUSIVE | STGM_DELETEONRELEASE, 0,
@@ -603,8 +525,7 @@ void keepsStateInAStorage() {
 
 // --- Calls by name
 
-void callsByName() {
-  chapter("calls by name");
+void callsByName(const Desk&) {
   Hosted hosted;
   IDispatch& members = *hosted.members.get();
   DISPPARAMS none{};
@@ -625,17 +546,14 @@ void callsByName() {
           call(members, L"Caption").text() == L"Both ways",
       "a property takes both kinds of put at once");
   // As script hosts pass variables: by reference to a variant of whatever type.
-  Value status;
-  Value variables[] = {Value(L"Variable"), Value(L"0"), Value(314.0), Value(true)};
-  VARIANT references[4] = {};
+  Value variables[] = {Value(true), Value(314.0), Value(L"0"), Value(L"Variable")};
+  std::vector<VARIANT> references(4);
   for (int i = 0; i < 4; ++i) {
     V_VT(&references[i]) = VT_BYREF | VT_VARIANT;
     V_VARIANTREF(&references[i]) = variables[i].get();
   }
-  DISPPARAMS byReference{references, nullptr, 4, 0};
-  members.Invoke(memberOf(members, L"vfpSet"), IID_NULL, LOCALE_USER_DEFAULT, DISPATCH_METHOD, &byReference,
-                 status.get(), nullptr, nullptr);
-  expect(status.number() == 0 && call(members, L"Caption").text() == L"Variable",
+  expect(callRaw(members, L"vfpSet", references).number() == 0 &&
+             call(members, L"Caption").text() == L"Variable",
          "variables of any type convert");
 }
 
@@ -686,12 +604,8 @@ void countsEveryHolder() {
 }
 
 // Hosts exist in which a division by zero is an exception of the processor.
-void worksWithoutMaskedExceptions(HWND window) {
-  chapter("floating point");
-  FullContainer container(window);
-  Hosted hosted;
-  hosted.object->SetClientSite(&container);
-  hosted.verb(OLEIVERB_INPLACEACTIVATE);
+void worksWithoutMaskedExceptions(const Desk& desk) {
+  Sited hosted(desk.window, OLEIVERB_INPLACEACTIVATE);
   std::vector<float> gaps = carrier();
   gaps[100] = std::numeric_limits<float>::quiet_NaN();
   gaps[101] = std::numeric_limits<float>::infinity();
@@ -699,37 +613,34 @@ void worksWithoutMaskedExceptions(HWND window) {
   const unsigned before = _controlfp(0, 0);
   _controlfp(unmasked, _MCW_EM);
   publish(gaps);
-  call(*hosted.members.get(), L"vfpSet", {0, 14, 0, 0.0});
+  hosted.call(L"vfpSet", {0, 14, 0, 0.0});
   UpdateWindow(hosted.window());
   const unsigned after = _controlfp(0, 0);
   _controlfp(before, _MCW_EM);
   expect((after & _MCW_EM) == unmasked, "gaps are drawn, and the host's settings put back");
 }
 
-void checkAll(IDispatch& diagnostics, HWND window) {
-  answersOfTheHost(diagnostics);
-  settingsForKeeping(diagnostics);
-  anyValueAtAll(diagnostics);
-  closedInItsOwnRequest(window);
-  takeMessages(diagnostics);  // what closing in the middle of a request reports is not looked at
-  showsBoxesToUsersOnly(diagnostics, window);
-  tellsItsPlace(window);
-  staysQuietInADesigner(window);
-  activatesStepByStep(window);
-  focusByTab(window);
-  losesItsWindow();
-  changesItsSite(window);
-  sharesTheKeys(window);
-  capturesTheMouse(window);
-  paintsAllOfItself(window);
-  drawsIntoMetafiles();
-  keepsPropertiesInABag();
-  keepsStateInAStorage();
-  callsByName();
-  worksWithoutMaskedExceptions(window);
-  chapter("all chapters");
-  expect(takeMessages(diagnostics).empty(), "nothing else was reported");
-}
+constexpr struct {
+  const char* name;
+  void (*check)(const Desk& desk);
+} kChapters[] = {{"requests", answersOfTheHost},
+                 {"settings for keeping", settingsForKeeping},
+                 {"any value at all", anyValueAtAll},
+                 {"closed in its own request", closedInItsOwnRequest},
+                 {"messages", showsBoxesToUsersOnly},
+                 {"place", tellsItsPlace},
+                 {"designer", staysQuietInADesigner},
+                 {"activation", activatesStepByStep},
+                 {"lost window", losesItsWindow},
+                 {"sites", changesItsSite},
+                 {"keys", sharesTheKeys},
+                 {"mouse", capturesTheMouse},
+                 {"window", paintsAllOfItself},
+                 {"metafile", drawsIntoMetafiles},
+                 {"property bag", keepsPropertiesInABag},
+                 {"storage", keepsStateInAStorage},
+                 {"calls by name", callsByName},
+                 {"floating point", worksWithoutMaskedExceptions}};
 
 // --- A container of somebody else's
 
@@ -775,26 +686,15 @@ void standsInAForeignContainer(const wchar_t* libraryName) {
 }  // namespace
 
 int check(int count, wchar_t** arguments) {
-  OleInitialize(nullptr);
-  {
-    const auto diagnostics = create<IDispatch>(L"FrontPanels.Diagnostics");
-    chapter("registration");
-    expect(static_cast<bool>(diagnostics), "the classes can be created");
-    if (!diagnostics) return verdict();
-    put(*diagnostics.get(), L"ShowMessages", false);
-    call(*diagnostics.get(), L"Clear");
-    const HWND window = CreateWindowExW(0, L"STATIC", L"container", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 0, 0,
-                                        800, 600, nullptr, nullptr, nullptr, nullptr);
-    if (count == 3 && std::wstring(arguments[1]) == L"atl")
-      standsInAForeignContainer(arguments[2]);
-    else
-      checkAll(*diagnostics.get(), window);
-    DestroyWindow(window);
-  }
-  countsEveryHolder();
-  const int result = verdict();
-  OleUninitialize();
-  return result;
+  const auto checks = [=](const Desk& desk) {
+    if (count == 3 && std::wstring(arguments[1]) == L"atl") return standsInAForeignContainer(arguments[2]);
+    for (const auto& [name, check] : kChapters) {
+      chapter(name);
+      check(desk);
+    }
+    chapter("all chapters");
+  };
+  return runChecks({800, 600}, checks, countsEveryHolder);
 }
 
 }  // namespace frontpanels::testing

@@ -14,19 +14,11 @@
 #include "platform/win32/win32_controls.h"
 #include "tests/support/sample_panel.h"
 #include "tests/wine/com_client.h"
+#include "tests/wine/panel_user.h"
 #include "workbench/window_picture.h"
 
 namespace frontpanels::testing {
 namespace {
-
-int screenDpi() {
-  const HDC screen = GetDC(nullptr);
-  const int dpi = GetDeviceCaps(screen, LOGPIXELSX);
-  ReleaseDC(nullptr, screen);
-  return dpi;
-}
-
-int inPixels(float twips) { return MulDiv(static_cast<int>(twips), screenDpi(), 1440); }
 
 // One for all panels, as the window system takes its time to show one.
 HWND frameWindow() {
@@ -51,7 +43,6 @@ class WindowPanel final : public SamplePanel, public FieldsOwner {
 
   [[nodiscard]] HWND of(const char* name) const { return controls->window(set.control(name)); }
   void take(std::span<const Step> steps);
-  void press(WORD key, WORD held = 0);
   void key(const std::string& name) override;
   void type(const std::string& text) override;
   void click(Control& control, int downPercent) override;
@@ -127,23 +118,6 @@ void WindowPanel::take(std::span<const Step> steps) {
 
 // --- What a user does
 
-void sendKey(WORD key, bool down) {
-  INPUT input{};
-  input.type = INPUT_KEYBOARD;
-  input.ki.wVk = key;
-  input.ki.wScan = static_cast<WORD>(MapVirtualKeyW(key, MAPVK_VK_TO_VSC));
-  input.ki.dwFlags = down ? 0 : KEYEVENTF_KEYUP;
-  SendInput(1, &input, sizeof input);
-}
-
-void WindowPanel::press(WORD key, WORD held) {
-  if (held != 0) sendKey(held, true);
-  sendKey(key, true);
-  sendKey(key, false);
-  if (held != 0) sendKey(held, false);
-  pump();
-}
-
 void WindowPanel::key(const std::string& name) {
   static const std::map<std::string, WORD> keys = {{"Tab", VK_TAB}, {"Enter", VK_RETURN}, {"Space", VK_SPACE},
                                                    {"Up", VK_UP},   {"Down", VK_DOWN},    {"Esc", VK_ESCAPE},
@@ -154,7 +128,7 @@ void WindowPanel::key(const std::string& name) {
                     : name[0] == 'A'          ? WORD{VK_MENU}
                     : name[0] == 'C'          ? WORD{VK_CONTROL}
                                               : WORD{VK_SHIFT};
-  press(keys.contains(last) ? keys.at(last) : static_cast<WORD>(last[0]), held);
+  press(keys.contains(last) ? keys.at(last) : static_cast<WORD>(last[0]), held, [this] { pump(); });
 }
 
 void WindowPanel::type(const std::string& text) {
@@ -182,9 +156,7 @@ std::string WindowPanel::value(Control& control) {
   pump();
   const HWND shown = controls->window(control);
   const auto ask = [shown](UINT message) { return std::to_string(SendMessageW(shown, message, 0, 0)); };
-  std::wstring text(1000, L'\0');
-  text.resize(static_cast<std::size_t>(GetWindowTextW(shown, text.data(), 1000)));
-  std::string seen = toUtf8(text);
+  std::string seen = toUtf8(textOf(shown));
   const ControlKind kind = control.kind();
   if (kind == ControlKind::ComboBox) seen = ask(CB_GETCURSEL);
   if (kind == ControlKind::ListBox) seen = ask(LB_GETCURSEL);
@@ -268,17 +240,9 @@ void eventsMayTakeTheWindowsAway() {
     }
 }
 
-LOGFONTW fontOf(HWND window) {
-  LOGFONTW font{};
-  GetObjectW(reinterpret_cast<HFONT>(SendMessageW(window, WM_GETFONT, 0, 0)), sizeof font, &font);
-  return font;
-}
-
 void isScaledAndPictured(const std::string& folder) {
   WindowPanel panel;
-  RECT box{};
-  GetWindowRect(panel.of("Center"), &box);
-  MapWindowPoints(nullptr, panel.window, reinterpret_cast<POINT*>(&box), 2);
+  const RECT box = placeIn(panel.window, panel.of("Center"));
   const RECT wanted = {inPixels(1200), inPixels(390), inPixels(3000), inPixels(675)};  // in frame and area
   expect(EqualRect(&box, &wanted) != 0,
          "twips become pixels at " + std::to_string(screenDpi()) + " dots an inch");

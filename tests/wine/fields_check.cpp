@@ -15,21 +15,13 @@
 #include "platform/win32/utf16.h"
 #include "tests/wine/com_client.h"
 #include "tests/wine/full_container.h"
+#include "tests/wine/panel_user.h"
 #include "workbench/window_picture.h"
 
 namespace frontpanels::testing {
 namespace {
 
-int screenDpi() {
-  const HDC screen = GetDC(nullptr);
-  const int dpi = GetDeviceCaps(screen, LOGPIXELSX);
-  ReleaseDC(nullptr, screen);
-  return dpi;
-}
-
 constexpr const wchar_t* kMenuClass = L"#32768";
-
-int inPixels(int twips) { return MulDiv(twips, screenDpi(), 1440); }
 
 // Every stop of the Tab key, in order; of options the first stands for its frame.
 constexpr const wchar_t* kStops[] = {
@@ -57,9 +49,11 @@ class Form {
   [[nodiscard]] ComPointer<IDispatch> field(const wchar_t* name) const;
   // The window that has the focus shows the field, whatever shows its name to nobody.
   [[nodiscard]] bool isFocused(const wchar_t* name) const;
-  void press(WORD key, WORD held = 0);
+  void press(WORD key, WORD held = 0) {
+    testing::press(key, held, [this] { pump(); });
+  }
   void type(const wchar_t* text);
-  static void click(HWND window);
+  void click(HWND window);
   void pump();
 
   HWND window = nullptr;
@@ -128,46 +122,16 @@ void Form::pump() {
   }
 }
 
-void sendKey(WORD key, bool down) {
-  INPUT input{};
-  input.type = INPUT_KEYBOARD;
-  input.ki.wVk = key;
-  input.ki.wScan = static_cast<WORD>(MapVirtualKeyW(key, MAPVK_VK_TO_VSC));
-  input.ki.dwFlags = down ? 0 : KEYEVENTF_KEYUP;
-  SendInput(1, &input, sizeof input);
-}
-
-void Form::press(WORD key, WORD held) {
-  if (held != 0) sendKey(held, true);
-  sendKey(key, true);
-  pump();  // whoever looks at the key's state sees it down
-  sendKey(key, false);
-  if (held != 0) sendKey(held, false);
-  pump();
-}
-
 void Form::type(const wchar_t* text) {
   for (; *text != L'\0'; ++text) PostMessageW(GetFocus(), WM_CHAR, *text, 1);
   pump();
 }
 
-void Form::click(HWND window) {
-  SendMessageW(window, WM_MOUSEACTIVATE, reinterpret_cast<WPARAM>(GetAncestor(window, GA_ROOT)),
+void Form::click(HWND target) {
+  SendMessageW(target, WM_MOUSEACTIVATE, reinterpret_cast<WPARAM>(window),
                MAKELPARAM(HTCLIENT, WM_LBUTTONDOWN));
-  PostMessageW(window, WM_LBUTTONDOWN, MK_LBUTTON, MAKELPARAM(2, 2));
-  PostMessageW(window, WM_LBUTTONUP, 0, MAKELPARAM(2, 2));
-}
-
-std::wstring classOf(HWND window) {
-  wchar_t name[64] = L"";
-  GetClassNameW(window, name, 64);
-  return name;
-}
-
-std::wstring textOf(HWND window) {
-  wchar_t text[256] = L"";
-  GetWindowTextW(window, text, 256);
-  return text;
+  testing::click(target);
+  pump();
 }
 
 // A letter that is typed into the window arrives in the field; a caption is the same on both.
@@ -175,8 +139,8 @@ bool Form::isFocused(const wchar_t* name) const {
   const HWND focus = GetFocus();
   const auto constituent = field(name);
   if (!constituent || !IsChild(hosted.window(), focus)) return false;
-  if (std::wstring(name).ends_with(L"Combo")) return classOf(focus) == L"ComboBox";
-  if (classOf(focus) == L"Edit") {
+  if (std::wstring(name).ends_with(L"Combo")) return isOf(focus, L"ComboBox");
+  if (isOf(focus, L"Edit")) {
     SendMessageW(focus, EM_SETSEL, 0, -1);
     SendMessageW(focus, EM_REPLACESEL, TRUE, reinterpret_cast<LPARAM>(L"8"));
     const bool arrived = call(*constituent.get(), L"Text").text() == L"8";
@@ -197,8 +161,7 @@ std::vector<const wchar_t*> stopsInUse(const Form& form) {
   return stops;
 }
 
-// What a loop does with Tab and with Shift+Tab past the ends is told by `left`.
-void isWalkedThrough(Form& form, const char* how, const std::function<bool(bool forward)>& left) {
+void isWalkedThrough(Form& form, const std::string& how, const std::function<bool()>& left) {
   const std::vector<const wchar_t*> stops = stopsInUse(form);
   std::wstring strayed;
   std::size_t reached = 0;
@@ -206,10 +169,10 @@ void isWalkedThrough(Form& form, const char* how, const std::function<bool(bool 
     form.press(VK_TAB);
     if (!form.isFocused(stops[reached])) strayed = stops[reached];
   }
-  expect(strayed.empty() && reached > 20, std::string(how) + ": Tab goes through the fields in their order" +
+  expect(strayed.empty() && reached > 20, how + ": Tab goes through the fields in their order" +
                                               (strayed.empty() ? "" : ", but not to " + toUtf8(strayed)));
   form.press(VK_TAB);
-  expect(left(true), std::string(how) + ": and leads out behind the last");
+  expect(left(), how + ": and leads out behind the last");
 }
 
 void tabInAContainer() {
@@ -217,7 +180,7 @@ void tabInAContainer() {
   SetFocus(form.hosted.window());
   expect(form.container.count("OnFocus") == 1 && form.container.count("OnUIActivate") == 1,
          "the graph can have the focus");
-  isWalkedThrough(form, "container", [&](bool) {
+  isWalkedThrough(form, "container", [&] {
     return form.container.count("TranslateAccelerator") == 1 && form.isFocused(L"CloseButton");
   });
   expect(form.container.count("OnFocus") == 1 && form.container.count("OnFocus(off)") == 0,
@@ -229,7 +192,7 @@ void tabInAContainer() {
 void tabInADialog() {
   Form form(Form::Loop::Dialog);
   SetFocus(form.before);
-  isWalkedThrough(form, "dialog", [&](bool) { return GetFocus() == form.after; });
+  isWalkedThrough(form, "dialog", [&] { return GetFocus() == form.after; });
   form.press(VK_TAB, VK_SHIFT);
   expect(form.isFocused(L"CloseButton"), "dialog: Shift+Tab enters by the last field");
   SetFocus(form.before);
@@ -240,35 +203,12 @@ void tabInADialog() {
 
 // --- Mouse
 
-// The windows of a class inside the control, from the topmost on.
-std::vector<HWND> windowsOf(HWND parent, const wchar_t* className) {
-  std::vector<HWND> found;
-  for (HWND child = GetWindow(parent, GW_CHILD); child != nullptr; child = GetWindow(child, GW_HWNDNEXT)) {
-    if (classOf(child) == className) found.push_back(child);
-    const std::vector<HWND> inside = windowsOf(child, className);
-    found.insert(found.end(), inside.begin(), inside.end());
-  }
-  return found;
-}
-
-// The first text box of the area at the bottom.
-HWND centerBox(const Form& form) {
-  const std::vector<HWND> boxes = windowsOf(form.hosted.window(), L"Edit");
-  const auto lowest = std::max_element(boxes.begin(), boxes.end(), [](HWND a, HWND b) {
-    RECT first{};
-    RECT second{};
-    GetWindowRect(GetParent(a), &first);
-    GetWindowRect(GetParent(b), &second);
-    return first.top < second.top;
-  });
-  return lowest == boxes.end() ? nullptr : *lowest;
-}
+HWND centerBox(const Form& form) { return boxBeside(form.hosted.window(), L"<Center>"); }
 
 void isClickedAndTypedInto() {
   Form form(Form::Loop::Container);
   SetFocus(form.before);
-  Form::click(centerBox(form));
-  form.pump();
+  form.click(centerBox(form));
   expect(form.container.count("OnUIActivate") == 1 && form.container.count("OnFocus") == 1 &&
              form.isFocused(L"CenterFrequencyTextBox"),
          "a click on a field makes the control active, and the field has the focus");
@@ -288,8 +228,7 @@ void isClickedAndTypedInto() {
              form.hosted.object.query<IOleInPlaceActiveObject>()->TranslateAccelerator(&enter) == S_OK &&
              form.container.count("TranslateAccelerator") == 0,
          "Enter too");
-  Form::click(form.hosted.window());
-  form.pump();
+  form.click(form.hosted.window());
   expect(GetFocus() == form.hosted.window() && form.container.count("OnFocus") == 1,
          "a click on the graph brings it the focus");
 }
@@ -322,7 +261,7 @@ void areasCollapse() {
   };
   for (const Row& row : {Row{L"DisplayPanelVisible", true}, Row{L"MeasurementPanelVisible", false}}) {
     const auto strip = [&] {
-      for (const HWND button : windowsOf(form.hosted.window(), L"Button")) {
+      for (const HWND button : windowsOf(form.hosted.window(), L"BUTTON")) {
         RECT client{};
         GetClientRect(button, &client);
         const bool slim = std::min(client.right, client.bottom) == inPixels(90);
@@ -331,8 +270,7 @@ void areasCollapse() {
       return HWND{nullptr};
     };
     const auto toggled = [&](int state) {
-      Form::click(strip());
-      form.pump();
+      form.click(strip());
       return call(form.members(), row.area).number() == state && GetFocus() == form.hosted.window();
     };
     SendMessageW(strip(), WM_SETCURSOR, reinterpret_cast<WPARAM>(strip()),
@@ -382,9 +320,7 @@ void menuOpens() {
 
 // A field's inside is there where it has its window.
 bool showsTheCenterBox(const Form& form, HDC dc) {
-  RECT box{};
-  GetWindowRect(centerBox(form), &box);
-  MapWindowPoints(nullptr, form.hosted.window(), reinterpret_cast<POINT*>(&box), 2);
+  const RECT box = placeIn(form.hosted.window(), centerBox(form));
   const LONG area = (box.right - box.left) * (box.bottom - box.top);
   return pixelsOf(dc, box, GetSysColor(COLOR_WINDOW)) > area / 2;
 }
@@ -440,12 +376,6 @@ void graphIsSavedAlone(const std::string& folder) {
          "a saved picture ends where the areas begin");
 }
 
-int fontHeight(HWND window) {
-  LOGFONTW font{};
-  GetObjectW(reinterpret_cast<HFONT>(SendMessageW(window, WM_GETFONT, 0, 0)), sizeof font, &font);
-  return static_cast<int>(font.lfHeight);
-}
-
 ComPointer<IDispatch> makeFont(int points) {
   wchar_t name[] = L"Tahoma";
   FONTDESC description{sizeof description, name, {}, FW_NORMAL, DEFAULT_CHARSET, FALSE, FALSE, FALSE};
@@ -458,7 +388,7 @@ ComPointer<IDispatch> makeFont(int points) {
 void containersFontIsTaken() {
   Form form(Form::Loop::Container);
   const auto inFont = [&form](int points) {
-    return fontHeight(centerBox(form)) == -MulDiv(points, screenDpi(), 72);
+    return fontOf(centerBox(form)).lfHeight == -MulDiv(points, screenDpi(), 72);
   };
   expect(inFont(8), "without a font of the container's the fields have that of dialogs");
   const auto larger = makeFont(10);
@@ -516,24 +446,19 @@ void isPictured(const std::string& folder) {
 }  // namespace
 
 int check(const std::string& folder) {
-  OleInitialize(nullptr);
-  const auto diagnostics = create<IDispatch>(L"FrontPanels.Diagnostics");
-  put(*diagnostics.get(), L"ShowMessages", false);
   chapter("fields of the control");
-  tabInAContainer();
-  tabInADialog();
-  isClickedAndTypedInto();
-  isPartOfTheControl();
-  areasCollapse();
-  menuOpens();
-  isWholeInPictures();
-  graphIsSavedAlone(folder);
-  containersFontIsTaken();
-  isPictured(folder);
-  expect(call(*diagnostics.get(), L"Count").number() == 0 && FindWindowW(L"#32770", nullptr) == nullptr,
-         "nothing was reported, and no box is open");
-  OleUninitialize();
-  return verdict();
+  return runChecks({100, 100}, [&folder](const Desk&) {
+    tabInAContainer();
+    tabInADialog();
+    isClickedAndTypedInto();
+    isPartOfTheControl();
+    areasCollapse();
+    menuOpens();
+    isWholeInPictures();
+    graphIsSavedAlone(folder);
+    containersFontIsTaken();
+    isPictured(folder);
+  });
 }
 
 }  // namespace frontpanels::testing

@@ -10,19 +10,6 @@ constexpr const wchar_t* kPlaceNames[] = {L"Caption", L"Visible", L"ViewState", 
 
 }  // namespace
 
-HRESULT RequestSink::Invoke(DISPID member, REFIID, LCID, WORD, DISPPARAMS* parameters, VARIANT*, EXCEPINFO*,
-                            UINT*) {
-  if (answer != S_OK) return answer;
-  if (member != 1 || parameters->cArgs != 5) return DISP_E_BADPARAMCOUNT;
-  const VARIANT* const arguments = parameters->rgvarg;  // the last comes first
-  if (V_VT(&arguments[0]) != (VT_BYREF | VT_I4)) return DISP_E_TYPEMISMATCH;
-  received = {static_cast<int>(V_I4(&arguments[4])), static_cast<int>(V_I4(&arguments[3])),
-              V_I2(&arguments[2]), static_cast<int>(*V_I4REF(&arguments[0]))};
-  *V_I4REF(&arguments[0]) = status;
-  during();
-  return S_OK;
-}
-
 HRESULT PlaceProperties::GetIDsOfNames(REFIID, LPOLESTR* names, UINT, LCID, DISPID* ids) {
   for (DISPID i = 0; i < 7; ++i)
     if (std::wstring(names[0]) == kPlaceNames[i]) return ids[0] = i, S_OK;
@@ -91,6 +78,11 @@ Hosted::Hosted(const wchar_t* progId)
       inPlace(object.query<IOleInPlaceObject>()) {}
 
 HRESULT Hosted::verb(LONG verb) { return object->DoVerb(verb, nullptr, nullptr, 0, nullptr, nullptr); }
+
+void Hosted::advise(IUnknown& sink) const {
+  DWORD cookie = 0;
+  pointOf(*members.get(), eventsOf(*members.get()))->Advise(&sink, &cookie);
+}
 
 HWND Hosted::window() const {
   HWND window = nullptr;

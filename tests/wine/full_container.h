@@ -7,7 +7,6 @@
 #include <ocidl.h>
 #include <olectl.h>
 
-#include <functional>
 #include <map>
 #include <string>
 #include <vector>
@@ -45,18 +44,6 @@ class Listener : public Counted<IDispatch> {
 
  protected:
   void* find(REFIID id) override { return id == IID_IUnknown || id == IID_IDispatch ? this : nullptr; }
-};
-
-// A sink of frontPanelOp.
-class RequestSink final : public Listener {
- public:
-  std::vector<int> received;             // hwId, vfpId, OP and the status as it came in
-  HRESULT answer = S_OK;                 // DISP_E_MEMBERNOTFOUND: no handler
-  LONG status = 0;                       // what is written into the status
-  std::function<void()> during = [] {};  // in the middle of the event
-
-  HRESULT STDMETHODCALLTYPE Invoke(DISPID member, REFIID, LCID, WORD, DISPPARAMS* parameters, VARIANT*,
-                                   EXCEPINFO*, UINT*) override;
 };
 
 class ChangeSink final : public Counted<IPropertyNotifySink> {
@@ -172,9 +159,24 @@ struct Hosted {
   Hosted& operator=(const Hosted&) = delete;
 
   HRESULT verb(LONG verb);
+  Value call(const wchar_t* name, std::initializer_list<Value> arguments = {}) const {
+    return testing::call(*members.get(), name, arguments);
+  }
+  // To its events, for the rest of its life: the sink must live longer.
+  void advise(IUnknown& sink) const;
   [[nodiscard]] HWND window() const;
   void release();
   void close();
+};
+
+struct Site {
+  FullContainer container;
+};
+
+// A control and its container.
+struct Sited : Site, Hosted {
+  explicit Sited(HWND window) : Site{FullContainer(window)} { object->SetClientSite(&container); }
+  Sited(HWND window, LONG firstVerb) : Sited(window) { verb(firstVerb); }
 };
 
 // A connection to one of a control's outgoing interfaces.
