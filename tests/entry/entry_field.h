@@ -19,6 +19,11 @@ Rows found(Rows rows, After after) {
   return rows;
 }
 
+// A setting of an entry, for a table of such.
+inline constexpr auto sequence = [](auto... mantissas) {
+  return [=](clsNumericEntry& entry) { entry.sequence({mantissas...}); };
+};
+
 class EntryField : public ControlPeer {
  public:
   EntryField() {

@@ -10,10 +10,7 @@ namespace frontpanels {
 namespace {
 
 using Entry = clsNumericEntry;
-
-constexpr auto sequence = [](auto... mantissas) {
-  return [=](Entry& entry) { entry.sequence({mantissas...}); };
-};
+using testing::sequence;
 
 class EntryEventsTest : public testing::EntryFieldTest {
  protected:

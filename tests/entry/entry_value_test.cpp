@@ -7,6 +7,7 @@ namespace frontpanels {
 namespace {
 
 using testing::ListedRecords;
+using testing::sequence;
 using Entry = clsNumericEntry;
 
 class EntryValueTest : public testing::EntryFieldTest {
@@ -26,32 +27,15 @@ TEST_F(EntryValueTest, AValueIsSnappedMovedIntoTheLimitsAndRounded) {
       {[](Entry& e) { e.step(0.1); }, {"0.34 -> 0.3", "-0.36 -> -0.4", "3000000000.04 -> 3000000000"}},
       {[](Entry& e) { e.step(5), e.step({}), e.sequence({1}), e.sequence({}); }, {"3 -> 3"}},
       // The nearest mantissa on a logarithmic scale (1 and 2 meet at 1.414), at a tie the lower one.
-      {[](Entry& e) {
-         e.sequence({1, 2, 5});
-       },
+      {sequence(1, 2, 5),
        {"1.41 -> 1", "1.42 -> 2", "3.2 -> 5", "7.1 -> 10", "0.007 -> 0.005", "-140 -> -100", "0 -> 0",
         "5e9 -> 5000000000"}},
-      {[](Entry& e) {
-         e.sequence({1, 4});
-       },
-       {"2 -> 1", "20.1 -> 40", "-200 -> -100"}},
-      {[](Entry& e) {
-         e.sequence({50, 0.1, 0, Variant(), -7, 2, "x"});
-       },
-       {"6 -> 5", "70 -> 50", "72 -> 100"}},
-      {[](Entry& e) {
-         e.sequence({5, 3}), e.sequence({Variant(), 2});
-       },
-       {"3 -> 2", "4 -> 5"}},  // 5 has stayed
-      {[](Entry& e) {
-         e.step(2), e.sequence({1, 2.5});
-       },
-       {"2.4 -> 2", "30 -> 24"}},
+      {sequence(1, 4), {"2 -> 1", "20.1 -> 40", "-200 -> -100"}},
+      {sequence(50, 0.1, 0, Variant(), -7, 2, "x"), {"6 -> 5", "70 -> 50", "72 -> 100"}},
+      {[](Entry& e) { sequence(5, 3)(e), sequence(Variant(), 2)(e); }, {"3 -> 2", "4 -> 5"}},  // 5 has stayed
+      {[](Entry& e) { e.step(2), sequence(1, 2.5)(e); }, {"2.4 -> 2", "30 -> 24"}},
       {[](Entry& e) { e.power(2); }, {"700 -> 512", "800 -> 1024", "0.3 -> 0.25"}},
-      {[](Entry& e) {
-         e.power("2"), e.sequence({1, 5});
-       },
-       {"700 -> 500"}},
+      {[](Entry& e) { e.power("2"), sequence(1, 5)(e); }, {"700 -> 500"}},
       {[](Entry& e) { e.power(1e300); }, {"1e308 -> 1E+300"}},  // no double lies above
       {[](Entry& e) { e.power(2), e.power(1.9); }, {"700 -> 700"}},
       {[](Entry& e) { e.Arbitrary(true), e.sequence({1}), e.step(10), e.resolution(0.5); }, {"3.3 -> 3.5"}},
@@ -124,10 +108,7 @@ TEST_F(EntryValueTest, WhatCannotBeIsReportedAndChangesNothing) {
        "::value() failed. \rInvalid procedure call or argument"},
       {[](Entry& e) { e.sequence({-1}), e.value(5), e.sequence({}); },
        "::chooseSequence() failed. \rInvalid procedure call or argument"},
-      {[](Entry& e) {
-         e.sequence({1, 2, 3, 4, 5, 6, 7, 8, 9, 9, 9});
-       },
-       "::sequence() failed. \rSubscript out of range"},
+      {sequence(1, 2, 3, 4, 5, 6, 7, 8, 9, 9, 9), "::sequence() failed. \rSubscript out of range"},
       {[](Entry& e) { e.power("two"); }, "Non-numeric value passed to clsNumericEntry::power\r"},
       {[](Entry& e) { e.resolution("x"); }, "Non-numeric value passed to clsNumericEntry::resolution\r"},
       {[](Entry& e) { e.step(std::nan("")); }, "Non-numeric value passed to clsNumericEntry::step\r"},
