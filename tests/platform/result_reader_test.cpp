@@ -8,11 +8,12 @@
 #include <limits>
 
 #include "platform/result_writer.h"
-#include "platform/runtime_error.h"
+#include "tests/support/raised.h"
 
 namespace frontpanels {
 namespace {
 
+using testing::raised;
 using Bytes = std::vector<std::uint8_t>;
 using R = ResultReader;
 using W = ResultWriter;
@@ -21,15 +22,6 @@ constexpr std::int32_t kLargest = std::numeric_limits<std::int32_t>::max();
 constexpr std::int32_t kSmallest = std::numeric_limits<std::int32_t>::min();
 constexpr const char* kOutOfRange = "Subscript out of range";
 constexpr const char* kInvalidCall = "Invalid procedure call or argument";
-
-std::string errorOf(const std::function<void()>& call) {
-  try {
-    call();
-    return {};
-  } catch (const RuntimeError& error) {
-    return error.description();
-  }
-}
 
 using Cursor = std::pair<std::int32_t, std::int32_t>;  // next byte, bytes left
 
@@ -98,10 +90,10 @@ TEST(ResultReader, ReadsAFieldUpToTheLastByteAndNoneThatIsCutShortByCountOrBuffe
     EXPECT_EQ(cursor, Cursor(1 + size, 0));
     for (std::int32_t left = size - 1; left >= 0; --left) {
       cursor = {1, left};
-      EXPECT_EQ(errorOf([&] { field.read(whole); }), kOutOfRange) << left;  // the count ends
-      const Bytes given(buffer.begin(), buffer.begin() + 1 + left);         // the sanitizer watches its end
+      EXPECT_EQ(raised([&] { field.read(whole); }), kOutOfRange) << left;  // the count ends
+      const Bytes given(buffer.begin(), buffer.begin() + 1 + left);        // the sanitizer watches its end
       R reader(given, cursor.first, cursor.second);
-      EXPECT_EQ(errorOf([&] { field.read(reader); }), kOutOfRange) << left;  // and so does the buffer
+      EXPECT_EQ(raised([&] { field.read(reader); }), kOutOfRange) << left;  // and so does the buffer
       EXPECT_EQ(cursor, Cursor(1, left));
     }
   }
@@ -128,7 +120,7 @@ TEST(ResultReader, RefusesWhatTheBufferLiesAboutAndLeavesTheCursor) {
     Cursor cursor{0, static_cast<std::int32_t>(row.bytes.size())};
     const Cursor before = cursor;
     R reader(row.bytes, cursor.first, cursor.second);
-    EXPECT_EQ(errorOf([&] { row.read(reader); }), row.error) << row.what;
+    EXPECT_EQ(raised([&] { row.read(reader); }), row.error) << row.what;
     EXPECT_EQ(cursor, before) << row.what;
   }
 }
@@ -139,15 +131,15 @@ TEST(ResultReader, RefusesACursorAndACountThatNameNoStretchOfTheBuffer) {
        {Cursor(-1, 2), Cursor(5, 0), Cursor(4, 1), Cursor(0, 5), Cursor(0, -1), Cursor(3, -1),
         Cursor(kLargest, kLargest), Cursor(kSmallest, 4), Cursor(5, kSmallest)}) {
     Cursor cursor = wrong;
-    EXPECT_EQ(errorOf([&] { R(buffer, cursor.first, cursor.second); }), kOutOfRange) << wrong.first;
+    EXPECT_EQ(raised([&] { R(buffer, cursor.first, cursor.second); }), kOutOfRange) << wrong.first;
     cursor = {0, 4};
     R reader(buffer, cursor.first, cursor.second);
     cursor = wrong;  // by the caller, between two reads
-    EXPECT_EQ(errorOf([&] { reader.GetMeasurementUInt8(); }), kOutOfRange) << wrong.first;
+    EXPECT_EQ(raised([&] { reader.GetMeasurementUInt8(); }), kOutOfRange) << wrong.first;
     EXPECT_EQ(cursor, wrong);
   }
   for (Cursor right : {Cursor(0, 0), Cursor(4, 0), Cursor(3, 1), Cursor(0, 4)})
-    EXPECT_EQ(errorOf([&] { R(buffer, right.first, right.second); }), "") << right.first;
+    EXPECT_EQ(raised([&] { R(buffer, right.first, right.second); }), "") << right.first;
 }
 
 TEST(ResultReader, CopiesAnArrayOfExactlyTheAskedElementType) {
@@ -208,7 +200,7 @@ TEST(ResultWriter, WritesTheDocumentedExampleByteForByteAndTheReaderReadsItBack)
   EXPECT_TRUE(levels[0] == -80 && std::isnan(levels[1]) && levels[2] == -42.5F);
   EXPECT_EQ(reader.GetMeasurementTypeId() | reader.GetSubMeasurementId() | reader.GetMeasurementId(), 0);
   EXPECT_EQ(cursor, Cursor(44, 0));
-  EXPECT_EQ(errorOf([&] { static_cast<void>(reader.PeekMeasurementTypeId()); }), kOutOfRange);
+  EXPECT_EQ(raised([&] { static_cast<void>(reader.PeekMeasurementTypeId()); }), kOutOfRange);
 }
 
 TEST(ResultWriter, WritesEveryFieldAsItIsRead) {
@@ -247,7 +239,7 @@ TEST(ResultWriter, RefusesWhatIsOutOfOrderOrDoesNotFitAndGoesOnAsIfItHadNotBeenA
   };
   for (const auto& row : rows) {
     W writer = openedTo(row.level);
-    EXPECT_EQ(errorOf([&] { row.call(writer); }), row.error) << row.what;
+    EXPECT_EQ(raised([&] { row.call(writer); }), row.error) << row.what;
     EXPECT_EQ(closedFrom(writer, row.level), closedFrom(openedTo(row.level), row.level)) << row.what;
   }
 }
@@ -256,7 +248,7 @@ TEST(ResultWriter, FillsARecordUpToItsLargestLengthAndGoesOnBehindIt) {
   W writer = openedTo(4);
   writer.Text(std::string(32764, 'a'));
   writer.UInt8(1);
-  EXPECT_EQ(errorOf([&] { writer.UInt8(1); }), "Overflow");
+  EXPECT_EQ(raised([&] { writer.UInt8(1); }), "Overflow");
   writer.EndRecord();
   writer.BeginRecord(-1);
   const Bytes bytes = closedFrom(writer, 4);

@@ -141,15 +141,6 @@ BrushHandle RecordingGdi::sysColorBrush(SystemColor color) {
   return {stock("sysColorBrush", index, {.kind = Brush, .brush = systemColor(color)})};
 }
 
-BitmapHandle RecordingGdi::selectObject(DcHandle dc, BitmapHandle bitmap) {
-  return {select(dc, bitmap.value, Bitmap)};
-}
-PenHandle RecordingGdi::selectObject(DcHandle dc, PenHandle pen) { return {select(dc, pen.value, Pen)}; }
-BrushHandle RecordingGdi::selectObject(DcHandle dc, BrushHandle brush) {
-  return {select(dc, brush.value, Brush)};
-}
-FontHandle RecordingGdi::selectObject(DcHandle dc, FontHandle font) { return {select(dc, font.value, Font)}; }
-
 bool RecordingGdi::selectClipRgn(DcHandle dc, RegionHandle region) {
   if (beginDrawing("selectClipRgn", dc) == nullptr) return false;
   const Object* object = find(region.value, Region);

@@ -122,10 +122,14 @@ class RecordingGdi final : public Gdi {
   [[nodiscard]] BrushHandle stockBrush(StockBrush brush) override;
   [[nodiscard]] Color sysColor(SystemColor color) override;
   [[nodiscard]] BrushHandle sysColorBrush(SystemColor color) override;
-  BitmapHandle selectObject(DcHandle dc, BitmapHandle bitmap) override;
-  PenHandle selectObject(DcHandle dc, PenHandle pen) override;
-  BrushHandle selectObject(DcHandle dc, BrushHandle brush) override;
-  FontHandle selectObject(DcHandle dc, FontHandle font) override;
+  BitmapHandle selectObject(DcHandle dc, BitmapHandle bitmap) override {
+    return {select(dc, bitmap.value, Bitmap)};
+  }
+  PenHandle selectObject(DcHandle dc, PenHandle pen) override { return {select(dc, pen.value, Pen)}; }
+  BrushHandle selectObject(DcHandle dc, BrushHandle brush) override {
+    return {select(dc, brush.value, Brush)};
+  }
+  FontHandle selectObject(DcHandle dc, FontHandle font) override { return {select(dc, font.value, Font)}; }
   bool selectClipRgn(DcHandle dc, RegionHandle region) override;
   Color setTextColor(DcHandle dc, Color color) override;
   Color setBkColor(DcHandle dc, Color color) override;
