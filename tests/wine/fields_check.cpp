@@ -46,7 +46,8 @@ class Form {
   Form& operator=(const Form&) = delete;
 
   [[nodiscard]] IDispatch& members() const { return *hosted.members.get(); }
-  [[nodiscard]] ComPointer<IDispatch> field(const wchar_t* name) const;
+  // What a member of a field answers.
+  [[nodiscard]] Value of(const wchar_t* field, const wchar_t* member) const;
   // The window that has the focus shows the field, whatever shows its name to nobody.
   [[nodiscard]] bool isFocused(const wchar_t* name) const;
   void press(WORD key, WORD held = 0) {
@@ -104,10 +105,9 @@ Form::~Form() {
   DestroyWindow(window);
 }
 
-ComPointer<IDispatch> Form::field(const wchar_t* name) const {
-  const Value found = call(members(), L"Constituent", {name});
-  return V_VT(&found.variant()) == VT_DISPATCH ? ComPointer<IDispatch>(V_DISPATCH(&found.variant()))
-                                               : ComPointer<IDispatch>();
+Value Form::of(const wchar_t* field, const wchar_t* member) const {
+  const Value found = hosted.call(L"Constituent", {field});
+  return V_VT(&found.variant()) == VT_DISPATCH ? call(*V_DISPATCH(&found.variant()), member) : Value();
 }
 
 void Form::pump() {
@@ -137,32 +137,24 @@ void Form::click(HWND target) {
 // A letter that is typed into the window arrives in the field; a caption is the same on both.
 bool Form::isFocused(const wchar_t* name) const {
   const HWND focus = GetFocus();
-  const auto constituent = field(name);
-  if (!constituent || !IsChild(hosted.window(), focus)) return false;
+  if (!IsChild(hosted.window(), focus)) return false;
   if (std::wstring(name).ends_with(L"Combo")) return isOf(focus, L"ComboBox");
   if (isOf(focus, L"Edit")) {
     SendMessageW(focus, EM_SETSEL, 0, -1);
     SendMessageW(focus, EM_REPLACESEL, TRUE, reinterpret_cast<LPARAM>(L"8"));
-    const bool arrived = call(*constituent.get(), L"Text").text() == L"8";
+    const bool arrived = of(name, L"Text").text() == L"8";
     return SendMessageW(focus, EM_UNDO, 0, 0), arrived;
   }
   std::wstring caption = textOf(focus);
   std::erase(caption, L'&');
-  return caption == call(*constituent.get(), L"Caption").text();
+  return caption == of(name, L"Caption").text();
 }
 
 // --- Keyboard
 
-std::vector<const wchar_t*> stopsInUse(const Form& form) {
-  std::vector<const wchar_t*> stops;
-  for (const wchar_t* const name : kStops)
-    if (const auto field = form.field(name); field && call(*field.get(), L"Enabled").number() != 0)
-      stops.push_back(name);
-  return stops;
-}
-
 void isWalkedThrough(Form& form, const std::string& how, const std::function<bool()>& left) {
-  const std::vector<const wchar_t*> stops = stopsInUse(form);
+  std::vector<const wchar_t*> stops(std::begin(kStops), std::end(kStops));
+  std::erase_if(stops, [&form](const wchar_t* name) { return form.of(name, L"Enabled").number() != -1; });
   std::wstring strayed;
   std::size_t reached = 0;
   for (; reached < stops.size() && strayed.empty(); ++reached) {
@@ -213,12 +205,11 @@ void isClickedAndTypedInto() {
              form.isFocused(L"CenterFrequencyTextBox"),
          "a click on a field makes the control active, and the field has the focus");
   form.type(L"881.52");
-  const auto center = form.field(L"CenterFrequencyTextBox");
-  expect(center && call(*center.get(), L"Text").text() == L"881.52", "what is typed arrives in it");
+  const auto typed = [&form] { return form.of(L"CenterFrequencyTextBox", L"Text").text(); };
+  expect(typed() == L"881.52", "what is typed arrives in it");
   form.press(VK_HOME);
   form.type(L"1");
-  expect(center && call(*center.get(), L"Text").text() == L"1881.52" &&
-             form.container.count("TranslateAccelerator") == 0,
+  expect(typed() == L"1881.52" && form.container.count("TranslateAccelerator") == 0,
          "Home is the field's own");
   CONTROLINFO info{};
   info.cb = sizeof info;
