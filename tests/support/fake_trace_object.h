@@ -72,8 +72,8 @@ class FakeTraceObject : public TraceObject {
   bool getAutoScale() const override { return false; }
   void xAxisStyle(std::int16_t style) override { log("xAxisStyle " + std::to_string(style)); }
   void yAxisStyle(std::int16_t style) override { log("yAxisStyle " + std::to_string(style)); }
-  void verticalResolution(double value) override { log("verticalResolution " + std::to_string(value)); }
-  void gridScaleTop(double level) override { log("gridScaleTop " + std::to_string(level)); }
+  void verticalResolution(double value) override { log("verticalResolution " + numberToText(value)); }
+  void gridScaleTop(double level) override { log("gridScaleTop " + numberToText(level)); }
   void setAutoScale(bool on) override { log(on ? "setAutoScale on" : "setAutoScale off"); }
   std::int16_t addATrace(std::int16_t, std::int16_t, double, std::int32_t,
                          std::optional<std::int16_t>) override {

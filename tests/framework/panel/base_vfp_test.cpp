@@ -366,7 +366,7 @@ TEST_F(BaseVfpTest, AxisCodesReachTheActivePainterAndNeedOne) {
   log.clear();
   // 716 goes through text: 0.1, not the 0.100000001 of single precision.
   take({{714, 2}, {716, 0.1F}, {717, -20}, {719, 1}, {722, true}});
-  EXPECT_EQ(log, (Messages{"25 xAxisStyle 2", "25 verticalResolution 0.100000", "25 gridScaleTop -20.000000",
+  EXPECT_EQ(log, (Messages{"25 xAxisStyle 2", "25 verticalResolution 0.1", "25 gridScaleTop -20",
                            "25 yAxisStyle 1", "25 setAutoScale on"}));
   EXPECT_EQ(set(799, 0), 0);
   EXPECT_FALSE(base.CellNamingEnabled);
