@@ -11,6 +11,7 @@
 
 #include "framework/support/numeric.h"
 #include "platform/runtime_error.h"
+#include "platform/variant.h"
 #include "traces/trace_layout.h"
 #include "traces/trace_object.h"
 
