@@ -110,7 +110,10 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
     return perform([&] { panel().refreshMenuItems(); });
   }
   HRESULT STDMETHODCALLTYPE activeInContext(LONG /*nContext*/, VARIANT_BOOL* active) override {
-    return give(active, [&] { return variantBool(!base().closing() && panel().ViewVisible()); });
+    return give(active, [&] {
+      return guarded([&] { return panel().typeName() + "::activeInContext()"; }, VARIANT_FALSE,
+                     [&] { return variantBool(!base().closing() && panel().ViewVisible()); });
+    });
   }
   HRESULT STDMETHODCALLTYPE actionEnabled(short action, VARIANT_BOOL* enabled) override {
     return give(enabled, [&] { return variantBool(base().actionEnabled(action)); });

@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "activex/barrier.h"
+#include "framework/support/error_handler.h"
 
 namespace frontpanels::activex {
 namespace {
@@ -36,6 +37,17 @@ void writeWhole(IStream& stream, const void* data, ULONG bytes) {
   check(stream.Write(data, bytes, &written));
   if (written != bytes) throw ComFailure(STG_E_WRITEFAULT);
 }
+
+// What fails is reported as well: containers load and save forms without a word.
+template <class Body>
+HRESULT reported(const char* routine, Body body) {
+  const HRESULT result = barrier(body);
+  if (FAILED(result)) errorHandler().Assert(routine);
+  return result;
+}
+
+constexpr const char* kReading = "UserControl_ReadProperties()";
+constexpr const char* kWriting = "UserControl_WriteProperties()";
 
 // The wanted type goes in as a hint, and the value with it zeroed; whatever comes back is converted, text
 // too. The default where the bag has no such property.
@@ -116,12 +128,12 @@ void PersistencePart::writeStream(IStream& stream) const {
 
 HRESULT PersistencePart::Load(IStream* stream) {
   if (stream == nullptr) return E_POINTER;
-  return barrier([&] { readStream(*stream); });
+  return reported(kReading, [&] { readStream(*stream); });
 }
 
 HRESULT PersistencePart::Save(IStream* stream, BOOL clearDirty) {
   if (stream == nullptr) return E_POINTER;
-  return barrier([&] {
+  return reported(kWriting, [&] {
     writeStream(*stream);
     if (clearDirty) core().dirty(false);
   });
@@ -135,7 +147,7 @@ HRESULT PersistencePart::GetSizeMax(ULARGE_INTEGER* size) {
 
 HRESULT PersistencePart::Load(IPropertyBag* bag, IErrorLog* log) {
   if (bag == nullptr) return E_POINTER;
-  return barrier([&] {
+  return reported(kReading, [&] {
     const auto properties = core().storedProperties();
     for (std::size_t i = 0; i < properties.size(); ++i)
       core().storedValue(i, readFlag(*bag, log, properties[i]));
@@ -145,7 +157,7 @@ HRESULT PersistencePart::Load(IPropertyBag* bag, IErrorLog* log) {
 
 HRESULT PersistencePart::Save(IPropertyBag* bag, BOOL clearDirty, BOOL saveAll) {
   if (bag == nullptr) return E_POINTER;
-  return barrier([&] {
+  return reported(kWriting, [&] {
     const auto properties = core().storedProperties();
     for (std::size_t i = 0; i < properties.size(); ++i) {
       const bool flag = core().storedValue(i);
@@ -159,7 +171,7 @@ HRESULT PersistencePart::InitNew(IStorage*) { return InitNew(); }
 
 HRESULT PersistencePart::Load(IStorage* storage) {
   if (storage == nullptr) return E_POINTER;
-  return barrier([&] {
+  return reported(kReading, [&] {
     ComPointer<IStream> stream;
     check(storage->OpenStream(kStreamName, nullptr, STGM_READ | STGM_SHARE_EXCLUSIVE, 0, stream.receive()));
     readStream(*stream.get());
@@ -169,7 +181,7 @@ HRESULT PersistencePart::Load(IStorage* storage) {
 // Stays dirty until the container says that the save is complete.
 HRESULT PersistencePart::Save(IStorage* storage, BOOL) {
   if (storage == nullptr) return E_POINTER;
-  return barrier([&] {
+  return reported(kWriting, [&] {
     ComPointer<IStream> stream;
     check(storage->CreateStream(kStreamName, STGM_CREATE | STGM_WRITE | STGM_SHARE_EXCLUSIVE, 0, 0,
                                 stream.receive()));

@@ -100,7 +100,7 @@ class SpectrumView final : public HostedPanel {
   // Brings fields and graph in line with the active trace.
   void refreshControls() override;
   void refreshMenuItems() override { base_.refreshMenuItems(); }
-  void closeVfp() override { base_.closeVfp(); }
+  void closeVfp() override;
   void saveVfp() override { base_.saveVfp(); }
   void appendSettings(PanelSettings& settings) override;
   void resultData(std::int32_t resultTypeId, ResultReader& reader, clsBaseVFP* base) override;

@@ -220,6 +220,10 @@ void SpectrumView::menuXAxisStyle(std::int16_t style) {
   refreshTraces();
 }
 
+void SpectrumView::closeVfp() {
+  guard("SpectrumView::closeVfp() ... ", [this] { base_.closeVfp(); });
+}
+
 // --- Report
 
 std::string SpectrumView::linkSourceName() {

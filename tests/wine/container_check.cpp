@@ -104,6 +104,10 @@ void keepsItsPropertiesInAStream() {
   other.object->GetExtent(DVASPECT_CONTENT, &back);
   expect(back.cx == 5000 && back.cy == 4000, "with the extent to the unit");
   expect(FAILED(loading->Load(stream.get())), "a stream that ends early is refused");
+  const auto diagnostics = create<IDispatch>(L"FrontPanels.Diagnostics");
+  expect(call(*diagnostics.get(), L"Message", {0}).text() == L"UserControl_ReadProperties()\r",
+         "and reported");
+  call(*diagnostics.get(), L"Clear");
 }
 
 void isPartOfAnAggregate() {
