@@ -16,15 +16,7 @@
 namespace frontpanels {
 namespace {
 
-// Dark enough to stand out (3 to 1) against the usual button faces.
-constexpr Color kDefaultGridColor = rgb(112, 112, 112);
-constexpr Color kFirstTraceColor = rgb(50, 156, 50);
 constexpr std::string_view kDefaultAxisFormat = "0.##";
-
-std::int32_t nextPainterId() {
-  static std::int32_t last = 0;
-  return ++last;
-}
 
 // PNs that are looked up under another one, by the mode of the call.
 struct AliasRow {
@@ -43,29 +35,10 @@ std::optional<std::int16_t> lookedUpPn(std::int16_t mode, std::int16_t pn) {
   return row->lookedUp[static_cast<std::size_t>(mode)];
 }
 
-void requireFinite(double value) {
-  if (!std::isfinite(value)) raiseInvalidProcedureCall();
-}
-
-void requireDivisions(std::int32_t divisions) {
-  if (divisions > clsMultiTracePainter::kMaxDivisions) raiseInvalidProcedureCall();
-}
-
 }  // namespace
 
-clsMultiTracePainter::clsMultiTracePainter(Gdi& gdi)
-    : gdi_(gdi),
-      id_(nextPainterId()),
-      gridPen_{PenStyle::Solid, kDefaultGridColor},
-      activeTraceColor_(kFirstTraceColor) {
-  guard("class_Initialize() ...", [this] {
-    xAxisFormatter_.formatString(kDefaultAxisFormat);
-    yAxisFormatter_.formatString(kDefaultAxisFormat);
-  });
-}
-
-clsMultiTracePainter::~clsMultiTracePainter() {
-  if (clip_) gdi_.deleteObject(clip_);
+clsMultiTracePainter::clsMultiTracePainter(Gdi& gdi) : PlotPainter(gdi) {
+  guard("class_Initialize() ...", [this] { xAxisFormatter_.formatString(kDefaultAxisFormat); });
 }
 
 // --- Adding and removing traces
@@ -153,8 +126,8 @@ void clsMultiTracePainter::forgetWhatIsGone() noexcept {
   const auto gone = [this](const MarkerPointer& marker) {
     return marker != nullptr && traces_.findMarker(marker.get()) == -1;
   };
-  if (gone(activeMarker_)) activeMarker(nullptr);
-  if (gone(mouseActiveMarker_)) mouseActiveMarker_ = nullptr;
+  if (gone(activeMarker())) activeMarker(nullptr);
+  if (gone(mouseActiveMarker())) mouseActiveMarker(nullptr);
   const int last = std::max(0, traces_.count() - 1);
   selectedTraceIndex_ = static_cast<std::int16_t>(std::min<int>(selectedTraceIndex_, last));
 }
@@ -169,7 +142,7 @@ TraceSlot& clsMultiTracePainter::slotForValues() {
 void clsMultiTracePainter::valuesChanged(TraceSlot& slot) {
   slot.minMaxCurrent = false;
   slot.offsetPending = true;
-  dataChanged_ = true;
+  dataChanged(true);
 }
 
 void clsMultiTracePainter::storeValues(TraceSlot& slot, const Variant& values) {
@@ -271,7 +244,7 @@ void clsMultiTracePainter::activeTraceMaximumIndex(double index) {
 // paints.
 void clsMultiTracePainter::processData() {
   guard("processData() ...", [this] {
-    if (traces_.slot(0).data.isNull() || !dataChanged_ || !useOffset()) return;
+    if (traces_.slot(0).data.isNull() || !dataChanged() || !useOffset()) return;
     const double amount = offset().toDouble();
     for (TraceSlot& slot : traces_.traces()) {
       if (std::exchange(slot.offsetPending, false)) addToValues(slot, amount);
@@ -281,50 +254,9 @@ void clsMultiTracePainter::processData() {
 
 // --- Value axis
 
-ValueRange clsMultiTracePainter::axis() const {
-  const double top = top_.value_or(0);
-  return {top - axisLength_, top};
-}
-
-void clsMultiTracePainter::measureAxis() noexcept {
-  if (numberOfVerticalDivisions_ > 0) axisLength_ = perDivision_ * numberOfVerticalDivisions_;
-}
-
-void clsMultiTracePainter::gridScaleTop(double level) {
-  guard("clsMultiTracePainter::gridScaleTop() ...", [&] {
-    requireFinite(level);
-    top_ = level;
-  });
-}
-
-void clsMultiTracePainter::verticalResolution(double perDivision) {
-  guard("clsMultiTracePainter::verticalResolution() ...", [&] {
-    requireFinite(perDivision);
-    if (perDivision <= 0) raiseInvalidProcedureCall();
-    perDivision_ = perDivision;
-    measureAxis();
-  });
-}
-
-void clsMultiTracePainter::numberOfVerticalDivisions(std::int32_t divisions) {
-  guard("clsMultiTracePainter::numberOfVerticalDivisions() ...", [&] {
-    requireDivisions(divisions);
-    numberOfVerticalDivisions_ = divisions;
-    measureAxis();
-    labelledRange_.reset();
-  });
-}
-
 void clsMultiTracePainter::DoAutoScale() {
   guard("clsMultiTracePainter::DoAutoScale()...", [this] {
-    const auto data = dataRange();
-    if (!data || numberOfVerticalDivisions_ <= 0 || axisFits(axis(), *data)) return;
-    const FittedAxis fitted = axisFor(*data, numberOfVerticalDivisions_);
-    top_ = fitted.top;
-    perDivision_ = fitted.perDivision;
-    measureAxis();
-    range_ = axis();
-    updateYAxisLabels();
+    if (const auto data = dataRange()) fitAxis(*data);
   });
 }
 
@@ -350,34 +282,6 @@ void clsMultiTracePainter::computeMinMax(TraceSlot& slot) {
     withValues(slot, converted_,
                "clsMultiTracePainter::computeMinMax() ... unhandled array type.  Using Variant (SLOW!)",
                [&](auto values) { slot.minMax = minMaxOf(values); });
-  });
-}
-
-clsNumericEntry& clsMultiTracePainter::yAxisFormatter() {
-  labelledRange_.reset();  // the caller may change how levels are written
-  return yAxisFormatter_;
-}
-
-void clsMultiTracePainter::autoFormatY(bool on) {
-  autoFormatY_ = on;
-  labelledRange_.reset();
-}
-
-void clsMultiTracePainter::updateYAxisLabels() {
-  guard("updateYAxisLabels() ...", [this] {
-    const std::int32_t divisions = numberOfVerticalDivisions_;
-    std::vector<std::string>& texts = labels_.yAxisTexts();
-    texts.resize(divisions > 0 ? static_cast<std::size_t>(divisions) + 1 : 0);
-    const double step = divisions > 0 ? (range_.maximum - range_.minimum) / divisions : 0;
-    const std::string_view format = autoFormatY_
-                                        ? formatForStep(step / yAxisFormatter_.shownScale(range_.maximum))
-                                        : std::string_view(yAxisFormatter_.formatString());
-    labelledRange_ = range_;
-    for (std::size_t i = 0; i < texts.size(); ++i) {
-      texts[i].clear();
-      yAxisFormatter_.append(texts[i], range_.maximum - static_cast<double>(i) * step, format,
-                             !yAxisFormatter_.suppressSuffix());
-    }
   });
 }
 
@@ -444,7 +348,7 @@ void clsMultiTracePainter::updateXAxisLabels() {
 
 void clsMultiTracePainter::writeXLabel(LabelPlace place, double value) {
   xAxisFormatter_.formatter(value, text_);
-  labels_.text(place, text_);
+  labels().text(place, text_);
 }
 
 // Without divisions there is no width of one to tell.
@@ -455,7 +359,7 @@ void clsMultiTracePainter::writeDivisionLabel(LabelPlace place) {
                                      xAxisFormatter_.formatString(), !xAxisFormatter_.suppressSuffix());
     text_ += "/div";
   }
-  labels_.text(place, text_);
+  labels().text(place, text_);
 }
 
 }  // namespace frontpanels

@@ -14,37 +14,22 @@
 #include <vector>
 
 #include "entry/numeric_entry.h"
-#include "painters/axis.h"
-#include "painters/grid.h"
 #include "painters/marker_readout.h"
-#include "painters/plot_labels.h"
-#include "painters/property.h"
+#include "painters/plot_painter.h"
 #include "painters/trace_store.h"
 #include "platform/gdi.h"
 #include "traces/trace_object.h"
 
 namespace frontpanels {
 
-class clsMultiTracePainter : public TraceObject {
+class clsMultiTracePainter : public PlotPainter {
  public:
   static constexpr std::string_view kTypeName = "clsMultiTracePainter";
-  static constexpr std::int32_t kMaxDivisions = 1000;
 
   // `gdi` must outlive the painter.
   explicit clsMultiTracePainter(Gdi& gdi);
-  ~clsMultiTracePainter() override;
-  clsMultiTracePainter(const clsMultiTracePainter&) = delete;
-  clsMultiTracePainter& operator=(const clsMultiTracePainter&) = delete;
 
-  // --- What it is
   [[nodiscard]] std::string_view typeName() const override { return kTypeName; }
-  [[nodiscard]] std::int16_t resultType() const override { return resultType_; }
-  void resultType(std::int16_t type) override { resultType_ = type; }
-  // A number of its own for each painter, until it is given another.
-  [[nodiscard]] std::int32_t id() const override { return id_; }
-  void id(std::int32_t id) { id_ = id; }
-  [[nodiscard]] bool traceIsVisible() const override { return traceIsVisible_; }
-  void traceIsVisible(bool visible) { traceIsVisible_ = visible; }
 
   // --- Adding and removing traces; the values of a trace follow by trace().
   // Refills the slots of the trace id, else the slot of the PN, else appends a trace or, when there are
@@ -102,8 +87,6 @@ class clsMultiTracePainter : public TraceObject {
   [[nodiscard]] bool multiMarker() const override { return multiMarker_; }
   void multiMarker(bool multi) { multiMarker_ = multi; }
 
-  [[nodiscard]] bool dataChanged() const override { return dataChanged_; }
-  void dataChanged(bool changed) { dataChanged_ = changed; }
   // Added to every value once by processData when `useOffset` is set.
   Property<Variant> offset;
   Property<bool> useOffset;
@@ -115,26 +98,12 @@ class clsMultiTracePainter : public TraceObject {
   [[nodiscard]] double activeTraceMaximumIndex();
   void activeTraceMaximumIndex(double index);
 
-  // --- Value axis. With auto scale off it runs from gridScaleTop, the level at its top, down by
-  // `verticalResolution` a division; a top that was never set is null and counts as 0. verticalResolution and
-  // dB per division are one value. Levels that are not finite and divisions that are not above 0 are refused.
-  [[nodiscard]] std::optional<double> gridScaleTop() const override { return top_; }
-  void gridScaleTop(double level) override;
-  [[nodiscard]] double verticalResolution() const override { return perDivision_; }
-  void verticalResolution(double perDivision) override;
-  [[nodiscard]] double getDbPerDivision() const { return perDivision_; }
-  void setDbPerDivision(double perDivision) { verticalResolution(perDivision); }
-  [[nodiscard]] std::int32_t numberOfVerticalDivisions() const { return numberOfVerticalDivisions_; }
-  void numberOfVerticalDivisions(std::int32_t divisions);  // up to 1000; no line for 0 or less
-  [[nodiscard]] bool getAutoScale() const override { return autoScale_; }
-  void setAutoScale(bool on) override { autoScale_ = on; }
+  // --- Value axis
   // The axis runs from the smallest to the largest value of the traces instead.
   Property<bool> calcMinMax;
   // Fits the axis to the traces when they no longer fill it well. Runs by itself in each paint while auto
   // scale is on.
   void DoAutoScale();
-  [[nodiscard]] clsNumericEntry& yAxisFormatter();
-  void updateYAxisLabels();
 
   // --- X axis. Start and stop are in Hz (or whatever the traces run over): those of the first and the last
   // point. Setting the span keeps the centre. `numberOfMeasurements` is the number of points, which gives the
@@ -155,89 +124,29 @@ class clsMultiTracePainter : public TraceObject {
   [[nodiscard]] clsNumericEntry& xAxisFormatter();
   void updateXAxisLabels();
 
-  // --- Labels: see LabelPlace for where they go. Text that updateXAxisLabels writes takes the place of the
-  // host's.
-  [[nodiscard]] const std::string& leftLabel() const { return labels_.text(LabelPlace::Left); }
-  void leftLabel(std::string_view text) { labels_.text(LabelPlace::Left, text); }
-  [[nodiscard]] const std::string& rightLabel() const { return labels_.text(LabelPlace::Right); }
-  void rightLabel(std::string_view text) { labels_.text(LabelPlace::Right, text); }
-  [[nodiscard]] const std::string& xAxisLabel() const { return labels_.text(LabelPlace::XAxis); }
-  void xAxisLabel(std::string_view text) { labels_.text(LabelPlace::XAxis, text); }
-  [[nodiscard]] const std::string& yAxisLabel() const { return labels_.text(LabelPlace::YUnit); }
-  void yAxisLabel(std::string_view text) { labels_.text(LabelPlace::YUnit, text); }
-  [[nodiscard]] const std::string& topLabel() const { return labels_.text(LabelPlace::Top); }
-  void topLabel(std::string_view text) { labels_.text(LabelPlace::Top, text); }
-  [[nodiscard]] const std::string& topCenterLabel() const { return labels_.text(LabelPlace::TopCenter); }
-  void topCenterLabel(std::string_view text) { labels_.text(LabelPlace::TopCenter, text); }
-  [[nodiscard]] const std::string& bottomLabel() const { return labels_.text(LabelPlace::Bottom); }
-  void bottomLabel(std::string_view text) { labels_.text(LabelPlace::Bottom, text); }
-  [[nodiscard]] const std::string& bottomCenterLabel() const {
-    return labels_.text(LabelPlace::BottomCenter);
-  }
-  void bottomCenterLabel(std::string_view text) { labels_.text(LabelPlace::BottomCenter, text); }
-  [[nodiscard]] const std::vector<std::string>& yAxisLabels() const { return labels_.yAxisTexts(); }
-
   // Number formats of marker read-outs. With autoFormatX a read-out's x is no finer than the points lie
-  // apart, whatever the format; with autoFormatY the value axis has the decimals that its divisions call for.
+  // apart, whatever the format.
   Property<std::string> xMarkerFormatString{"0.######"};
   Property<std::string> yMarkerFormatString{"0.##"};
   Property<bool> autoFormatX;
-  [[nodiscard]] bool autoFormatY() const { return autoFormatY_; }
-  void autoFormatY(bool on);
-
-  // --- Plot insets: pixels between the panel's rectangle and the plot. gridScaleTop is the level at the top
-  // of the axis, so the top inset has a name of its own.
-  [[nodiscard]] float gridScaleLeft() const { return insets_.left; }
-  void gridScaleLeft(float px) { insets_.left = px; }
-  [[nodiscard]] float gridScaleRight() const { return insets_.right; }
-  void gridScaleRight(float px) { insets_.right = px; }
-  [[nodiscard]] float gridScaleBottom() const { return insets_.bottom; }
-  void gridScaleBottom(float px) { insets_.bottom = px; }
-  [[nodiscard]] float gridInsetTop() const { return insets_.top; }
-  void gridInsetTop(float px) { insets_.top = px; }
 
   // --- Grid
-  [[nodiscard]] Color getGridDrawColor() const { return gridPen_.color; }
-  void setGridDrawColor(Color color) { gridPen_.color = color; }
-  [[nodiscard]] PenStyle getGridLineDrawingStyle() const { return gridPen_.style; }
-  void setGridLineDrawingStyle(PenStyle style) { gridPen_.style = style; }
-  // Written to the surface's ViewDrawStyle before the grid is drawn, once it has been set.
-  [[nodiscard]] std::optional<PenStyle> getGridDrawStyle() const { return gridDrawStyle_; }
-  void setGridDrawStyle(PenStyle style) { gridDrawStyle_ = style; }
   // In multi-band mode the grid has a line at each boundary of `numberOfBands` bands of equal width.
   Property<bool> multiBand;
   Property<std::int16_t> numberOfBands;
 
   // --- Painting, in the order in which the trace manager calls it
-  [[nodiscard]] DrawingSurface* drawingArea() const { return surface_; }
-  void drawingArea(DrawingSurface* surface) override { surface_ = surface; }
   void processData() override;
-  [[nodiscard]] float scaleLeft() const override { return panel_.left; }
-  void scaleLeft(float px) override { panel_.left = px; }
-  [[nodiscard]] float scaleTop() const override { return panel_.top; }
-  void scaleTop(float px) override { panel_.top = px; }
-  [[nodiscard]] float scaleWidth() const override { return panel_.width; }
-  void scaleWidth(float px) override { panel_.width = px; }
-  [[nodiscard]] float scaleHeight() const override { return panel_.height; }
-  void scaleHeight(float px) override { panel_.height = px; }
-  void createClippingRegion(float areaLeft, float areaTop, float areaRight, float areaBottom,
-                            DcHandle dc) override;
   void Paint(DcHandle dc) override;
   // Directly on the surface of drawingArea, over its whole scale.
   void Paint();
   void drawMarkers(DcHandle dc) override;
-  void destroyClippingRegion(DcHandle dc) override;
   void Label(DcHandle dc, const LabelFonts& fonts) override;
   // Refreshes the stored values of all markers and writes what the active marker reads into the top row.
   // Where there is not room for all of it, the delta is left out, then the x value, then the rest.
   void updateMarkerDisplay(DcHandle dc, const LabelFonts& fonts) override;
   // What every marker reads, trace by trace.
   [[nodiscard]] std::vector<MarkerReading> markerReadings();
-  // Fills the panel with the background.
-  void clearArea(DcHandle dc);
-  // Colour of the selected trace, as last painted.
-  [[nodiscard]] Color activeTraceColor() const override { return activeTraceColor_; }
-  void activeTraceColor(Color color) { activeTraceColor_ = color; }
 
   // --- Markers
   [[nodiscard]] MarkerCollection& markerCollection() override {
@@ -249,12 +158,6 @@ class clsMultiTracePainter : public TraceObject {
   // Reported, and raises "Subscript out of range", for a trace that does not exist.
   [[nodiscard]] MarkerCollection& traceMarkerCollections(std::int16_t traceIndex) override;
   void traceMarkerCollections(std::int16_t traceIndex, MarkerCollection markers);
-  [[nodiscard]] MarkerPointer activeMarker() const override { return activeMarker_; }
-  void activeMarker(MarkerPointer marker) override;  // the one before stops being active
-  [[nodiscard]] MarkerPointer mouseActiveMarker() const override { return mouseActiveMarker_; }
-  void mouseActiveMarker(MarkerPointer marker) override { mouseActiveMarker_ = std::move(marker); }
-  [[nodiscard]] std::int16_t markerCount() const override { return markerCount_; }
-  void markerCount(std::int16_t count) override { markerCount_ = count; }
   void findNearestPoint(float x, float y, clsMarker& marker,
                         std::optional<std::int16_t> traceIndex = std::nullopt) override;
   // Null when no trace has a marker with the id.
@@ -274,8 +177,6 @@ class clsMultiTracePainter : public TraceObject {
   void KeyPress(std::int16_t key) override;
 
   // --- Kept and given back: the interface that both painters share
-  [[nodiscard]] std::int16_t yAxisStyle() const override { return yAxisStyle_; }
-  void yAxisStyle(std::int16_t style) override { yAxisStyle_ = style; }
   Property<std::int16_t> maxTraces{5};
   Property<std::int16_t> maxPNs{40};
   Property<std::int16_t> otherIs;
@@ -304,23 +205,19 @@ class clsMultiTracePainter : public TraceObject {
   void storeValues(TraceSlot& slot, const Variant& values);
   void valuesChanged(TraceSlot& slot);
 
-  [[nodiscard]] ValueRange axis() const;
   [[nodiscard]] std::optional<ValueRange> dataRange();
   void computeMinMax(TraceSlot& slot);
   [[nodiscard]] const MinMax& currentMinMax(TraceSlot& slot);
-  void measureAxis() noexcept;
   void writeXLabel(LabelPlace place, double value);
   void writeDivisionLabel(LabelPlace place);
 
   static Color traceColor(std::size_t index);
   void paintPanel(DcHandle dc, const PlotRect& panel);
-  void DrawGrid(DcHandle dc, const std::optional<PlotRect>& area);
   void drawTraces(DcHandle dc, const PlotRect& plot);
   void placePoints(TraceSlot& slot, const PlotRect& plot, const ValueAxis& y);
   void drawTrace(DcHandle dc, const TracePoints& points, Color color);
   void forgetPoints() noexcept;
   void chooseRange();
-  [[nodiscard]] PlotRect surfaceRect() const;  // raises when there is no surface
 
   enum class Readout : std::uint8_t { WithDelta, Full, LevelOnly };
   void markerToExtreme(double MinMax::*index);
@@ -336,29 +233,10 @@ class clsMultiTracePainter : public TraceObject {
   void composeReadout(Readout readout);
   [[nodiscard]] MarkerPointer partnerOf(const clsMarker& marker);
 
-  Gdi& gdi_;
-  DrawingSurface* surface_ = nullptr;
-  std::int16_t resultType_ = 0;
-  std::int32_t id_;
-  bool traceIsVisible_ = true;
-
   TraceStore traces_;
   std::int16_t selectedTraceIndex_ = 0;
   bool multiMarker_ = false;
-  bool dataChanged_ = false;
   std::vector<double> converted_;  // scratch for arrays of other types
-
-  std::optional<double> top_;
-  double perDivision_ = 10;
-  double axisLength_ = 100;
-  std::int32_t numberOfVerticalDivisions_ = 10;
-  bool autoScale_ = false;
-  bool autoFormatY_ = false;
-  std::int16_t yAxisStyle_ = 0;
-  clsNumericEntry yAxisFormatter_;
-  ValueRange range_{-100, 0};  // in force
-  std::optional<ValueRange>
-      labelledRange_;  // of the value axis's labels; empty when they must be written again
 
   double xStart_ = 0;
   double xStop_ = 0;
@@ -368,21 +246,8 @@ class clsMultiTracePainter : public TraceObject {
   clsNumericEntry xAxisFormatter_;
   bool xLabelsStale_ = false;
 
-  PlotLabels labels_;
   std::string text_;     // scratch of label writing
   std::string readout_;  // scratch of updateMarkerDisplay
-  PlotRect panel_;
-  PlotInsets insets_{48, 24, 12, 20};
-  GridPen gridPen_;
-  std::optional<PenStyle> gridDrawStyle_;
-  std::vector<GridLine> gridLines_;
-  RegionHandle clip_{};
-  Color activeTraceColor_;
-
-  MarkerPointer activeMarker_;
-  MarkerPointer mouseActiveMarker_;
-  std::int16_t markerCount_ = 0;
-
   Property<bool> drawBorders_;
   Property<std::int16_t> barLabeling_;
   Property<std::int16_t> numBkts_;

@@ -54,12 +54,6 @@ void clsMultiTracePainter::traceMarkerCollections(std::int16_t traceIndex, Marke
         [&] { traces_.slot(traceIndex).markers = std::move(markers); });
 }
 
-void clsMultiTracePainter::activeMarker(MarkerPointer marker) {
-  if (activeMarker_ != nullptr) activeMarker_->active = false;
-  activeMarker_ = std::move(marker);
-  if (activeMarker_ != nullptr) activeMarker_->active = true;
-}
-
 void clsMultiTracePainter::findNearestPoint(float x, float y, clsMarker& marker,
                                             std::optional<std::int16_t> traceIndex) {
   guard("findNearestPoint() ...", [&] {
@@ -106,11 +100,11 @@ void clsMultiTracePainter::addMarkerToTrace(MarkerPointer marker, std::int16_t t
 
 void clsMultiTracePainter::deleteActiveMarker() {
   guard("deleteActiveMarker()...", [this] {
-    if (activeMarker_ == nullptr) return;
-    const MarkerPointer deleted = activeMarker_;
+    if (activeMarker() == nullptr) return;
+    const MarkerPointer deleted = activeMarker();
     const std::int16_t owner = traces_.findMarker(deleted.get());
     activeMarker(nullptr);
-    mouseActiveMarker_ = nullptr;
+    mouseActiveMarker(nullptr);
     if (owner == -1) return;
     MarkerCollection& markers = traces_.slot(owner).markers;
     removeMarker(markers, deleted.get());
@@ -124,8 +118,8 @@ void clsMultiTracePainter::deleteActiveMarker() {
 
 void clsMultiTracePainter::KeyPress(std::int16_t key) {
   guard("clsMultiTracePainter::KeyPress()", [&] {
-    if (activeMarker_ == nullptr) return;
-    activeMarker_->point = toInt32(activeMarker_->point + (key == kRightArrow ? 1.0 : -1.0));
+    if (activeMarker() == nullptr) return;
+    activeMarker()->point = toInt32(activeMarker()->point + (key == kRightArrow ? 1.0 : -1.0));
   });
 }
 
@@ -135,7 +129,7 @@ void clsMultiTracePainter::markerToMin() { markerToExtreme(&MinMax::minimumIndex
 void clsMultiTracePainter::markerToExtreme(double MinMax::*index) {
   guard("computeMinMax()", [&] {
     const MinMax& found = currentMinMax(traces_.slot(selectedTraceIndex_));
-    if (activeMarker_ != nullptr && found.found) activeMarker_->point = toInt32(found.*index);
+    if (activeMarker() != nullptr && found.found) activeMarker()->point = toInt32(found.*index);
   });
 }
 
@@ -143,7 +137,8 @@ void clsMultiTracePainter::markerToExtreme(double MinMax::*index) {
 
 void clsMultiTracePainter::drawMarkers(DcHandle dc) {
   guard("drawMarkers() ...", [&] {
-    const TextStyleScope style(gdi_, dc, gdi_.sysColor(SystemColor::ButtonText), BackgroundMode::Transparent);
+    const TextStyleScope style(gdi(), dc, gdi().sysColor(SystemColor::ButtonText),
+                               BackgroundMode::Transparent);
     for (std::size_t t = 0; t < traces_.traces().size(); ++t) drawMarkersOf(dc, t);
   });
 }
@@ -151,11 +146,11 @@ void clsMultiTracePainter::drawMarkers(DcHandle dc) {
 void clsMultiTracePainter::drawMarkersOf(DcHandle dc, std::size_t trace) {
   const TraceSlot& slot = traces_.traces()[trace];
   if (slot.markers.empty()) return;
-  const SelectedPen pen(gdi_, dc, PenStyle::Solid, 1, traceColor(trace));
+  const SelectedPen pen(gdi(), dc, PenStyle::Solid, 1, traceColor(trace));
   for (const MarkerPointer& marker : slot.markers) {
     if (!placeMarker(trace, *marker)) continue;
-    marker->draw(gdi_, dc);
-    marker->drawId(gdi_, dc);
+    marker->draw(gdi(), dc);
+    marker->drawId(gdi(), dc);
   }
 }
 
@@ -199,19 +194,19 @@ void clsMultiTracePainter::refreshValues(const TraceSlot& slot, clsMarker& marke
 
 void clsMultiTracePainter::updateActiveMarker() {
   guard("updateActiveMarker() ...", [this] {
-    if (activeMarker_ == nullptr) return;
-    const std::int16_t trace = traces_.findMarker(activeMarker_.get());
+    if (activeMarker() == nullptr) return;
+    const std::int16_t trace = traces_.findMarker(activeMarker().get());
     if (trace == -1 || trace >= traces_.count()) return;
-    placeMarker(static_cast<std::size_t>(trace), *activeMarker_);
-    refreshValues(traces_.slot(trace), *activeMarker_);
+    placeMarker(static_cast<std::size_t>(trace), *activeMarker());
+    refreshValues(traces_.slot(trace), *activeMarker());
   });
 }
 
 void clsMultiTracePainter::updateMarkerValueX() {
   guard("updateMarkerValueX() ...", [this] {
-    if (activeMarker_ == nullptr) return;
-    const std::int16_t trace = traces_.findMarker(activeMarker_.get());
-    if (trace != -1) refreshValueX(traces_.slot(trace), *activeMarker_);
+    if (activeMarker() == nullptr) return;
+    const std::int16_t trace = traces_.findMarker(activeMarker().get());
+    if (trace != -1) refreshValueX(traces_.slot(trace), *activeMarker());
   });
 }
 
@@ -233,9 +228,10 @@ void clsMultiTracePainter::updateMarkerDisplay(DcHandle dc, const LabelFonts& fo
     for (const TraceSlot& slot : traces_.traces()) {
       for (const MarkerPointer& marker : slot.markers) refreshValues(slot, *marker);
     }
-    if (activeMarker_ == nullptr) return;
-    const SelectedFont font(gdi_, dc, fonts.corner);
-    const TextStyleScope style(gdi_, dc, gdi_.sysColor(SystemColor::ButtonText), BackgroundMode::Transparent);
+    if (activeMarker() == nullptr) return;
+    const SelectedFont font(gdi(), dc, fonts.corner);
+    const TextStyleScope style(gdi(), dc, gdi().sysColor(SystemColor::ButtonText),
+                               BackgroundMode::Transparent);
     writeReadout(dc);
   });
 }
@@ -244,16 +240,16 @@ void clsMultiTracePainter::updateMarkerDisplay(DcHandle dc, const LabelFonts& fo
 void clsMultiTracePainter::writeReadout(DcHandle dc) {
   for (const Readout readout : {Readout::WithDelta, Readout::Full, Readout::LevelOnly}) {
     composeReadout(readout);
-    const auto cell = labels_.roomFor(LabelPlace::Readout, gdi_.textExtent(dc, readout_));
+    const auto cell = labels().roomFor(LabelPlace::Readout, gdi().textExtent(dc, readout_));
     if (cell) {
-      gdi_.textOut(dc, {cell->left, cell->top}, readout_);
+      gdi().textOut(dc, {cell->left, cell->top}, readout_);
       return;
     }
   }
 }
 
 ReadoutFormat clsMultiTracePainter::readoutFormat() const {
-  return {xAxisFormatter_, yAxisFormatter_,
+  return {xAxisFormatter_, yAxisFormatter(),
           autoFormatX() ? std::string_view() : std::string_view(xMarkerFormatString()), yMarkerFormatString(),
           std::fabs(pointSpacing())};
 }
@@ -271,7 +267,7 @@ std::vector<MarkerReading> clsMultiTracePainter::markerReadings() {
 }
 
 void clsMultiTracePainter::composeReadout(Readout readout) {
-  const clsMarker& marker = *activeMarker_;
+  const clsMarker& marker = *activeMarker();
   const ReadoutFormat format = readoutFormat();
   readout_.clear();
   const MarkerPointer partner = partnerOf(marker);

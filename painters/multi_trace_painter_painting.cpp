@@ -47,48 +47,26 @@ Color clsMultiTracePainter::traceColor(std::size_t index) {
   return kTraceColors[index < kTraceColors.size() ? index : 0];
 }
 
-void clsMultiTracePainter::createClippingRegion(float areaLeft, float areaTop, float areaRight,
-                                                float areaBottom, DcHandle dc) {
-  guard("createClippingRegion() ...", [&] {
-    destroyClippingRegion(dc);
-    clip_ =
-        gdi_.createRectRgn({toInt32(areaLeft), toInt32(areaTop), toInt32(areaRight), toInt32(areaBottom)});
-    if (clip_) gdi_.selectClipRgn(dc, clip_);
-  });
-}
-
-void clsMultiTracePainter::destroyClippingRegion(DcHandle dc) {
-  guard("destroyClippingRegion() ...", [&] {
-    if (!clip_) return;
-    gdi_.selectClipRgn(dc, {});
-    gdi_.deleteObject(std::exchange(clip_, {}));
-  });
-}
-
 void clsMultiTracePainter::Paint(DcHandle dc) {
-  guard("clsMultiTracePainter::Paint() ...", [&] { paintPanel(dc, panel_); });
+  guard("clsMultiTracePainter::Paint() ...", [&] { paintPanel(dc, panelRect()); });
 }
 
 void clsMultiTracePainter::Paint() {
   guard("clsMultiTracePainter::Paint() ...", [this] {
     const PlotRect area = surfaceRect();
-    paintPanel(surface_->ViewHDC(), area);
+    paintPanel(surfaceDc(), area);
   });
 }
 
-PlotRect clsMultiTracePainter::surfaceRect() const {
-  if (surface_ == nullptr) raiseObjectVariableNotSet();
-  return {surface_->ViewScaleLeft(), surface_->ViewScaleTop(), surface_->ViewScaleWidth(),
-          surface_->ViewScaleHeight()};
-}
-
 void clsMultiTracePainter::paintPanel(DcHandle dc, const PlotRect& panel) {
-  const PlotRect plot = panel.shrunk(insets_);
+  const PlotRect plot = panel.shrunk(insets());
   forgetPoints();
   if (!plot.drawable()) return;
   chooseRange();
-  DrawGrid(dc, plot);
-  if (range_.extent() > 0) drawTraces(dc, plot);
+  drawGridOver(dc, plot,
+               {numberOfVerticalDivisions(), numberOfHorizontalDivisions_,
+                multiBand() ? numberOfBands() : std::int16_t{0}});
+  if (range().extent() > 0) drawTraces(dc, plot);
 }
 
 void clsMultiTracePainter::forgetPoints() noexcept {
@@ -96,37 +74,24 @@ void clsMultiTracePainter::forgetPoints() noexcept {
 }
 
 void clsMultiTracePainter::chooseRange() {
-  if (autoScale_) DoAutoScale();
-  range_ = calcMinMax() ? dataRange().value_or(axis()) : axis();
-}
-
-void clsMultiTracePainter::DrawGrid(DcHandle dc, const std::optional<PlotRect>& area) {
-  guard("clsMultiTracePainter::DrawGrid()...", [&] {
-    if (gridDrawStyle_) {
-      if (surface_ == nullptr) raiseObjectVariableNotSet();
-      surface_->ViewDrawStyle(*gridDrawStyle_);
-    }
-    const GridDivisions divisions{numberOfVerticalDivisions_, numberOfHorizontalDivisions_,
-                                  multiBand() ? numberOfBands() : std::int16_t{0}};
-    layOutGrid(area ? *area : surfaceRect(), divisions, gridLines_);
-    drawGrid(gdi_, dc, gridLines_, gridPen_);
-  });
+  if (getAutoScale()) DoAutoScale();
+  range(calcMinMax() ? dataRange().value_or(axis()) : axis());
 }
 
 void clsMultiTracePainter::drawTraces(DcHandle dc, const PlotRect& plot) {
   // The divisor N - 2 is wanted: the last two positions fall outside the plot on the right. With N = 2 the
   // step of the paint before stays.
   if (numberOfMeasurements() != 2) xStepPx_ = plot.width / (numberOfMeasurements() - 2.0);
-  const ValueAxis y(plot, range_);
-  const PlotClip clip(gdi_, dc, plot, clip_);
+  const ValueAxis y(plot, range());
+  const PlotClip clip(gdi(), dc, plot, panelClip());
   const auto traces = traces_.traces();
   for (std::size_t t = 0; t < traces.size(); ++t) {
     if (!traces[t].data.isArray()) continue;
     placePoints(traces[t], plot, y);
     const Color color = traceColor(t);
     drawTrace(dc, traces[t].points, color);
-    dataChanged_ = false;
-    if (t == static_cast<std::size_t>(selectedTraceIndex_)) activeTraceColor_ = color;
+    dataChanged(false);
+    if (t == static_cast<std::size_t>(selectedTraceIndex_)) activeTraceColor(color);
   }
 }
 
@@ -141,13 +106,13 @@ void clsMultiTracePainter::placePoints(TraceSlot& slot, const PlotRect& plot, co
 }
 
 void clsMultiTracePainter::drawTrace(DcHandle dc, const TracePoints& points, Color color) {
-  const SelectedPen pen(gdi_, dc, PenStyle::Solid, 1, color);
+  const SelectedPen pen(gdi(), dc, PenStyle::Solid, 1, color);
   for (const TracePoints::Stretch& stretch : points.stretches()) {
     const auto line = points.points(stretch);
     if (line.size() > 1) {
-      gdi_.polyline(dc, line);
+      gdi().polyline(dc, line);
     } else {  // a line of one point draws nothing: a lone value between two gaps is a mark one pixel wide
-      gdi_.polyline(dc, std::array{line[0], Point{toInt32(line[0].x + 1.0), line[0].y}});
+      gdi().polyline(dc, std::array{line[0], Point{toInt32(line[0].x + 1.0), line[0].y}});
     }
   }
 }
@@ -155,14 +120,8 @@ void clsMultiTracePainter::drawTrace(DcHandle dc, const TracePoints& points, Col
 void clsMultiTracePainter::Label(DcHandle dc, const LabelFonts& fonts) {
   guard("clsMultiTracePainter::Label() ...", [&] {
     if (xLabelsStale_) updateXAxisLabels();
-    if (labelledRange_ != range_) updateYAxisLabels();
-    labels_.draw(gdi_, dc, fonts, panel_.toPixels(), panel_.shrunk(insets_).toPixels());
+    drawLabels(dc, fonts);
   });
-}
-
-void clsMultiTracePainter::clearArea(DcHandle dc) {
-  guard("clearArea() ...",
-        [&] { gdi_.fillRect(dc, panel_.toPixels(), gdi_.sysColorBrush(SystemColor::ButtonFace)); });
 }
 
 }  // namespace frontpanels
