@@ -14,6 +14,7 @@ void raisePermissionDenied() { throw RuntimeError(70, "Permission denied"); }
 void raisePathFileAccessError() { throw RuntimeError(75, "Path/File access error"); }
 void raiseObjectVariableNotSet() { throw RuntimeError(91, "Object variable or With block variable not set"); }
 void raiseInvalidUseOfNull() { throw RuntimeError(94, "Invalid use of Null"); }
+void raiseInvalidFileFormat() { throw RuntimeError(321, "Invalid file format"); }
 void raiseMemberNotSupported() { throw RuntimeError(438, "Object doesn't support this property or method"); }
 void raiseDuplicateKey() {
   throw RuntimeError(457, "This key is already associated with an element of this collection");

@@ -32,6 +32,7 @@ class RuntimeError {
 [[noreturn]] void raisePathFileAccessError();   // 75
 [[noreturn]] void raiseObjectVariableNotSet();  // 91
 [[noreturn]] void raiseInvalidUseOfNull();      // 94
+[[noreturn]] void raiseInvalidFileFormat();     // 321
 [[noreturn]] void raiseMemberNotSupported();    // 438
 [[noreturn]] void raiseDuplicateKey();          // 457
 
