@@ -1,8 +1,10 @@
-// One bar of a bar chart, as a plain value. It is copied whole.
+// One bar of a bar chart, as a plain value, and the bars of a chart.
 #pragma once
 
 #include <cstdint>
+#include <span>
 #include <string>
+#include <vector>
 
 #include "platform/variant.h"
 
@@ -27,6 +29,30 @@ struct Bar {
   float auxiliary = -1.0F;
   double cellNameId2 = -1.0;  // second identifier of the cell's name
   friend bool operator==(const Bar&, const Bar&) = default;
+};
+
+// A bar in its chart.
+struct HeldBar : Bar {
+  std::int32_t item = 0;     // of the block that it was filled from, from 0
+  std::int32_t updates = 0;  // that it has been in on end
+  bool hasOther = false;     // whether its item had the other quantity
+  friend bool operator==(const HeldBar&, const HeldBar&) = default;
+};
+
+// The bars in their order. Records outlive the bars that were in them, so that texts find their storage
+// again.
+class BarArray {
+ public:
+  [[nodiscard]] std::span<HeldBar> bars() noexcept { return std::span(records_).first(count_); }
+  [[nodiscard]] std::span<const HeldBar> bars() const noexcept { return std::span(records_).first(count_); }
+  void resize(std::size_t count) {
+    if (records_.size() < count) records_.resize(count);
+    count_ = count;
+  }
+
+ private:
+  std::vector<HeldBar> records_;
+  std::size_t count_ = 0;
 };
 
 }  // namespace frontpanels

@@ -6,15 +6,17 @@
 #include <limits>
 #include <utility>
 
+#include "framework/support/error_handler.h"
 #include "framework/support/guard.h"
 #include "framework/support/numeric.h"
+#include "painters/min_max.h"
 #include "platform/runtime_error.h"
 
 namespace frontpanels {
 namespace {
 
 constexpr std::string_view kDefaultKeyFormat = "0.##";
-constexpr std::int16_t kSortModes = 5;
+constexpr std::int16_t kAscending = 1;
 constexpr std::int16_t kFillStyles = 8;
 constexpr std::int16_t kLabelings = 3;
 constexpr std::int16_t kSuffixes = 4;
@@ -23,12 +25,19 @@ void requireBetween(std::int32_t value, std::int32_t smallest, std::int32_t larg
   if (value < smallest || value > largest) raiseInvalidProcedureCall();
 }
 
+std::int32_t lastItem(std::span<const HeldBar> bars) {
+  std::int32_t last = 0;
+  for (const HeldBar& bar : bars) last = std::max(last, bar.item);
+  return last;
+}
+
 }  // namespace
 
 clsBarChartPainter::clsBarChartPainter(Gdi& gdi) : PlotPainter(gdi) {
   guard("class_Initialize() ...", [this] {
     xAxisFormatter_.formatString(kDefaultKeyFormat);
-    bars_.reserve(static_cast<std::size_t>(maxPNs_));
+    bars_.resize(static_cast<std::size_t>(maxPNs_));
+    bars_.resize(0);
   });
 }
 
@@ -44,7 +53,7 @@ void clsBarChartPainter::numberOfMeasurements(std::int32_t count) {
 void clsBarChartPainter::elementsPerValue(std::int32_t count) {
   guard("clsBarChartPainter::elementsPerValue()...", [&] {
     requireBetween(count, 2, std::numeric_limits<std::int32_t>::max());
-    fill(elementsPerValue_, count);
+    fillBy(rules_.elementsPerValue, count);
   });
 }
 
@@ -52,6 +61,7 @@ void clsBarChartPainter::trace(const Variant& values) {
   guard("clsBarChartPainter::trace()...", [&] {
     if (!values.isArray() && !values.isNull() && !values.isEmpty()) raiseTypeMismatch();
     block_ = values;
+    blockHeld_ = false;
     dataChanged(true);
   });
 }
@@ -63,6 +73,7 @@ void clsBarChartPainter::trace(std::span<const float> values) {
     } else {
       block_ = Variant(Variant::Singles(values.begin(), values.end()));
     }
+    blockHeld_ = false;
     dataChanged(true);
   });
 }
@@ -82,7 +93,7 @@ void clsBarChartPainter::setBarsToPaint(std::int16_t count) {
 // --- What bars hold
 
 template <class T>
-void clsBarChartPainter::fill(T& setting, const T& value) {
+void clsBarChartPainter::fillBy(T& setting, const T& value) {
   if (setting == value) return;
   setting = value;
   barsStale_ = true;
@@ -91,25 +102,25 @@ void clsBarChartPainter::fill(T& setting, const T& value) {
 void clsBarChartPainter::offset(const Variant& amount) {
   guard("clsBarChartPainter::offset()...", [&] {
     if (!amount.isNumeric()) raiseTypeMismatch();
-    fill(offset_, amount);
+    fillBy(rules_.offset, amount);
   });
 }
 
-void clsBarChartPainter::useOffset(bool use) { fill(useOffset_, use); }
-void clsBarChartPainter::otherIs(std::int16_t type) { fill(otherIs_, type); }
-void clsBarChartPainter::kindFlag(std::int16_t kind) { fill(kindFlag_, kind); }
-void clsBarChartPainter::extraValueMode(std::int16_t mode) { fill(extraValueMode_, mode); }
-void clsBarChartPainter::extraValueSource(std::int16_t source) { fill(extraValueSource_, source); }
-void clsBarChartPainter::hasCellNameLookupId2(bool has) { fill(hasCellNameLookupId2_, has); }
+void clsBarChartPainter::useOffset(bool use) { fillBy(rules_.useOffset, use); }
+void clsBarChartPainter::otherIs(std::int16_t type) { fillBy(rules_.otherIs, type); }
+void clsBarChartPainter::kindFlag(std::int16_t kind) { fillBy(rules_.kindFlag, kind); }
+void clsBarChartPainter::extraValueMode(std::int16_t mode) { fillBy(rules_.extraValueMode, mode); }
+void clsBarChartPainter::extraValueSource(std::int16_t source) { fillBy(rules_.extraValueSource, source); }
+void clsBarChartPainter::hasCellNameLookupId2(bool has) { fillBy(rules_.hasCellNameLookupId2, has); }
 
 void clsBarChartPainter::defaultExtraValue(const Variant& value) {
-  guard("clsBarChartPainter::defaultExtraValue()...", [&] { fill(defaultExtraValue_, value); });
+  guard("clsBarChartPainter::defaultExtraValue()...", [&] { fillBy(rules_.defaultExtraValue, value); });
 }
 
 // --- Order
 
 template <class T>
-void clsBarChartPainter::order(T& setting, const T& value) {
+void clsBarChartPainter::sortBy(T& setting, const T& value) {
   if (setting == value) return;
   setting = value;
   SortBars();
@@ -117,13 +128,14 @@ void clsBarChartPainter::order(T& setting, const T& value) {
 
 void clsBarChartPainter::barSortByMode(std::int16_t mode) {
   guard("clsBarChartPainter::barSortByMode()...", [&] {
-    requireBetween(mode, 0, kSortModes - 1);
-    order(barSortByMode_, mode);
+    requireBetween(mode, static_cast<std::int16_t>(BarSort::Arrival),
+                   static_cast<std::int16_t>(BarSort::Other));
+    sortBy(barSortByMode_, mode);
   });
 }
 
-void clsBarChartPainter::barSortOrder(std::int16_t order) { this->order(barSortOrder_, order); }
-void clsBarChartPainter::sortBySetOrder(bool bySets) { order(sortBySetOrder_, bySets); }
+void clsBarChartPainter::barSortOrder(std::int16_t order) { sortBy(barSortOrder_, order); }
+void clsBarChartPainter::sortBySetOrder(bool bySets) { sortBy(sortBySetOrder_, bySets); }
 
 void clsBarChartPainter::setOrderList(BarSets sets) {
   guard("clsBarChartPainter::setOrderList()...", [&] {
@@ -136,7 +148,7 @@ void clsBarChartPainter::setOrderList(BarSets sets) {
 void clsBarChartPainter::numberOfSets(std::int16_t count) {
   guard("clsBarChartPainter::numberOfSets()...", [&] {
     requireBetween(count, 0, std::numeric_limits<std::int16_t>::max());
-    order(numberOfSets_, count);
+    sortBy(numberOfSets_, count);
   });
 }
 
@@ -197,17 +209,93 @@ void clsBarChartPainter::setFillStyle(std::int16_t style) {
 
 // --- The bars
 
-void clsBarChartPainter::processData() {}
-void clsBarChartPainter::SortBars() {}
-void clsBarChartPainter::DoAutoScale() {}
-void clsBarChartPainter::Paint(DcHandle /*dc*/) {}
-void clsBarChartPainter::Paint() {}
-void clsBarChartPainter::Label(DcHandle /*dc*/, const LabelFonts& /*fonts*/) {}
+// Whatever comes of it, a block is taken up once: the trace manager asks before each paint.
+void clsBarChartPainter::processData() {
+  guard("clsBarChartPainter::processData()...", [this] {
+    if (!dataChanged()) return;
+    dataChanged(false);
+    if (block_.isNull() || (numberOfMeasurements_ == 0 && numberOfTraces() > 0)) return;
+    requireItems(block_, numberOfMeasurements_, rules_.elementsPerValue);
+    fillFromBlock(static_cast<std::size_t>(std::min<std::int32_t>(numberOfMeasurements_, maxPNs_)),
+                  [](std::size_t i) { return static_cast<std::int32_t>(i); });
+    matcher_.match(bars_.bars(), filled_.bars());
+    takeFilled();
+  });
+}
+
+template <class ItemOf>
+void clsBarChartPainter::fillFromBlock(std::size_t count, ItemOf itemOf) {
+  if (!knownOther(rules_.otherIs)) {
+    errorHandler().Assert("clsBarChartPainter::processData()  unknown type for other" + block_.typeName());
+  }
+  filled_.resize(count);
+  for (std::size_t i = 0; i < count; ++i) fillBar(filled_.bars()[i], block_, itemOf(i), rules_);
+}
+
+void clsBarChartPainter::takeFilled() {
+  fullRedraw_ = fullRedraw_ || filled_.bars().size() < bars_.bars().size();
+  std::swap(bars_, filled_);
+  blockHeld_ = true;
+  barsStale_ = false;
+  SortBars();
+}
+
+// No update: who is who, and for how long, stays.
+void clsBarChartPainter::refreshStaleBars() {
+  if (!std::exchange(barsStale_, false) || !blockHeld_) return;
+  guard("clsBarChartPainter::processData()...", [this] {
+    const std::span<const HeldBar> held = bars();
+    if (!held.empty()) requireItems(block_, lastItem(held) + 1, rules_.elementsPerValue);
+    fillFromBlock(held.size(), [held](std::size_t i) { return held[i].item; });
+    const std::span<HeldBar> filled = filled_.bars();
+    for (std::size_t i = 0; i < held.size(); ++i) {
+      filled[i].barId = held[i].barId;
+      filled[i].updates = held[i].updates;
+    }
+    takeFilled();
+  });
+}
 
 void clsBarChartPainter::ClearBars() {
-  fullRedraw_ = fullRedraw_ || !bars_.empty();
-  bars_.clear();
+  fullRedraw_ = fullRedraw_ || !bars().empty();
+  bars_.resize(0);
 }
+
+void clsBarChartPainter::SortBars() {
+  guard("clsBarChartPainter::SortBars()...", [this] {
+    sortFlag_ = barSortByMode_ != static_cast<std::int16_t>(BarSort::Arrival);
+    order_.sort(bars_.bars(), static_cast<BarSort>(barSortByMode_), barSortOrder_ == kAscending);
+    if (sortBySetOrder_) SortBarsBySet();
+  });
+}
+
+void clsBarChartPainter::SortBarsBySet() {
+  guard("clsBarChartPainter::SortBarsBySet()... ", [this] {
+    if (static_cast<std::size_t>(numberOfSets_) > setOrderList_.size()) raiseSubscriptOutOfRange();
+    order_.groupBySets(bars_.bars(), std::span(setOrderList_).first(static_cast<std::size_t>(numberOfSets_)));
+  });
+}
+
+std::span<const HeldBar> clsBarChartPainter::barsToPaint() const {
+  const std::span<const HeldBar> all = bars();
+  return barsToPaint_ == kAllBars ? all
+                                  : all.first(std::min(all.size(), static_cast<std::size_t>(barsToPaint_)));
+}
+
+void clsBarChartPainter::DoAutoScale() {
+  guard("clsBarChartPainter::DoAutoScale()...", [this] {
+    MinMax values;
+    for (const HeldBar& bar : barsToPaint()) values.consider(static_cast<double>(bar.value), 0);
+    if (values.found) fitAxis({values.minimum, values.maximum});
+  });
+}
+
+void clsBarChartPainter::Paint(DcHandle /*dc*/) {
+  refreshStaleBars();
+  fullRedraw_ = false;
+}
+void clsBarChartPainter::Paint() {}
+void clsBarChartPainter::Label(DcHandle /*dc*/, const LabelFonts& /*fonts*/) {}
 
 float clsBarChartPainter::barValue(std::int32_t position) const {
   return guarded("clsBarChartPainter::barValue()...", 0.0F, [&] { return barAt(position).value; });
@@ -228,7 +316,7 @@ const Bar& clsBarChartPainter::barAt(std::int32_t position) const {
 
 std::int32_t clsBarChartPainter::findBar(std::int16_t barId) const {
   return guarded("clsBarChartPainter::findBar()...", std::int32_t{0}, [&] {
-    const std::span<const Bar> all = bars();
+    const std::span<const HeldBar> all = bars();
     const auto found =
         std::find_if(all.begin(), all.end(), [&](const Bar& bar) { return bar.barId == barId; });
     if (found == all.end()) raiseSubscriptOutOfRange();

@@ -16,6 +16,8 @@
 
 #include "entry/numeric_entry.h"
 #include "painters/bar.h"
+#include "painters/bar_builder.h"
+#include "painters/bar_order.h"
 #include "painters/cell_names.h"
 #include "painters/plot_painter.h"
 #include "painters/property.h"
@@ -41,7 +43,7 @@ class clsBarChartPainter : public PlotPainter {
   [[nodiscard]] std::int32_t numberOfMeasurements() const { return numberOfMeasurements_; }
   void numberOfMeasurements(std::int32_t count);
   // 2 or more.
-  [[nodiscard]] std::int32_t elementsPerValue() const { return elementsPerValue_; }
+  [[nodiscard]] std::int32_t elementsPerValue() const { return rules_.elementsPerValue; }
   void elementsPerValue(std::int32_t count);
   // An array of singles, doubles or variants, or null, which stands for no news. New values set
   // `dataChanged`; storage is used again for values of the same kind.
@@ -65,28 +67,28 @@ class clsBarChartPainter : public PlotPainter {
   // from the block, which is no update.
 
   // Added to every value while useOffset is set, and to some of the other quantities in any case. A number.
-  [[nodiscard]] const Variant& offset() const { return offset_; }
+  [[nodiscard]] const Variant& offset() const { return rules_.offset; }
   void offset(const Variant& amount);
-  [[nodiscard]] bool useOffset() const { return useOffset_; }
+  [[nodiscard]] bool useOffset() const { return rules_.useOffset; }
   void useOffset(bool use);
   // The other quantity, by its element of an item (from 0): 0 none; 1 and 3 element 1 plus the offset; 2, 9,
   // 11 and 12 element 2; 4 element 1; 5 element 3 plus the offset; 6 and 10 element 3; 7 element 4; 8 element
   // 5 of items of 6. Any other is reported, once a time that bars are filled, and is none.
-  [[nodiscard]] std::int16_t otherIs() const { return otherIs_; }
+  [[nodiscard]] std::int16_t otherIs() const { return rules_.otherIs; }
   void otherIs(std::int16_t type);
   // 1: element 2 is the auxiliary value.
-  [[nodiscard]] std::int16_t kindFlag() const { return kindFlag_; }
+  [[nodiscard]] std::int16_t kindFlag() const { return rules_.kindFlag; }
   void kindFlag(std::int16_t kind);
   // The extra value is the default one; in mode 2 element 2; with four elements or more and source 0 element
   // 3; with five or more and source 2 element 4.
-  [[nodiscard]] std::int16_t extraValueMode() const { return extraValueMode_; }
+  [[nodiscard]] std::int16_t extraValueMode() const { return rules_.extraValueMode; }
   void extraValueMode(std::int16_t mode);
-  [[nodiscard]] std::int16_t extraValueSource() const { return extraValueSource_; }
+  [[nodiscard]] std::int16_t extraValueSource() const { return rules_.extraValueSource; }
   void extraValueSource(std::int16_t source);
-  [[nodiscard]] const Variant& defaultExtraValue() const { return defaultExtraValue_; }
+  [[nodiscard]] const Variant& defaultExtraValue() const { return rules_.defaultExtraValue; }
   void defaultExtraValue(const Variant& value);
   // Element 2 is the second identifier of a cell's name, the key being the first.
-  [[nodiscard]] bool hasCellNameLookupId2() const { return hasCellNameLookupId2_; }
+  [[nodiscard]] bool hasCellNameLookupId2() const { return rules_.hasCellNameLookupId2; }
   void hasCellNameLookupId2(bool has);
 
   // --- Order
@@ -114,7 +116,7 @@ class clsBarChartPainter : public PlotPainter {
 
   // --- The bars
   [[nodiscard]] std::int32_t barArraySize() const { return static_cast<std::int32_t>(bars().size()); }
-  [[nodiscard]] std::span<const Bar> bars() const { return bars_; }
+  [[nodiscard]] std::span<const HeldBar> bars() const { return bars_.bars(); }
   // Of the bar at a position; reported and 0 where there is none.
   [[nodiscard]] float barValue(std::int32_t position) const;
   [[nodiscard]] float barOffset(std::int32_t position) const;  // the key
@@ -122,7 +124,7 @@ class clsBarChartPainter : public PlotPainter {
   // The position of the bar with the identity; a miss is reported and 0.
   [[nodiscard]] std::int32_t findBar(std::int16_t barId) const;
   // Whether the bars have another quantity.
-  [[nodiscard]] bool hasOther() const { return otherIs_ != 0; }
+  [[nodiscard]] bool hasOther() const { return rules_.otherIs != 0; }
   // Whether bars have gone since the last paint, so that a host may not repaint parts only.
   [[nodiscard]] bool fullRedraw() const { return fullRedraw_; }
 
@@ -224,29 +226,32 @@ class clsBarChartPainter : public PlotPainter {
  private:
   [[nodiscard]] const Bar& barAt(std::int32_t position) const;  // raises "Subscript out of range"
   template <class T>
-  void fill(T& setting, const T& value);  // stores what bars are filled by
+  void fillBy(T& setting, const T& value);
   template <class T>
-  void order(T& setting, const T& value);  // stores what bars are sorted by, and sorts
+  void sortBy(T& setting, const T& value);
+  // Fills the records from the block, raising as fillBar does, and reports a quantity that is not known.
+  template <class ItemOf>
+  void fillFromBlock(std::size_t count, ItemOf itemOf);
+  void takeFilled();
+  void refreshStaleBars();
+  void SortBarsBySet();
+  [[nodiscard]] std::span<const HeldBar> barsToPaint() const;
 
   Variant block_ = Variant::null();
   std::int32_t numberOfMeasurements_ = 0;
-  std::int32_t elementsPerValue_ = 2;
-  Variant offset_ = 0.0;
-  bool useOffset_ = false;
-  std::int16_t otherIs_ = 0;
-  std::int16_t kindFlag_ = 0;
-  std::int16_t extraValueMode_ = 0;
-  std::int16_t extraValueSource_ = 0;
-  Variant defaultExtraValue_;
-  bool hasCellNameLookupId2_ = false;
+  BarRules rules_;
+  bool blockHeld_ = false;  // the bars were filled from the block as it is
   bool barsStale_ = false;  // what bars hold was changed since they were filled
 
   std::int16_t maxPNs_ = 40;
   std::int16_t barsToPaint_ = 20;
-  std::vector<Bar> bars_;
+  BarArray bars_;
+  BarArray filled_;  // storage of filling: what is there at the end takes the place of bars_
+  BarMatcher matcher_;
+  BarOrder order_;
   bool fullRedraw_ = false;
 
-  std::int16_t barSortByMode_ = 1;
+  std::int16_t barSortByMode_ = static_cast<std::int16_t>(BarSort::Value);
   std::int16_t barSortOrder_ = 0;
   bool sortBySetOrder_ = false;
   BarSets setOrderList_;
