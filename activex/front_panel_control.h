@@ -17,9 +17,9 @@
 #include "activex/variants.h"
 #include "activex/view_part.h"
 #include "framework/panel/base_vfp.h"
-#include "framework/panel/host_codes.h"
 #include "framework/panel/hosted_panel.h"
 #include "framework/support/guard.h"
+#include "framework/support/host_codes.h"
 #include "framework/support/numeric.h"
 #include "platform/win32/utf16.h"
 

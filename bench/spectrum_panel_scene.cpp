@@ -1,6 +1,6 @@
 #include "bench/spectrum_panel_scene.h"
 
-#include "framework/panel/host_codes.h"
+#include "framework/support/host_codes.h"
 
 namespace frontpanels::bench {
 namespace {

@@ -1,6 +1,6 @@
 #include "fp-render/headless_panel.h"
 
-#include "framework/panel/host_codes.h"
+#include "framework/support/host_codes.h"
 #include "platform/gdi_scope.h"
 #include "platform/runtime_error.h"
 

@@ -4,7 +4,7 @@
 #include <vector>
 
 #include "framework/panel/base_vfp.h"
-#include "framework/panel/host_codes.h"
+#include "framework/support/host_codes.h"
 #include "fuzz/fuzz_input.h"
 #include "fuzz/panel_under_test.h"
 

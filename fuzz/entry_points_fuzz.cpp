@@ -7,8 +7,8 @@
 
 #include "entry/host_record_list.h"
 #include "framework/panel/base_vfp.h"
-#include "framework/panel/host_codes.h"
 #include "framework/panel/hosted_panel.h"
+#include "framework/support/host_codes.h"
 #include "fuzz/fuzz_input.h"
 #include "fuzz/fuzz_variant.h"
 #include "fuzz/panel_under_test.h"

@@ -5,6 +5,8 @@
 #include <iterator>
 #include <limits>
 
+#include "framework/support/host_codes.h"
+
 namespace frontpanels {
 namespace {
 
@@ -25,22 +27,22 @@ struct SettingRow {
 };
 
 constexpr SettingRow kRows[] = {
-    {Receiver::kCenterHz, isCenter},
-    {Receiver::kSpanHz, isSpan},
-    {16, isPositive},      // resolution bandwidth, Hz
-    {17, isFlag},          // narrow IF bandwidth
-    {43, isNotNegative},   // measurement interval, s
-    {94, isPositive},      // display length
-    {333, isListValue},    // channelization
-    {500, isListValue},    // averaging type
-    {502, isCount},        // averages
-    {750, isFlag},         // frequencies rather than channels
-    {803, isNotNegative},  // measurement interval, m
-    {804, isFlag},         // the interval is a time
-    {3900, isFlag},        // averages of logarithmic power
+    {kCenterFrequencyParameter, isCenter},
+    {kSpanParameter, isSpan},
+    {kRbwParameter, isPositive},               // Hz
+    {FREQ_FILTER, isFlag},                     // a narrow IF bandwidth
+    {TIME_MEASUREMENT_PERIOD, isNotNegative},  // s
+    {kDisplayLengthParameter, isPositive},
+    {kChannelizationParameter, isListValue},
+    {kAverageTypeParameter, isListValue},
+    {kAverageCountParameter, isCount},
+    {kUnitsParameter, isFlag},                    // frequencies rather than channels
+    {kDistanceIntervalParameter, isNotNegative},  // m
+    {kIntervalKindParameter, isFlag},             // the interval is a time
+    {PARM_AVERAGE_AS_LOG_POWER, isFlag},          // averages of logarithmic power
 };
 
-bool isTuning(std::int16_t code) { return code == Receiver::kCenterHz || code == Receiver::kSpanHz; }
+bool isTuning(std::int16_t code) { return code == kCenterFrequencyParameter || code == kSpanParameter; }
 
 }  // namespace
 
@@ -60,8 +62,8 @@ bool Receiver::request(std::int16_t code, double value) {
 
 // Not before centre and span are asked for again: a panel that has changed both says so one after the other.
 void Receiver::fitRange() {
-  const auto center = values_.find(kCenterHz);
-  const auto span = values_.find(kSpanHz);
+  const auto center = values_.find(kCenterFrequencyParameter);
+  const auto span = values_.find(kSpanParameter);
   if (!tuned_ || center == values_.end() || span == values_.end()) return;
   span->second = std::min(span->second, kHighestTunedHz - kLowestTunedHz);
   const double half = span->second / 2;
@@ -86,8 +88,8 @@ const DisplaySweep& Receiver::receive(const Sweep& sweep) {
   display_.count = 0;
   if (sweep.levelsDb.empty()) return display_;
   const FrequencyRange whole = rangeOf(sweep);
-  double& centerHz = values_.try_emplace(kCenterHz, whole.centerHz).first->second;
-  double& spanHz = values_.try_emplace(kSpanHz, whole.spanHz).first->second;
+  double& centerHz = values_.try_emplace(kCenterFrequencyParameter, whole.centerHz).first->second;
+  double& spanHz = values_.try_emplace(kSpanParameter, whole.spanHz).first->second;
   if (tuned_) {
     fitRange();
     resample(sweep, {centerHz, spanHz}, display_);

@@ -23,12 +23,9 @@ struct ReceiverSetting {
 
 class Receiver {
  public:
-  // Two of the codes by which panels name settings.
-  static constexpr std::int16_t kCenterHz = 13;
-  static constexpr std::int16_t kSpanHz = 14;
-
-  // A panel's request. False, and nothing has changed, for a code that the receiver does not have and for a
-  // value that it cannot take, not-a-number among them; the panel is then answered with the value that holds.
+  // A panel's request, by its code. False, and nothing has changed, for a code that the receiver does not
+  // have and for a value that it cannot take, not-a-number among them; the panel is then answered with the
+  // value that holds.
   [[nodiscard]] bool request(std::int16_t code, double value);
   // What was requested since the last call, each code once, with the value that the receiver has now.
   [[nodiscard]] std::vector<ReceiverSetting> takeAnswers();

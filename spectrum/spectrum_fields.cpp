@@ -6,6 +6,7 @@
 #include "framework/support/enumerated_tables.h"
 #include "framework/support/error_handler.h"
 #include "framework/support/guard.h"
+#include "framework/support/host_codes.h"
 #include "spectrum/spectrum_controls.h"
 
 namespace frontpanels {
@@ -99,11 +100,11 @@ void SpectrumFields::setUpEntries() {
 void SpectrumFields::setUpLists() {
   averageType.ComboBox(&controls.list("AverageTypeCombo"));
   averageType.Label(&controls.label("AverageTypeLabel"));
-  averageType.parameterType(kAverageTypeEnumeration);
+  averageType.parameterType(kAverageTypeParameter);
   averageType.value(kAveragingOff);
   channelization.ComboBox(&controls.list("ChannelizationCombo"));
-  channelization.parameterType(kChannelizationEnumeration);
-  if (const auto known = enumeratedValues(kChannelizationEnumeration); !known.empty())
+  channelization.parameterType(kChannelizationParameter);
+  if (const auto known = enumeratedValues(kChannelizationParameter); !known.empty())
     channelization.value(known.front().value);
 }
 

@@ -5,11 +5,11 @@
 #include <cmath>
 #include <iterator>
 
-#include "framework/panel/host_codes.h"
 #include "framework/support/enumerated_tables.h"
 #include "framework/support/error_handler.h"
 #include "framework/support/flag_scope.h"
 #include "framework/support/guard.h"
+#include "framework/support/host_codes.h"
 #include "framework/support/numeric.h"
 #include "spectrum/spectrum_controls.h"
 
@@ -82,7 +82,7 @@ const SpectrumView::ParameterRow SpectrumView::kParameters[] = {
     {kSpanParameter, [](SpectrumView& panel, double value) { panel.spanFromHost(value); }},
     {kRbwParameter,
      [](SpectrumView& panel, double value) { panel.fields_.frequencyRbw.valueNoUpdate(value); }},
-    {kIfBandwidthParameter,
+    {FREQ_FILTER,
      [](SpectrumView& panel, double value) {
        panel.select(value == kNarrowbandFilter ? "NarrowbandOption" : "WidebandOption");
      }},
@@ -104,7 +104,7 @@ const SpectrumView::ParameterRow SpectrumView::kParameters[] = {
      [](SpectrumView& panel, double value) {
        panel.select(value == 0 ? "IntervalDistanceOption" : "IntervalTimeOption");
      }},
-    {kAverageAsLogPowerParameter,
+    {PARM_AVERAGE_AS_LOG_POWER,
      [](SpectrumView& panel, double value) { panel.select(value != 0 ? "LogPwrOption" : "LinPowerOption"); }},
 };
 
@@ -207,13 +207,13 @@ void SpectrumView::appendSettings(PanelSettings& settings) {
       {kCenterFrequencyParameter, fields_.frequency.center.value()},
       {kSpanParameter, fields_.frequency.span.value()},
       {kRbwParameter, fields_.frequencyRbw.value()},
-      {kIfBandwidthParameter, chosen("NarrowbandOption")},
+      {FREQ_FILTER, chosen("NarrowbandOption")},
       {kIntervalKindParameter, chosen("IntervalTimeOption")},
       {kDistanceIntervalParameter, distanceIntervalM_},
       {kDisplayLengthParameter, fields_.displayLength.value()},
       {kAverageTypeParameter, fields_.averageType.value()},
       {kAverageCountParameter, fields_.averageCount.value()},
-      {kAverageAsLogPowerParameter, chosen("LogPwrOption")},
+      {PARM_AVERAGE_AS_LOG_POWER, chosen("LogPwrOption")},
   };
   settings.insert(settings.end(), std::begin(own), std::end(own));
 }

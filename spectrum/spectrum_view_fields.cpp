@@ -1,11 +1,11 @@
 // SpectrumView towards its user: what each field does when its value has been changed.
 #include <iterator>
 
-#include "framework/panel/host_codes.h"
 #include "framework/support/enumerated_tables.h"
 #include "framework/support/error_handler.h"
 #include "framework/support/flag_scope.h"
 #include "framework/support/guard.h"
+#include "framework/support/host_codes.h"
 #include "spectrum/spectrum_view.h"
 
 namespace frontpanels {
@@ -36,10 +36,10 @@ const SpectrumView::OptionRow SpectrumView::kOptions[] = {
      &SpectrumView::applyInterval},
     {"IntervalDistanceOption", "IntervalDistanceOption_Click()", kIntervalKindParameter, 0,
      &SpectrumView::applyInterval},
-    {"LogPwrOption", "LogPwrOption_Click()", kAverageAsLogPowerParameter, 1, nullptr},
-    {"LinPowerOption", "LinPowerOption_Click()", kAverageAsLogPowerParameter, 0, nullptr},
-    {"WidebandOption", "WidebandOption_Click()", kIfBandwidthParameter, 0, nullptr},
-    {"NarrowbandOption", "NarrowbandOption_Click()", kIfBandwidthParameter, kNarrowbandFilter, nullptr},
+    {"LogPwrOption", "LogPwrOption_Click()", PARM_AVERAGE_AS_LOG_POWER, 1, nullptr},
+    {"LinPowerOption", "LinPowerOption_Click()", PARM_AVERAGE_AS_LOG_POWER, 0, nullptr},
+    {"WidebandOption", "WidebandOption_Click()", FREQ_FILTER, 0, nullptr},
+    {"NarrowbandOption", "NarrowbandOption_Click()", FREQ_FILTER, kNarrowbandFilter, nullptr},
 };
 
 void SpectrumView::bindFields() {

@@ -2,10 +2,10 @@
 #include <algorithm>
 #include <iterator>
 
-#include "framework/panel/host_codes.h"
 #include "framework/panel/report_html.h"
 #include "framework/support/error_handler.h"
 #include "framework/support/guard.h"
+#include "framework/support/host_codes.h"
 #include "spectrum/spectrum_view.h"
 
 namespace frontpanels {
@@ -30,12 +30,12 @@ struct ChoiceRow {
   const char* controls[2];
 };
 constexpr ChoiceRow kChoices[] = {
-    {kIfBandwidthParameter, {"NarrowbandOption", "WidebandOption"}},
+    {FREQ_FILTER, {"NarrowbandOption", "WidebandOption"}},
     {kChannelizationParameter, {"ChannelizationCombo", nullptr}},
     {kAverageTypeParameter, {"AverageTypeCombo", "AverageTypeLabel"}},
     {kUnitsParameter, {"FrequencyOption", "ChannelOption"}},
     {kIntervalKindParameter, {"IntervalTimeOption", "IntervalDistanceOption"}},
-    {kAverageAsLogPowerParameter, {"LogPwrOption", "LinPowerOption"}},
+    {PARM_AVERAGE_AS_LOG_POWER, {"LogPwrOption", "LinPowerOption"}},
 };
 
 constexpr const char* kLinkedByName[] = {"CenterFrequencyTextBox", "StartFrequencyTextBox",

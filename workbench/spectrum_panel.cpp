@@ -1,5 +1,6 @@
 #include "workbench/spectrum_panel.h"
 
+#include "framework/support/host_codes.h"
 #include "workbench/failure.h"
 
 namespace frontpanels::workbench {
@@ -9,18 +10,6 @@ constexpr std::int32_t kResourceId = 1;
 constexpr std::int32_t kMeasurementId = 1;
 constexpr double kPeriodSeconds = 0.2;
 constexpr const char* kSpectrumPath = "Brantor Scanner/Spectrum/Spectrum Trace";
-
-// Codes of the host interface.
-enum Parameter : std::int16_t {
-  kMeasurementPeriod = 43,
-  kDatabasePeriod = 44,
-  kDisplayPeriod = 45,
-  kMeasurement = 312,
-  kCaption = 314,
-  kResource = 315,
-  kAutoScale = 722,
-};
-enum Operation : std::int16_t { kClose = 1, kAddTrace = 10, kShow = 12 };
 
 void checkStatus(std::int32_t status, const char* meaning) {
   if (status == 0) return;
@@ -33,22 +22,22 @@ SpectrumPanel::SpectrumPanel(PanelPlace& place, PanelRequests& requests)
     : control_(kProgId, L"SpectrumView1", place, requests),
       panel_(control_.automation()),
       hub_(Automation::create("FrontPanels.DataHub")) {
-  set(kResource, "resource id", kResourceId);
-  set(kMeasurement, "measurement id", kMeasurementId);
-  set(kMeasurementPeriod, "measurement period", kPeriodSeconds);
-  set(kDatabasePeriod, "database period", kPeriodSeconds);
-  set(kDisplayPeriod, "display period", kPeriodSeconds);
-  set(kCaption, "caption", "Spectrum");
+  set(PARM_RESOURCE_ID, "resource id", kResourceId);
+  set(PARM_MEASUREMENT_ID, "measurement id", kMeasurementId);
+  set(TIME_MEASUREMENT_PERIOD, "measurement period", kPeriodSeconds);
+  set(TIME_DATABASE_PERIOD, "database period", kPeriodSeconds);
+  set(TIME_DISPLAY_PERIOD, "display period", kPeriodSeconds);
+  set(kCaptionParameter, "caption", "Spectrum");
   // The operation's parameter says which kind of trace; this panel has the one.
-  operate(kAddTrace, "trace", static_cast<std::int32_t>(kAddTrace));
-  set(kAutoScale, "auto scale", true);
-  operate(kShow, "order to show", std::int32_t{0});
+  operate(kAddTraceOperation, "trace", static_cast<std::int32_t>(kAddTraceOperation));
+  set(kAutoScaleParameter, "auto scale", true);
+  operate(kShowOperation, "order to show", std::int32_t{0});
 }
 
 // A panel that refuses to be closed goes all the same.
 SpectrumPanel::~SpectrumPanel() {
   try {
-    operate(kClose, "close", std::int32_t{0});
+    operate(QUILL_VFP_CLOSE, "close", std::int32_t{0});
   } catch (...) {
   }
 }
@@ -56,13 +45,13 @@ SpectrumPanel::~SpectrumPanel() {
 void SpectrumPanel::set(const ReceiverSetting& setting) {
   const std::string meaning = "setting " + std::to_string(setting.code);
   set(setting.code, meaning.c_str(), setting.value);
-  if (setting.code == Receiver::kCenterHz) told_.centerHz = setting.value;
-  if (setting.code == Receiver::kSpanHz) told_.spanHz = setting.value;
+  if (setting.code == kCenterFrequencyParameter) told_.centerHz = setting.value;
+  if (setting.code == kSpanParameter) told_.spanHz = setting.value;
 }
 
 void SpectrumPanel::show(const DisplaySweep& sweep) {
-  if (sweep.range.centerHz != told_.centerHz) set({Receiver::kCenterHz, sweep.range.centerHz});
-  if (sweep.range.spanHz != told_.spanHz) set({Receiver::kSpanHz, sweep.range.spanHz});
+  if (sweep.range.centerHz != told_.centerHz) set({kCenterFrequencyParameter, sweep.range.centerHz});
+  if (sweep.range.spanHz != told_.spanHz) set({kSpanParameter, sweep.range.spanHz});
   hub_.call("Publish", {kSpectrumPath, sweep.shown()});
 }
 

@@ -10,6 +10,7 @@
 #include <filesystem>
 #include <iterator>
 
+#include "framework/support/host_codes.h"
 #include "platform/win32/utf16.h"
 #include "workbench/console.h"
 #include "workbench/failure.h"
@@ -280,7 +281,7 @@ void Workbench::answerPanel() {
   bool retuned = false;
   for (const ReceiverSetting& answer : receiver_.takeAnswers()) {
     if (panel_) panel_->set(answer);
-    retuned = retuned || answer.code == Receiver::kCenterHz || answer.code == Receiver::kSpanHz;
+    retuned = retuned || answer.code == kCenterFrequencyParameter || answer.code == kSpanParameter;
   }
   if (!retuned) return;
   showSweep();

@@ -2,9 +2,9 @@
 #include <algorithm>
 
 #include "framework/panel/base_vfp.h"
-#include "framework/panel/host_codes.h"
 #include "framework/support/error_handler.h"
 #include "framework/support/guard.h"
+#include "framework/support/host_codes.h"
 
 namespace frontpanels {
 namespace {

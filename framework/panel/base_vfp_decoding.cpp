@@ -1,9 +1,9 @@
 // Result buffers: the loop of clsBaseVFP that hands each record to the panel.
 #include "framework/panel/base_vfp.h"
-#include "framework/panel/host_codes.h"
 #include "framework/support/enumerated_tables.h"
 #include "framework/support/error_handler.h"
 #include "framework/support/guard.h"
+#include "framework/support/host_codes.h"
 #include "platform/result_reader.h"
 
 namespace frontpanels {

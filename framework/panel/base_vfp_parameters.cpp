@@ -3,9 +3,9 @@
 #include <iterator>
 
 #include "framework/panel/base_vfp.h"
-#include "framework/panel/host_codes.h"
 #include "framework/support/error_handler.h"
 #include "framework/support/guard.h"
+#include "framework/support/host_codes.h"
 #include "framework/support/numeric.h"
 #include "framework/support/utility.h"
 

@@ -2,6 +2,8 @@
 
 #include <algorithm>
 
+#include "framework/support/host_codes.h"
+
 namespace frontpanels {
 namespace {
 
@@ -27,41 +29,41 @@ constexpr Row kRows[] = {
     {kResultTypeEnumeration, 200, "User List"},
     {kResultTypeEnumeration, 201, "Top N"},
 
-    {kChannelizationEnumeration, 0, "Cellular"},
-    {kChannelizationEnumeration, 1, "PCS"},
-    {kChannelizationEnumeration, 2, "GSM 900"},
-    {kChannelizationEnumeration, 3, "DCS 1800"},
-    {kChannelizationEnumeration, 4, "IMT-2000"},
+    {kChannelizationParameter, 0, "Cellular"},
+    {kChannelizationParameter, 1, "PCS"},
+    {kChannelizationParameter, 2, "GSM 900"},
+    {kChannelizationParameter, 3, "DCS 1800"},
+    {kChannelizationParameter, 4, "IMT-2000"},
 
-    {kAverageTypeEnumeration, kAveragingOff, "Off"},
-    {kAverageTypeEnumeration, 0, "Linear"},
-    {kAverageTypeEnumeration, 1, "Exponential"},
-    {kAverageTypeEnumeration, 2, "Max Hold"},
-    {kAverageTypeEnumeration, 3, "Min Hold"},
+    {kAverageTypeParameter, kAveragingOff, "Off"},
+    {kAverageTypeParameter, 0, "Linear"},
+    {kAverageTypeParameter, 1, "Exponential"},
+    {kAverageTypeParameter, 2, "Max Hold"},
+    {kAverageTypeParameter, 3, "Min Hold"},
 
-    {kPowerDisplayEnumeration, 0, "Ec/Io"},
-    {kPowerDisplayEnumeration, 1, "Ec"},
+    {kPowerDisplayParameter, 0, "Ec/Io"},
+    {kPowerDisplayParameter, 1, "Ec"},
 
-    {kSortModeEnumeration, 0, "None"},
-    {kSortModeEnumeration, 1, "Y"},
-    {kSortModeEnumeration, 2, "X"},
-    {kSortModeEnumeration, 3, "History"},
-    {kSortModeEnumeration, 4, "Show Value"},
+    {kSortModeParameter, 0, "None"},
+    {kSortModeParameter, 1, "Y"},
+    {kSortModeParameter, 2, "X"},
+    {kSortModeParameter, 3, "History"},
+    {kSortModeParameter, 4, "Show Value"},
 
-    {kSortOrderEnumeration, 1, "Ascending"},
-    {kSortOrderEnumeration, 2, "Descending"},
+    {kSortOrderParameter, 1, "Ascending"},
+    {kSortOrderParameter, 2, "Descending"},
 
-    {kBarLabelEnumeration, 0, "None"},
-    {kBarLabelEnumeration, 2, "Delay (chips)"},
-    {kBarLabelEnumeration, 3, "Ec (dBm)"},
-    {kBarLabelEnumeration, 4, "Ec/Io (dB)"},
-    {kBarLabelEnumeration, 5, "Ag. Ec (dBm)"},
-    {kBarLabelEnumeration, 6, "Ag. Ec/Io (dB)"},
-    {kBarLabelEnumeration, 7, "Delay Spread (chips)"},
-    {kBarLabelEnumeration, 8, "Ag - Peak (dB)"},
+    {kBarLabelParameter, 0, "None"},
+    {kBarLabelParameter, 2, "Delay (chips)"},
+    {kBarLabelParameter, 3, "Ec (dBm)"},
+    {kBarLabelParameter, 4, "Ec/Io (dB)"},
+    {kBarLabelParameter, 5, "Ag. Ec (dBm)"},
+    {kBarLabelParameter, 6, "Ag. Ec/Io (dB)"},
+    {kBarLabelParameter, 7, "Delay Spread (chips)"},
+    {kBarLabelParameter, 8, "Ag - Peak (dB)"},
 
-    {kBarChartStyleEnumeration, 0, "Vertical"},
-    {kBarChartStyleEnumeration, 1, "Horizontal"},
+    {kBarChartStyleParameter, 0, "Vertical"},
+    {kBarChartStyleParameter, 1, "Horizontal"},
 
     {PARM_AVERAGE_AS_LOG_POWER, 1, "Log Power"},
     {PARM_AVERAGE_AS_LOG_POWER, 0, "Power"},

@@ -10,19 +10,10 @@
 
 namespace frontpanels {
 
-// Parameter types that are enumerated, by the host's number. The code formats have one of their own: hosts
-// send them under 500, which as a type means the averaging.
-inline constexpr std::int32_t FREQ_FILTER = 17;
+// A type is the code of its parameter (host_codes.h), except for these two: code formats are sent under 500,
+// which as a type means the averaging, and result types under no code at all.
 inline constexpr std::int32_t kCodeFormatEnumeration = 231;
 inline constexpr std::int32_t kResultTypeEnumeration = 310;
-inline constexpr std::int32_t kChannelizationEnumeration = 333;
-inline constexpr std::int32_t kAverageTypeEnumeration = 500;
-inline constexpr std::int32_t kPowerDisplayEnumeration = 728;
-inline constexpr std::int32_t kSortModeEnumeration = 729;
-inline constexpr std::int32_t kSortOrderEnumeration = 730;
-inline constexpr std::int32_t kBarLabelEnumeration = 731;
-inline constexpr std::int32_t kBarChartStyleEnumeration = 775;
-inline constexpr std::int32_t PARM_AVERAGE_AS_LOG_POWER = 3900;
 
 // Values with a meaning of their own.
 inline constexpr std::int16_t kAveragingOff = 32;

@@ -2,6 +2,7 @@
 #include <cmath>
 
 #include "framework/support/enumerated_tables.h"
+#include "framework/support/host_codes.h"
 #include "tests/spectrum/spectrum_fixture.h"
 #include "tests/support/listed_records.h"
 

@@ -33,7 +33,7 @@ inline constexpr std::int16_t kBottomPanelItem = 901;
 inline constexpr std::int16_t kCenterFrequencyParameter = 13;
 inline constexpr std::int16_t kSpanParameter = 14;
 inline constexpr std::int16_t kRbwParameter = 16;
-inline constexpr std::int16_t kIfBandwidthParameter = 17;  // 1 narrow
+inline constexpr std::int16_t FREQ_FILTER = 17;  // the IF bandwidth, 1 narrow
 inline constexpr std::int16_t TIME_MEASUREMENT_PERIOD = 43;
 inline constexpr std::int16_t TIME_DATABASE_PERIOD = 44;
 inline constexpr std::int16_t TIME_DISPLAY_PERIOD = 45;
@@ -72,7 +72,24 @@ inline constexpr std::int16_t kCellNamingParameter = 799;
 inline constexpr std::int16_t kDistanceIntervalParameter = 803;
 inline constexpr std::int16_t kIntervalKindParameter = 804;  // 0 distance, else time
 inline constexpr std::int16_t kSavedParameter = 810;
-inline constexpr std::int16_t kAverageAsLogPowerParameter = 3900;  // 0 power, else log power
+inline constexpr std::int16_t PARM_AVERAGE_AS_LOG_POWER = 3900;  // 0 power, else log power
+
+// Those of the pilot panel: some numbers mean one thing there and another on the spectrum panel.
+inline constexpr std::int16_t CDMA_CODE_OFFSET = 230;
+inline constexpr std::int16_t kCodeFormatParameter = 500;
+inline constexpr std::int16_t kCodeCenterParameter = 502;
+inline constexpr std::int16_t kPowerDisplayParameter = 728;
+inline constexpr std::int16_t kSortModeParameter = 729;
+inline constexpr std::int16_t kSortOrderParameter = 730;
+inline constexpr std::int16_t kBarLabelParameter = 731;
+inline constexpr std::int16_t kThresholdParameter = 732;
+inline constexpr std::int16_t kTopNSetParameter = 750;
+inline constexpr std::int16_t kUserListSetParameter = 751;
+inline constexpr std::int16_t kBarChartStyleParameter = 775;
+inline constexpr std::int16_t kShowCellNameParameter = 776;
+inline constexpr std::int16_t kPnIncrementParameter = 780;
+inline constexpr std::int16_t kCodeStartParameter = 803;
+inline constexpr std::int16_t kCodeSpanParameter = 804;
 
 // Answers of the entry points.
 inline constexpr std::int32_t kStatusDone = 0;
