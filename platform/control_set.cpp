@@ -110,10 +110,15 @@ void ControlSet::groupOptions() {
     }
 }
 
-Control& ControlSet::control(std::string_view name) const {
+Control* ControlSet::find(std::string_view name) const {
   const auto found = byName_.find(keyOf(name));
-  if (found == byName_.end()) raiseInvalidProcedureCall();
-  return *found->second;
+  return found == byName_.end() ? nullptr : found->second;
+}
+
+Control& ControlSet::control(std::string_view name) const {
+  Control* const found = find(name);
+  if (found == nullptr) raiseInvalidProcedureCall();
+  return *found;
 }
 
 // --- Focus

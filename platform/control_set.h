@@ -40,6 +40,8 @@ class ControlSet final : private ControlScope {
   // By name, in any letter case. Raises "Invalid procedure call or argument" for a name that no row has and
   // "Type mismatch" for a control of another kind.
   [[nodiscard]] Control& control(std::string_view name) const;
+  // Null for a name that no row has.
+  [[nodiscard]] Control* find(std::string_view name) const;
   [[nodiscard]] TextBox& textBox(std::string_view name) const { return typed<TextBox>(name); }
   [[nodiscard]] SpinButton& spinButton(std::string_view name) const { return typed<SpinButton>(name); }
   [[nodiscard]] ItemList& list(std::string_view name) const { return typed<ItemList>(name); }

@@ -47,6 +47,7 @@ TEST(ControlSetTest, WhatIsLeftMaySendTheFocusElsewhere) {
 TEST(ControlSetTest, ReadsTheTableAndRefusesAFaultyOne) {
   const ControlSet set(testing::kSampleRows);
   EXPECT_EQ(&set.spinButton("CENTERSPIN"), &set.control("CenterSpin"));
+  EXPECT_EQ(set.find("Stopp"), nullptr);
   EXPECT_EQ(set.spinButton("CenterSpin").buddy(), &set.textBox("Center"));
   EXPECT_EQ(set.label("CenterLabel").parent(), &set.frame("FrequencyFrame"));
   const ControlRow twice[] = {{"A", Kind::Label, "", "", {}}, {"a", Kind::Label, "", "", {}}};
