@@ -16,8 +16,7 @@
 #include "activex/picture_file.h"
 #include "activex/variants.h"
 #include "activex/view_part.h"
-#include "framework/panel/base_vfp.h"
-#include "framework/panel/hosted_panel.h"
+#include "framework/panel/field_panel.h"
 #include "framework/support/guard.h"
 #include "framework/support/host_codes.h"
 #include "framework/support/numeric.h"
@@ -409,8 +408,8 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
 
  protected:
   // The panel behind the control.
-  [[nodiscard]] virtual HostedPanel& panel() = 0;
-  [[nodiscard]] virtual clsBaseVFP& base() = 0;
+  [[nodiscard]] virtual FieldPanel& panel() = 0;
+  [[nodiscard]] clsBaseVFP& base() { return panel().base(); }
   [[nodiscard]] PanelHost& requests() noexcept { return requests_; }
 
   // A call that hands a value out, through a pointer that a caller may have left null. The host may let go of
@@ -454,9 +453,7 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
   }
 
   IDispatch* constituent(std::string_view name) {
-    ControlSet* const controls = panel().controls();
-    if (controls == nullptr) raiseInvalidProcedureCall();
-    return new ConstituentObject(this->outer(), controls->control(name));
+    return new ConstituentObject(this->outer(), panel().controls()->control(name));
   }
 
   HRESULT change(AreaProperty property, VARIANT_BOOL value) {

@@ -34,8 +34,7 @@ class SpectrumControl final : public FrontPanelControl<ISpectrumView> {
 
  private:
   [[nodiscard]] void* findInterface(REFIID id) noexcept override;
-  [[nodiscard]] HostedPanel& panel() override { return *panel_; }
-  [[nodiscard]] clsBaseVFP& base() override { return panel_->base(); }
+  [[nodiscard]] FieldPanel& panel() override { return *panel_; }
 
   std::optional<SpectrumView> panel_;
 };

@@ -12,11 +12,6 @@
 
 namespace frontpanels {
 
-inline constexpr float kDisplayPanelWidthTwips = 2730;
-inline constexpr float kMeasurementPanelHeightTwips = 1530;
-// How wide a collapse button is, across the edge that it lies along.
-inline constexpr float kCollapseButtonTwips = 90;
-
 // Texts in angle brackets are shown with them.
 [[nodiscard]] std::span<const ControlRow> spectrumControls() noexcept;
 

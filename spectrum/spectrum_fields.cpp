@@ -7,7 +7,6 @@
 #include "framework/support/error_handler.h"
 #include "framework/support/guard.h"
 #include "framework/support/host_codes.h"
-#include "spectrum/spectrum_controls.h"
 
 namespace frontpanels {
 namespace {
@@ -76,7 +75,7 @@ constexpr std::string_view kNoLabel = "SweepRate";  // its options say what it i
 
 std::span<const SpectrumFields::EntryField> SpectrumFields::entryFields() noexcept { return kFields; }
 
-SpectrumFields::SpectrumFields() : controls(spectrumControls()) {
+SpectrumFields::SpectrumFields(ControlSet& controlsOfPanel) : controls(controlsOfPanel) {
   setUpEntries();
   setUpLists();
   for (const char* const option : kChosenAtFirst) controls.optionButton(option).Value(true);

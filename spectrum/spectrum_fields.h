@@ -1,5 +1,5 @@
-// All fields of SpectrumView: the controls of the designer table and the entries and lists that give them
-// their meaning, with the limits and values that hold until a host sends its own.
+// What the fields of SpectrumView hold: the entries and lists behind the controls of the designer table, with
+// the limits and values that hold until a host sends its own.
 #pragma once
 
 #include <array>
@@ -22,11 +22,11 @@ enum class MeasurementInterval : std::uint8_t { Time, Distance };
 
 class SpectrumFields {
  public:
-  // Builds everything. Reports host tables of the IF filter and of the averaging mode that have not the
-  // records that the panel's options stand for.
-  SpectrumFields();
+  // Gives the controls of the designer table their meaning; they must outlive the fields. Reports host tables
+  // of the IF filter and of the averaging mode that have not the records that the panel's options stand for.
+  explicit SpectrumFields(ControlSet& controls);
 
-  ControlSet controls;
+  ControlSet& controls;
   FrequencyEntries frequency;
   clsNumericEntry frequencyRbw;    // Hz
   clsNumericEntry averageCount;    // sweeps

@@ -6,7 +6,6 @@
 #include <iterator>
 
 #include "framework/support/enumerated_tables.h"
-#include "framework/support/error_handler.h"
 #include "framework/support/flag_scope.h"
 #include "framework/support/guard.h"
 #include "framework/support/host_codes.h"
@@ -16,12 +15,11 @@
 namespace frontpanels {
 
 SpectrumView::SpectrumView(const PanelEnvironment& environment, PanelHost& host, PanelContainer& container)
-    : HostedPanel(environment, host, container),
-      displayPanel_(fields_.controls, fields_.controls.picture("displayPanel")),
-      controlPanel_(fields_.controls, fields_.controls.picture("controlPanel")),
-      base_(environment, *this),
+    : FieldPanel(environment, host, container, kTypeName, spectrumControls()),
+      fields_(*controls()),
+      markers_(base().traceManager(), *controls(), kTypeName),
       DFISpectrum_(environment.hub, [this](std::int32_t index) { DFISpectrum_DataChanged(index); }) {
-  base_.SupportsMarkerToCenter = true;
+  base().SupportsMarkerToCenter = true;
   bindFields();
   updateMarkerButtons();
   fields_.averageCount.Enabled(fields_.averageType.value() != kAveragingOff);
@@ -32,36 +30,31 @@ SpectrumView::SpectrumView(const PanelEnvironment& environment, PanelHost& host,
 
 std::int32_t SpectrumView::vfpOp(std::int32_t hardwareId, std::int16_t operation, const Variant& parameter,
                                  clsBaseVFP* /*base*/) {
-  if (base_.closing()) return kStatusDone;
+  if (base().closing()) return kStatusDone;
   return guarded("SpectrumView::vfpOp() ... ", kStatusUnusableParameter, [&] {
     switch (operation) {
       case QUILL_VFP_SAVE:
-        base_.saveBase();
+        base().saveBase();
         refreshTraces();
         return kStatusDone;
       case kAddTraceOperation:
         return addTrace(parameter);
       case QUILL_VFP_SAVE_SETUP:
         if (!parameter.isNumeric()) break;  // the base says what is wrong with it
-        base_.saveSetup(parameter.toInt32());
+        base().saveSetup(parameter.toInt32());
         return kStatusDone;
       default:
         break;
     }
-    const std::int32_t status = base_.vfpOp(hardwareId, operation, parameter);
+    const std::int32_t status = base().vfpOp(hardwareId, operation, parameter);
     if (operation == QUILL_VFP_CLOSE) sharedPanelState().dirty = true;
     return status;
   });
 }
 
-std::int32_t SpectrumView::playbackOp(std::int32_t /*hardwareId*/, std::int16_t /*operation*/,
-                                      const Variant& /*parameter*/, clsBaseVFP* /*base*/) {
-  return kStatusUnknownOperation;
-}
-
 std::int32_t SpectrumView::addTrace(const Variant& parameter) {
   if (!parameter.isNumeric() || parameter.toDouble() != kAddTraceOperation) return kStatusUnusableParameter;
-  base_.traceManager().addTraceObject(std::make_shared<clsMultiTracePainter>(gdi()), kSpectrumResultType);
+  base().traceManager().addTraceObject(std::make_shared<clsMultiTracePainter>(gdi()), kSpectrumResultType);
   return kStatusDone;
 }
 
@@ -110,12 +103,12 @@ const SpectrumView::ParameterRow SpectrumView::kParameters[] = {
 
 std::int32_t SpectrumView::vfpSet(std::int32_t hardwareId, std::int16_t parameterType, std::int16_t index,
                                   const Variant& value, clsBaseVFP* /*base*/) {
-  if (base_.closing()) return kStatusDone;
+  if (base().closing()) return kStatusDone;
   return guarded("SpectrumView::vfpSet() ... ", kStatusUnusableParameter, [&] {
     const auto* const row = std::find_if(
         std::begin(kParameters), std::end(kParameters),
         [parameterType](const ParameterRow& candidate) { return candidate.code == parameterType; });
-    if (row == std::end(kParameters)) return base_.vfpSet(hardwareId, parameterType, index, value);
+    if (row == std::end(kParameters)) return base().vfpSet(hardwareId, parameterType, index, value);
     if (row->apply == nullptr || !value.isNumeric()) return kStatusDone;
     if (const double number = value.toDouble(); std::isfinite(number)) row->apply(*this, number);
     return kStatusDone;
@@ -137,7 +130,7 @@ void SpectrumView::spanFromHost(double spanHz) {
 }
 
 void SpectrumView::timeIntervalFromHost(double period) {
-  base_.measurementPeriod = period;
+  base().measurementPeriod = period;
   if (fields_.interval() == MeasurementInterval::Time) fields_.sweepRate.valueNoUpdate(period);
 }
 
@@ -153,29 +146,21 @@ void SpectrumView::displayLengthFromHost(double points) {
 }
 
 void SpectrumView::averageTypeFromHost(double type) {
-  const FlagScope inProgress(optionChangeInProgress_);
+  const FlagScope inProgress = changeOption();
   fields_.averageType.value(toInt16(type));
   fields_.averageCount.Enabled(fields_.averageType.value() != kAveragingOff);
 }
 
-// The click that a choice raises must not go back to whoever made it.
-void SpectrumView::select(std::string_view option) {
-  OptionButton& button = fields_.controls.optionButton(option);
-  if (button.Value()) return;
-  const FlagScope inProgress(optionChangeInProgress_);
-  button.Value(true);
-}
-
 void SpectrumView::showBand() { select(fields_.frequency.downlink() ? "DownlinkOption" : "UplinkOption"); }
 
-double SpectrumView::intervalValue() const {
-  return fields_.interval() == MeasurementInterval::Time ? base_.measurementPeriod : distanceIntervalM_;
+double SpectrumView::intervalValue() {
+  return fields_.interval() == MeasurementInterval::Time ? base().measurementPeriod : distanceIntervalM_;
 }
 
 // --- Limits
 
 std::int32_t SpectrumView::Limits(std::int16_t parameterType, const HostRecordSet& records) {
-  if (base_.closing()) return kStatusDone;
+  if (base().closing()) return kStatusDone;
   const auto taken = [&] {
     switch (parameterType) {
       case kCenterFrequencyParameter:
@@ -218,23 +203,10 @@ void SpectrumView::appendSettings(PanelSettings& settings) {
   settings.insert(settings.end(), std::begin(own), std::end(own));
 }
 
-// --- Window
-
-// The collapse buttons lie along the areas' inner edges, and at the view's edge where an area is hidden.
-void SpectrumView::Form_Resize() {
-  base_.Resize();
-  guard("SpectrumView::Form_Resize()", [this] {
-    const float right = InvisibleWidthMarkX1() - kCollapseButtonTwips;
-    const float bottom = InvisibleHeightMarkY1() - kCollapseButtonTwips;
-    ControlSet& controls = fields_.controls;
-    controls.control("MarkerFrameInvisibleButton").Move({right, 0, kCollapseButtonTwips, bottom});
-    controls.control("MeasurementFrameInvisibleButton")
-        .Move({0, bottom, InvisibleWidthMarkX1(), kCollapseButtonTwips});
-  });
-}
+// --- Graph
 
 void SpectrumView::refreshControls() {
-  if (base_.closing()) return;
+  if (base().closing()) return;
   guard("SpectrumView::refreshControls()...", [this] {
     showVerticalAxis();
     updateMarkerButtons();

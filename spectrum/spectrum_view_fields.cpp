@@ -14,8 +14,6 @@ namespace {
 constexpr std::int32_t kDownlinkRange = 0;
 constexpr std::int32_t kUplinkRange = 1;
 
-std::string named(std::string_view routine) { return std::string("SpectrumView::").append(routine); }
-
 }  // namespace
 
 // --- Fields to handlers
@@ -47,21 +45,11 @@ void SpectrumView::bindFields() {
   bindButtons();
   ControlSet& controls = fields_.controls;
   for (const OptionRow& row : kOptions)
-    controls.optionButton(row.name).Click = [this, &row] {
-      if (!base_.closing()) optionClick(row);
-    };
-  controls.optionButton("DownlinkOption").Click = [this] {
-    if (!base_.closing()) bandClick("DownlinkOption_Click()", kDownlinkRange);
-  };
-  controls.optionButton("UplinkOption").Click = [this] {
-    if (!base_.closing()) bandClick("UplinkOption_Click()", kUplinkRange);
-  };
-}
-
-std::function<void()> SpectrumView::whileOpen(Handler handler) {
-  return [this, handler] {
-    if (!base_.closing()) (this->*handler)();
-  };
+    controls.optionButton(row.name).Click = whileOpen([this, &row] { optionClick(row); });
+  controls.optionButton("DownlinkOption").Click =
+      whileOpen([this] { bandClick("DownlinkOption_Click()", kDownlinkRange); });
+  controls.optionButton("UplinkOption").Click =
+      whileOpen([this] { bandClick("UplinkOption_Click()", kUplinkRange); });
 }
 
 // In the order of SpectrumFields::entryFields.
@@ -74,9 +62,9 @@ void SpectrumView::bindEntries() {
   };
   const Handler* handler = std::begin(kHandlers);
   for (const SpectrumFields::EntryField& field : SpectrumFields::entryFields())
-    fields_.bind(field, whileOpen(*handler++));
-  fields_.controls.list("AverageTypeCombo").Click = whileOpen(&SpectrumView::newAverageType);
-  fields_.controls.list("ChannelizationCombo").Click = whileOpen(&SpectrumView::newChannelization);
+    fields_.bind(field, calling(*handler++));
+  fields_.controls.list("AverageTypeCombo").Click = calling(&SpectrumView::newAverageType);
+  fields_.controls.list("ChannelizationCombo").Click = calling(&SpectrumView::newChannelization);
 }
 
 void SpectrumView::bindButtons() {
@@ -89,36 +77,17 @@ void SpectrumView::bindButtons() {
       {"SingleSweepButton", &SpectrumView::SingleSweepButton_Click},
       {"ContinuousSweepButton", &SpectrumView::ContinuousSweepButton_Click},
       {"StopSweepButton", &SpectrumView::StopSweepButton_Click},
-      {"MeasurementFrameInvisibleButton", &SpectrumView::toggleMeasurementArea},
       {"AutoScaleBox", &SpectrumView::AutoScaleBox_Click},
       {"MarkerAddButton", &SpectrumView::addMarker},
       {"MarkerDeleteButton", &SpectrumView::deleteMarker},
       {"MarkerToMaxButton", &SpectrumView::markerToMax},
       {"MarkerDeltaButton", &SpectrumView::addDeltaMarker},
       {"MarkerToCenterButton", &SpectrumView::markerToCenter},
-      {"MarkerFrameInvisibleButton", &SpectrumView::toggleDisplayArea},
   };
-  for (const ButtonRow& row : kButtons) fields_.controls.control(row.name).Click = whileOpen(row.click);
+  for (const ButtonRow& row : kButtons) fields_.controls.control(row.name).Click = calling(row.click);
 }
 
 // --- Requests
-
-bool SpectrumView::accepted(std::string_view routine, std::int32_t status) {
-  if (status == kStatusDone) return true;
-  errorHandler().ReportError(named(routine) + " status = " + std::to_string(status));
-  return false;
-}
-
-bool SpectrumView::request(std::string_view routine, std::int16_t parameterType, double value) {
-  return accepted(routine,
-                  frontPanelSet(base_.resourceId(), base_.virtualFrontPanelId, parameterType, 0, value));
-}
-
-void SpectrumView::operate(std::string_view routine, std::int16_t operation) {
-  guard(
-      [routine] { return named(routine); },
-      [&] { accepted(routine, frontPanelOp(base_.resourceId(), base_.virtualFrontPanelId, operation, {})); });
-}
 
 void SpectrumView::SingleSweepButton_Click() { operate("SingleSweepButton_Click()", kSingleSweepOperation); }
 void SpectrumView::StopSweepButton_Click() { operate("StopSweepButton_Click()", kStopSweepOperation); }
@@ -176,9 +145,9 @@ void SpectrumView::newStartStopFrequency(bool startChanged) {
 }
 
 void SpectrumView::bandClick(std::string_view routine, std::int32_t range) {
-  if (optionChangeInProgress_) return;
+  if (optionChangeInProgress()) return;
   const FlagScope inProgress(updateInProgress_);
-  guard([routine] { return named(routine); },
+  guard([&] { return named(routine); },
         [&] {
           fields_.frequency.setBand(range);
           updateXAxisLabels();
@@ -208,7 +177,7 @@ void SpectrumView::newSweepRate() {
   guard("SpectrumView::newSweepRate()", [this] {
     const double value = fields_.sweepRate.value();
     if (fields_.interval() == MeasurementInterval::Time) {
-      base_.measurementPeriod = value;
+      base().measurementPeriod = value;
       request("newSweepRate()", TIME_MEASUREMENT_PERIOD, value);
     } else {
       distanceIntervalM_ = value;
@@ -219,7 +188,7 @@ void SpectrumView::newSweepRate() {
 
 void SpectrumView::newAverageType() {
   fields_.averageType.Click();
-  if (optionChangeInProgress_ || !fields_.averageType.newValue()) return;
+  if (optionChangeInProgress() || !fields_.averageType.newValue()) return;
   guard("SpectrumView::newAverageType()", [this] {
     fields_.averageCount.Enabled(fields_.averageType.value() != kAveragingOff);
     request("newAverageType()", kAverageTypeParameter, fields_.averageType.value());
@@ -228,7 +197,7 @@ void SpectrumView::newAverageType() {
 
 void SpectrumView::newChannelization() {
   fields_.channelization.Click();
-  if (optionChangeInProgress_ || !fields_.channelization.newValue()) return;
+  if (optionChangeInProgress() || !fields_.channelization.newValue()) return;
   ChannelizationCombo_Change();
   guard("SpectrumView::ChannelizationCombo_Change()", [this] {
     request("ChannelizationCombo_Change()", kChannelizationParameter, fields_.channelization.value());
@@ -238,10 +207,10 @@ void SpectrumView::newChannelization() {
 // --- Options
 
 void SpectrumView::optionClick(const OptionRow& row) {
-  guard([&row] { return named(row.routine); },
+  guard([&] { return named(row.routine); },
         [&] {
           if (row.apply != nullptr) (this->*row.apply)();
-          if (!optionChangeInProgress_) request(row.routine, row.parameterType, row.value);
+          if (!optionChangeInProgress()) request(row.routine, row.parameterType, row.value);
         });
 }
 
@@ -254,7 +223,7 @@ void SpectrumView::applyUnits() {
 void SpectrumView::applyInterval() { fields_.showInterval(fields_.interval(), intervalValue()); }
 
 void SpectrumView::ChannelizationCombo_Change() {
-  if (base_.closing()) return;
+  if (base().closing()) return;
   guard("SpectrumView::ChannelizationCombo_Change()", [this] {
     if (!fields_.controls.optionButton("ChannelOption").Value()) return;
     if (!fields_.frequency.showChannels(fields_.channels, fields_.channelization.value()))
@@ -284,7 +253,7 @@ void SpectrumView::newVerticalOffset() {
 }
 
 void SpectrumView::AutoScaleBox_Click() {
-  if (optionChangeInProgress_) return;
+  if (optionChangeInProgress()) return;
   guard("SpectrumView::AutoScaleBox_Click()", [this] {
     clsMultiTracePainter* const painter = activePainter();
     if (painter == nullptr) return;

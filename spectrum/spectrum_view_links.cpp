@@ -1,20 +1,10 @@
 // SpectrumView as one of many: links, context menu, report.
-#include <algorithm>
-#include <iterator>
-
 #include "framework/panel/report_html.h"
-#include "framework/support/error_handler.h"
-#include "framework/support/guard.h"
 #include "framework/support/host_codes.h"
 #include "spectrum/spectrum_view.h"
 
 namespace frontpanels {
 namespace {
-
-// What a host can link to on a panel.
-enum class LinkType : std::int16_t { Result = 1, Action = 2, Parameter = 3 };
-
-void report(std::string_view what) { errorHandler().Assert(std::string("SpectrumView").append(what)); }
 
 struct ActionRow {
   std::int16_t operation;
@@ -40,19 +30,6 @@ constexpr ChoiceRow kChoices[] = {
 
 constexpr const char* kLinkedByName[] = {"CenterFrequencyTextBox", "StartFrequencyTextBox",
                                          "SingleSweepButton", "StopSweepButton", "ContinuousSweepButton"};
-
-std::string upperCased(std::string_view name) {
-  std::string upper(name);
-  for (char& c : upper)
-    if (c >= 'a' && c <= 'z') c = static_cast<char>(c - 'a' + 'A');
-  return upper;
-}
-
-void show(Control& control, const FrontPanelLink& link) {
-  control.Bold(link.bold);
-  control.Italic(link.italic);
-  control.Enabled(link.enable);
-}
 
 }  // namespace
 
@@ -83,26 +60,10 @@ clsNumericEntry* SpectrumView::linkedEntry(std::int32_t parameterType) {
   }
 }
 
-void SpectrumView::frontPanelLink(const FrontPanelLink& link) {
-  switch (static_cast<LinkType>(link.linkType)) {
-    case LinkType::Result:
-      return report("::frontPanelLink() ... unhandled result");
-    case LinkType::Action:
-      if (link.genericId == QUILL_VFP_CLOSE)
-        return errorHandler().Assert("I don't know how to invoke close yet!");
-      if (!linkAction(link)) report("::frontPanelLink() ... unhandled action");
-      return;
-    case LinkType::Parameter:
-      if (!linkParameter(link)) report("::frontPanelLink() ... unhandled parameter");
-      return;
-  }
-  report("::frontPanelLink()...unrecognized link type");
-}
-
 bool SpectrumView::linkAction(const FrontPanelLink& link) {
   for (const ActionRow& row : kActions) {
     if (row.operation != link.genericId) continue;
-    show(fields_.controls.control(row.button), link);
+    showLink(fields_.controls.control(row.button), link);
     return true;
   }
   return false;
@@ -118,100 +79,42 @@ bool SpectrumView::linkParameter(const FrontPanelLink& link) {
   for (const ChoiceRow& row : kChoices) {
     if (row.parameterType != link.genericId) continue;
     for (const char* const name : row.controls)
-      if (name != nullptr) show(fields_.controls.control(name), link);
+      if (name != nullptr) showLink(fields_.controls.control(name), link);
     return true;
   }
   return false;
 }
 
-Variant SpectrumView::initializeLinkValue(std::int16_t linkType, std::int32_t genericId) {
-  if (static_cast<LinkType>(linkType) != LinkType::Parameter) {
-    report("::initializeLinkValue()...unsupported link type");
-    return {};
-  }
-  if (const clsNumericEntry* const entry = linkedEntry(genericId)) return entry->value();
-  PanelSettings own{{TIME_MEASUREMENT_PERIOD, base_.measurementPeriod}};
-  appendSettings(own);
-  const auto found = std::find_if(own.begin(), own.end(), [genericId](const PanelSetting& setting) {
-    return setting.parameterType == genericId;
-  });
-  if (found != own.end()) return found->value;
-  report("::initializeLinkValue() ... unhandled parameter");
-  return {};
+std::optional<double> SpectrumView::linkedValue(std::int32_t parameterType) {
+  const clsNumericEntry* const entry = linkedEntry(parameterType);
+  return entry == nullptr ? std::nullopt : std::optional<double>(entry->value());
 }
 
-std::string SpectrumView::activeControlLink() {
-  const Control* const focused = fields_.controls.focused();
-  if (focused == nullptr) return {};
-  const bool linked = std::find(std::begin(kLinkedByName), std::end(kLinkedByName), focused->name()) !=
-                      std::end(kLinkedByName);
-  return linked ? upperCased(focused->name()) : std::string();
-}
+std::span<const char* const> SpectrumView::linkedByName() const { return kLinkedByName; }
 
 std::int32_t SpectrumView::measurementInfo(Variant& measurementTypes) {
   measurementTypes = Variant::Int32s{kSpectrumResultType};
   return kStatusDone;
 }
 
-// While logging the panel stays open, in playback it cannot be closed.
 bool SpectrumView::actionEnabled(std::int16_t action) {
-  if (action == QUILL_VFP_CLOSE) return !base_.recordMode && !base_.playback;
   for (const ActionRow& row : kActions)
     if (row.operation == action) return fields_.controls.control(row.button).reallyEnabled();
-  return action == QUILL_VFP_SAVE;
+  return FieldPanel::actionEnabled(action);
 }
 
 // --- The context menu, "Spectrum VFP Menu"
 
-enum MenuItem : std::int16_t {
-  menuDisplayControls = 1,
-  menuMeasurementControls,
-  menuStartStop,
-  menuCenterSpan,
-  menuProperties,
-  menuClose
-};
-
 constexpr std::int16_t kStartStopAxis = 1;
 constexpr std::int16_t kCenterSpanAxis = 2;
 
-std::vector<PanelMenuItem> SpectrumView::contextMenu() {
-  if (base_.closing()) return {};
+std::vector<SpectrumView::MenuCommand> SpectrumView::ownMenuCommands() {
   const clsMultiTracePainter* const painter = findPainter();
   const std::int16_t style = painter == nullptr ? std::int16_t{0} : painter->xAxisStyle();
-  return {
-      {menuDisplayControls, "Display Controls", base_.rightPanelVisible(), true},
-      {menuMeasurementControls, "Measurement Controls", base_.bottomPanelVisible(),
-       base_.bottomPanelEnabled()},
-      {menuStartStop, "Axis: Start / Stop", style == kStartStopAxis, painter != nullptr},
-      {menuCenterSpan, "Axis: Center / Span", style == kCenterSpanAxis, painter != nullptr},
-      {menuProperties, "Properties", false, true},
-      {menuClose, "Close", false, actionEnabled(QUILL_VFP_CLOSE)},
-  };
-}
-
-void SpectrumView::contextMenuClick(std::int16_t id) {
-  guard("SpectrumView::contextMenuClick()", [&] {
-    const std::vector<PanelMenuItem> items = contextMenu();
-    const bool usable = std::any_of(items.begin(), items.end(), [id](const PanelMenuItem& item) {
-      return item.id == id && item.enabled;
-    });
-    if (!usable) return;
-    switch (static_cast<MenuItem>(id)) {
-      case menuDisplayControls:
-        return toggleDisplayArea();
-      case menuMeasurementControls:
-        return toggleMeasurementArea();
-      case menuStartStop:
-        return menuXAxisStyle(kStartStopAxis);
-      case menuCenterSpan:
-        return menuXAxisStyle(kCenterSpanAxis);
-      case menuProperties:
-        return errorHandler().Assert("I don't know how to invoke the property page yet!");
-      case menuClose:
-        return closeVfp();
-    }
-  });
+  return {{"Axis: Start / Stop", style == kStartStopAxis, painter != nullptr,
+           [this] { menuXAxisStyle(kStartStopAxis); }},
+          {"Axis: Center / Span", style == kCenterSpanAxis, painter != nullptr,
+           [this] { menuXAxisStyle(kCenterSpanAxis); }}};
 }
 
 void SpectrumView::menuXAxisStyle(std::int16_t style) {
@@ -220,15 +123,7 @@ void SpectrumView::menuXAxisStyle(std::int16_t style) {
   refreshTraces();
 }
 
-void SpectrumView::closeVfp() {
-  guard("SpectrumView::closeVfp() ... ", [this] { base_.closeVfp(); });
-}
-
 // --- Report
-
-std::string SpectrumView::linkSourceName() {
-  return base_.frontPanelCaption().empty() ? kTypeName : base_.frontPanelCaption();
-}
 
 std::string SpectrumView::reportHtml() {
   PanelReport page;

@@ -1,7 +1,6 @@
 // SpectrumView and its traces: live data, axes, markers.
 #include <algorithm>
 
-#include "framework/support/error_handler.h"
 #include "framework/support/flag_scope.h"
 #include "framework/support/guard.h"
 #include "spectrum/spectrum_view.h"
@@ -22,7 +21,7 @@ constexpr float kInsetBottomTwips = 315;
 // --- Data
 
 void SpectrumView::DFISpectrum_DataChanged(std::int32_t index) {
-  if (base_.closing()) return;
+  if (base().closing()) return;
   guard("SpectrumView::DfiSpectrum_DataChanged()", [&] {
     const std::size_t points = readSweep(index);
     showSweep(findOrAddPainter(), std::span(liveTrace_).first(points));
@@ -68,35 +67,23 @@ void SpectrumView::showSweep(clsMultiTracePainter& painter, std::span<const floa
 }
 
 clsMultiTracePainter* SpectrumView::findPainter() {
-  return dynamic_cast<clsMultiTracePainter*>(base_.traceManager().find(kSpectrumResultType));
-}
-
-clsMultiTracePainter* SpectrumView::activePainter() {
-  return dynamic_cast<clsMultiTracePainter*>(base_.traceManager().activeTrace());
+  return dynamic_cast<clsMultiTracePainter*>(base().traceManager().find(kSpectrumResultType));
 }
 
 clsMultiTracePainter& SpectrumView::findOrAddPainter() {
   if (findPainter() == nullptr)
-    base_.traceManager().addTraceObject(std::make_shared<clsMultiTracePainter>(gdi()), kSpectrumResultType);
+    base().traceManager().addTraceObject(std::make_shared<clsMultiTracePainter>(gdi()), kSpectrumResultType);
   clsMultiTracePainter* const painter = findPainter();
   if (painter == nullptr) raiseObjectVariableNotSet();
   return *painter;
-}
-
-void SpectrumView::refreshTraces() {
-  guard("SpectrumView::refreshTraces()", [this] {
-    if (!view().visible()) return;
-    base_.traceManager().paintTraces(true);
-    followAutoScale();
-  });
 }
 
 // --- Traces and axes
 
 void SpectrumView::changedTraceConfiguration(TraceState state, TraceObject* activeTrace,
                                              std::int16_t resultType) {
-  const auto fail = [](const char* what) {
-    errorHandler().Assert(std::string("SpectrumView::changedTraceConfiguration() failed ... ") + what);
+  const auto fail = [this](const char* what) {
+    report(std::string("changedTraceConfiguration() failed ... ") + what);
   };
   guard("SpectrumView::changedTraceConfiguration() failed ... ", [&] {
     updateMarkerButtons();
@@ -168,7 +155,7 @@ void SpectrumView::adjustResolution() {
 void SpectrumView::showVerticalAxis() {
   const clsMultiTracePainter* const painter = activePainter();
   if (painter == nullptr) return;
-  const FlagScope inProgress(optionChangeInProgress_);
+  const FlagScope inProgress = changeOption();
   fields_.controls.checkBox("AutoScaleBox").Value(painter->getAutoScale() ? 1 : 0);
   fields_.verticalScale.valueNoUpdate(painter->verticalResolution());
   if (const std::optional<double> top = painter->gridScaleTop()) fields_.verticalOffset.valueNoUpdate(*top);
@@ -176,7 +163,7 @@ void SpectrumView::showVerticalAxis() {
   shownPerDivision_ = painter->verticalResolution();
 }
 
-void SpectrumView::followAutoScale() {
+void SpectrumView::tracesRefreshed() {
   const clsMultiTracePainter* const painter = activePainter();
   if (painter == nullptr || !painter->getAutoScale()) return;
   if (painter->gridScaleTop() != shownTop_ || painter->verticalResolution() != shownPerDivision_)
@@ -185,51 +172,33 @@ void SpectrumView::followAutoScale() {
 
 // --- Markers
 
+// After a close there is nothing left to mark.
 void SpectrumView::addMarker() {
-  if (base_.closing()) return;
-  guard("SpectrumView::addMarker() ... ", [this] {
-    const clsMultiTracePainter* const painter = activePainter();
-    if (painter == nullptr || painter->numberOfTraces() == 0) return;
-    base_.traceManager().addMarker(painter->traceId(painter->selectedTraceIndex()));
-    updateMarkerButtons();
-  });
+  if (base().closing()) return;
+  markers_.addMarker();
+  evaluateEnablingMarkerToCenter();
 }
 
-// A marker has one delta marker, and that has none.
 void SpectrumView::addDeltaMarker() {
-  if (base_.closing()) return;
-  guard("SpectrumView::addDeltaMarker() ... ", [this] {
-    const clsMultiTracePainter* const painter = activePainter();
-    const MarkerPointer marker = painter == nullptr ? nullptr : painter->activeMarker();
-    if (marker != nullptr && marker->deltaPartner.empty()) base_.traceManager().addDeltaMarker();
-  });
+  if (!base().closing()) markers_.addDeltaMarker();
 }
 
 void SpectrumView::deleteMarker() {
-  if (base_.closing()) return;
-  guard("SpectrumView::MarkerDeleteButton_Click() ... ", [this] {
-    clsMultiTracePainter* const painter = activePainter();
-    if (painter == nullptr || painter->activeMarker() == nullptr) return;
-    painter->deleteActiveMarker();
-    updateMarkerButtons();
-    refreshTraces();
-  });
+  if (base().closing()) return;
+  markers_.deleteMarker();
+  evaluateEnablingMarkerToCenter();
 }
 
 void SpectrumView::markerToMax() {
-  const clsMultiTracePainter* const painter = activePainter();
-  if (!base_.closing() && painter != nullptr && painter->activeMarker() != nullptr)
-    base_.traceManager().markerToMax();
+  if (!base().closing()) markers_.markerToMax();
 }
 
 void SpectrumView::markerToMin() {
-  const clsMultiTracePainter* const painter = activePainter();
-  if (!base_.closing() && painter != nullptr && painter->activeMarker() != nullptr)
-    base_.traceManager().markerToMin();
+  if (!base().closing()) markers_.markerToMin();
 }
 
 void SpectrumView::markerToCenter() {
-  if (base_.closing()) return;
+  if (base().closing()) return;
   guard("SpectrumView::markerToCenter()", [this] {
     clsMultiTracePainter* const painter = activePainter();
     if (painter == nullptr || !mayCenterMarker()) return;
@@ -241,32 +210,8 @@ void SpectrumView::markerToCenter() {
 }
 
 void SpectrumView::updateMarkerButtons() {
-  guard("SpectrumView::updateMarkerButtons() . . .", [this] {
-    const bool any = base_.traceManager().activeTrace() != nullptr &&
-                     !base_.traceManager().activeTrace()->markerCollection().empty();
-    for (const char* const button :
-         {"MarkerDeleteButton", "MarkerDeltaButton", "MarkerToMaxButton", "MarkerToCenterButton"})
-      fields_.controls.control(button).Enabled(any);
-  });
+  markers_.updateMarkerButtons();
   evaluateEnablingMarkerToCenter();
-}
-
-bool SpectrumView::mayCenterMarker() {
-  const TraceObject* const active = base_.traceManager().activeTrace();
-  return active != nullptr && active->activeMarker() != nullptr && !base_.recordMode && !base_.playback;
-}
-
-void SpectrumView::evaluateEnablingMarkerToCenter() {
-  guard("SpectrumView::evaluateEnablingMarkerToCenter()",
-        [this] { MarkerToCenterButton()->Enabled(mayCenterMarker()); });
-}
-
-void SpectrumView::setMarkerFrameColor(Color color) {
-  fields_.controls.control("MarkerFrame").ForeColor(color);
-}
-
-void SpectrumView::deltaMarkerButtonEnabled(bool enable) {
-  fields_.controls.control("MarkerDeltaButton").Enabled(enable);
 }
 
 }  // namespace frontpanels

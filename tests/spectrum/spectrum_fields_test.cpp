@@ -3,6 +3,7 @@
 
 #include "framework/support/enumerated_tables.h"
 #include "framework/support/host_codes.h"
+#include "spectrum/spectrum_controls.h"
 #include "tests/spectrum/spectrum_fixture.h"
 #include "tests/support/listed_records.h"
 
@@ -475,7 +476,8 @@ TEST_F(SpectrumFieldsTest, HostTablesThatDoNotFitTheOptionsAreReported) {
   const EnumeratedValue one[] = {{0, "Only"}};
   enumeratedTables().replace(FREQ_FILTER, one);
   enumeratedTables().add(PARM_AVERAGE_AS_LOG_POWER, {2, "Third"});
-  const SpectrumFields fields;
+  ControlSet set(spectrumControls());
+  const SpectrumFields fields(set);
   enumeratedTables() = before;
   const std::string message =
       "SpectrumView::form_Load() ... recieved unexpected number of records on parameter ";
