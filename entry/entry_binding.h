@@ -2,8 +2,12 @@
 #pragma once
 
 #include <functional>
+#include <string>
+#include <string_view>
+#include <utility>
 
 #include "entry/numeric_entry.h"
+#include "platform/control_set.h"
 
 namespace frontpanels {
 
@@ -27,6 +31,16 @@ inline void bindEntry(clsNumericEntry& entry, TextBox* box, SpinButton* spin, st
   box->KeyDown = [&entry, tell](std::int16_t keyCode, std::int16_t shift) {
     entry.KeyDown(keyCode, shift), tell();
   };
+}
+
+// The same for the controls that a designer table names after the field: its stem with "TextBox",
+// "SpinButton" and, where there is one, "Label".
+inline void bindEntry(clsNumericEntry& entry, const ControlSet& controls, std::string_view stem,
+                      std::function<void()> changed) {
+  const std::string name(stem);
+  if (Control* const label = controls.find(name + "Label")) entry.Label(label);
+  bindEntry(entry, &controls.textBox(name + "TextBox"), &controls.spinButton(name + "SpinButton"),
+            std::move(changed));
 }
 
 }  // namespace frontpanels

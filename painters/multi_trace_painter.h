@@ -115,6 +115,8 @@ class clsMultiTracePainter : public PlotPainter {
   [[nodiscard]] double span() const { return xStop_ - xStart_; }
   void span(double span);
   Property<std::int32_t> numberOfMeasurements;
+  // What lies between two points, for markers to read. 0: the points share the span.
+  Property<double> xPerPoint;
   [[nodiscard]] std::int32_t numberOfHorizontalDivisions() const { return numberOfHorizontalDivisions_; }
   void numberOfHorizontalDivisions(std::int32_t divisions);  // as for the value axis
   // 0 no labels; 1 start, stop and width of a division; 2 centre and width of a division; 3 centre. Another

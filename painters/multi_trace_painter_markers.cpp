@@ -169,6 +169,7 @@ bool clsMultiTracePainter::placeMarker(std::size_t trace, clsMarker& marker) {
 }
 
 double clsMultiTracePainter::pointSpacing() const {
+  if (xPerPoint() != 0) return xPerPoint();
   return numberOfMeasurements() > 1 ? (xStop_ - xStart_) / (numberOfMeasurements() - 1.0) : 0;
 }
 

@@ -113,10 +113,12 @@ bool FieldPanel::request(std::string_view routine, std::int16_t parameterType, s
                   frontPanelSet(base_.resourceId(), base_.virtualFrontPanelId, parameterType, index, value));
 }
 
-void FieldPanel::operate(std::string_view routine, std::int16_t operation) {
-  guard(
-      [&] { return named(routine); },
-      [&] { accepted(routine, frontPanelOp(base_.resourceId(), base_.virtualFrontPanelId, operation, {})); });
+bool FieldPanel::operate(std::string_view routine, std::int16_t operation, const Variant& argument) {
+  return guarded([&] { return named(routine); }, false,
+                 [&] {
+                   return accepted(routine, frontPanelOp(base_.resourceId(), base_.virtualFrontPanelId,
+                                                         operation, argument));
+                 });
 }
 
 void FieldPanel::select(std::string_view option) {

@@ -135,7 +135,7 @@ class FieldPanel : public HostedPanel {
   }
   bool request(std::string_view routine, std::int16_t parameterType, std::int16_t index,
                const Variant& value);
-  void operate(std::string_view routine, std::int16_t operation);
+  bool operate(std::string_view routine, std::int16_t operation, const Variant& argument = {});
   bool accepted(std::string_view routine, std::int32_t status) const;
 
   // Chooses an option for the host: the click that it raises must not go back to whoever made it.
