@@ -218,6 +218,7 @@ void SpectrumView::applyUnits() {
   if (fields_.controls.optionButton("ChannelOption").Value()) return ChannelizationCombo_Change();
   fields_.frequency.showFrequencies();
   updateXAxisLabels();
+  refreshTraces();
 }
 
 void SpectrumView::applyInterval() { fields_.showInterval(fields_.interval(), intervalValue()); }
@@ -229,6 +230,7 @@ void SpectrumView::ChannelizationCombo_Change() {
     if (!fields_.frequency.showChannels(fields_.channels, fields_.channelization.value()))
       fields_.frequency.showFrequencies();
     updateXAxisLabels();
+    refreshTraces();
   });
 }
 

@@ -333,18 +333,16 @@ TEST_F(SpectrumFieldsTest, ChannelsStandInFieldsAxisAndReadOut) {
   panel->addMarker();
   panel->markerToMax();
   gdi.clear();
-  click("ChannelOption");
-  panel->Paint();
+  click("ChannelOption");  // repaints by itself
   EXPECT_EQ(requests(), "Set 5 7 750 0 0");
   EXPECT_EQ(text("CenterFrequency"), "384");
   for (const char* const label : {"334", "434", "10/div"}) EXPECT_TRUE(shows(label)) << label;
   EXPECT_TRUE(shows("1  384  -30 dBm"));
   type("CenterFrequency", "400");
   EXPECT_EQ(requests(), "Set 5 7 13 0 882000000");
+  gdi.clear();
   click("FrequencyOption");
   EXPECT_EQ(text("CenterFrequency"), "882 MHz");
-  gdi.clear();
-  panel->Paint();
   EXPECT_TRUE(shows("880.5 MHz"));
   EXPECT_EQ(said(), "");
 }
