@@ -92,8 +92,6 @@ void SpectrumFields::setUpEntries() {
   frequencyRbw.sequence({1, 3});
   frequencyRbw.valueNoUpdate(frequencyRbw.value());
   showInterval(MeasurementInterval::Time, kIntervals[0].value);
-  ifLabelFormatter.frequencySuffix();
-  ifLabelFormatter.textBox(&controls.textBox("IfLabelFormatterNC"));
 }
 
 void SpectrumFields::setUpLists() {

@@ -34,7 +34,6 @@ class SpectrumFields {
   clsNumericEntry sweepRate;       // s or m
   clsNumericEntry verticalScale;   // dB a division
   clsNumericEntry verticalOffset;  // dBm at the top of the graph
-  clsNumericEntry ifLabelFormatter;
   clsEnumeratedParameter averageType;
   clsEnumeratedParameter channelization;
   clsChannelInfo channels;

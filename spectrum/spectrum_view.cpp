@@ -126,7 +126,6 @@ void SpectrumView::spanFromHost(double spanHz) {
   const FlagScope inProgress(updateInProgress_);
   fields_.frequency.setSpan(spanHz);
   updateXAxisLabels();
-  adjustResolution();
 }
 
 void SpectrumView::timeIntervalFromHost(double period) {

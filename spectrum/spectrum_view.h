@@ -135,7 +135,7 @@ class SpectrumView final : public FieldPanel {
   void setUpTrace(clsMultiTracePainter& painter);
   void formatXAxis(clsMultiTracePainter& painter);
   void updateXAxisLabels();
-  void adjustResolution();
+  void adjustResolution(clsNumericEntry& formatter);
   void tracesRefreshed() override;  // a trace that scales itself takes the vertical fields along
   void showVerticalAxis();
   void menuXAxisStyle(std::int16_t style);

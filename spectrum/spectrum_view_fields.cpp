@@ -122,7 +122,6 @@ void SpectrumView::newFrequencySpan() {
     // What the host answers to the first request must not change the second one.
     const double spanHz = span.value();
     updateXAxisLabels();
-    adjustResolution();
     const bool moved = frequency.center.value() != centerHz;
     if (moved && !request("newFrequencySpan()", kCenterFrequencyParameter, frequency.center.value())) return;
     request("newFrequencySpan()", kSpanParameter, spanHz);
@@ -137,7 +136,6 @@ void SpectrumView::newStartStopFrequency(bool startChanged) {
     frequency.joinEdges(startChanged);
     showBand();
     updateXAxisLabels();
-    adjustResolution();
     const double spanHz = frequency.span.value();  // whatever the host answers to the first request
     if (request("newStartStopFrequency()", kCenterFrequencyParameter, frequency.center.value()))
       request("newStartStopFrequency()", kSpanParameter, spanHz);

@@ -121,7 +121,7 @@ void SpectrumView::formatXAxis(clsMultiTracePainter& painter) {
   const bool channels = center.channelChoose();
   formatter.Clear();
   formatter.frequencySuffix();
-  formatter.formatString(axisFormatForSpan(fields_.frequency.span.value()));
+  adjustResolution(formatter);
   if (channels) {
     formatter.CopyLimits(center);
     fields_.channels.selectChannelization(fields_.channelization.value(), formatter);
@@ -140,15 +140,9 @@ void SpectrumView::updateXAxisLabels() {
   });
 }
 
-void SpectrumView::adjustResolution() {
-  guard("SpectrumView::adjustResolution()", [this] {
-    const std::string_view format = axisFormatForSpan(fields_.frequency.span.value());
-    fields_.ifLabelFormatter.formatString(format);
-    if (clsMultiTracePainter* const painter = findPainter()) {
-      painter->xAxisFormatter().formatString(format);
-      painter->updateXAxisLabels();
-    }
-  });
+void SpectrumView::adjustResolution(clsNumericEntry& formatter) {
+  guard("SpectrumView::adjustResolution()",
+        [&] { formatter.formatString(axisFormatForSpan(fields_.frequency.span.value())); });
 }
 
 // The vertical fields show what the trace has.
