@@ -100,7 +100,8 @@ clsNumericEntry::Settled clsNumericEntry::settled(double value, bool chooseRange
     if (result.range) limits = ranges_.find(*result.range)->limits;
   }
   result.value = limits.clamped(value);
-  if (resolution_) result.value = toWholeResolutions(result.value, *resolution_);
+  // Channels have a grid of their own.
+  if (resolution_ && !channelChoose()) result.value = toWholeResolutions(result.value, *resolution_);
   static_cast<void>(finite(result.value));
   return result;
 }

@@ -118,7 +118,7 @@ class clsNumericEntry {
   // Whether a click leads to a multiple of the step from an arbitrary value, too.
   [[nodiscard]] bool NormalizeAsStep() const noexcept { return normalizeAsStep_; }
   void NormalizeAsStep(bool normalize) noexcept { normalizeAsStep_ = normalize; }
-  // Empty, or a number above 0: what values are rounded to when all else is done.
+  // Empty, or a number above 0: what values are rounded to when all else is done, unless channels are shown.
   [[nodiscard]] Variant resolution() const { return resolution_ ? Variant(*resolution_) : Variant(); }
   void resolution(const Variant& resolution) noexcept;
 

@@ -91,9 +91,8 @@ void FrequencyEntries::followSpan() noexcept {
   if (!(span.value() > 0)) return;
   const double stepHz = stepForSpan(span.value());
   start.step(stepHz);
-  // Channels have a grid of their own, and resolutions are counted in 32 bits.
-  const bool rounds =
-      !start.channelChoose() && start.MAXIMUM() / stepHz <= std::numeric_limits<std::int32_t>::max();
+  // Resolutions are counted in 32 bits.
+  const bool rounds = start.MAXIMUM() / stepHz <= std::numeric_limits<std::int32_t>::max();
   start.resolution(rounds ? Variant(stepHz) : Variant());
   stop.step(stepHz);
   center.step(stepHz);
@@ -142,7 +141,6 @@ bool FrequencyEntries::showChannels(const clsChannelInfo& channels, std::int16_t
   for (clsNumericEntry* const edge : {&start, &stop})
     if (!channels.selectChannelization(channelization, *edge)) return false;
   channels.selectChannelSpacing(channelization, span);
-  start.resolution({});
   for (clsNumericEntry* const entry : {&center, &span, &start, &stop}) entry->channelChoose(true);
   return true;
 }

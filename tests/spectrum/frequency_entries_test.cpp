@@ -108,6 +108,8 @@ TEST_F(FrequencyEntriesTest, ABandIsARangeOfTheCentreAndChangesByOffsetOrByChann
   EXPECT_EQ(inMHz(f), "836.52 2 835.52 837.52");  // the start keeps to channels, not to 100 kHz
   f.showFrequencies();
   EXPECT_EQ(f.center.formatter(f.center.value()), "836.52 MHz");
+  f.setCenter(836.54e6);
+  EXPECT_EQ(inMHz(f), "836.54 2 835.5 837.54");  // and now to 100 kHz again
 }
 
 TEST_F(FrequencyEntriesTest, AxisFormatFollowsTheSpanWithItsGaps) {
