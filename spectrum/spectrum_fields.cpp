@@ -56,24 +56,9 @@ void setUp(SpectrumFields& fields, const EntryRow& row) {
   entry.valueNoUpdate(row.value);
 }
 
-constexpr SpectrumFields::EntryField kFields[] = {
-    {"CenterFrequency", [](SpectrumFields& f) -> clsNumericEntry& { return f.frequency.center; }},
-    {"FrequencySpan", [](SpectrumFields& f) -> clsNumericEntry& { return f.frequency.span; }},
-    {"FrequencyRbw", [](SpectrumFields& f) -> clsNumericEntry& { return f.frequencyRbw; }},
-    {"StartFrequency", [](SpectrumFields& f) -> clsNumericEntry& { return f.frequency.start; }},
-    {"StopFrequency", [](SpectrumFields& f) -> clsNumericEntry& { return f.frequency.stop; }},
-    {"AverageCount", [](SpectrumFields& f) -> clsNumericEntry& { return f.averageCount; }},
-    {"DisplayLength", [](SpectrumFields& f) -> clsNumericEntry& { return f.displayLength; }},
-    {"SweepRate", [](SpectrumFields& f) -> clsNumericEntry& { return f.sweepRate; }},
-    {"VerticalScale", [](SpectrumFields& f) -> clsNumericEntry& { return f.verticalScale; }},
-    {"VerticalOffset", [](SpectrumFields& f) -> clsNumericEntry& { return f.verticalOffset; }},
-};
-
 constexpr std::string_view kNoLabel = "SweepRate";  // its options say what it is
 
 }  // namespace
-
-std::span<const SpectrumFields::EntryField> SpectrumFields::entryFields() noexcept { return kFields; }
 
 SpectrumFields::SpectrumFields(ControlSet& controlsOfPanel) : controls(controlsOfPanel) {
   setUpEntries();
@@ -105,10 +90,8 @@ void SpectrumFields::setUpLists() {
     channelization.value(known.front().value);
 }
 
-void SpectrumFields::bind(const EntryField& field, std::function<void()> changed) {
-  clsNumericEntry& entry = field.entry(*this);
-  const std::string stem(field.stem);
-  if (field.stem != kNoLabel) entry.Label(&controls.label(stem + "Label"));
+void SpectrumFields::bind(const std::string& stem, clsNumericEntry& entry, std::function<void()> changed) {
+  if (stem != kNoLabel) entry.Label(&controls.label(stem + "Label"));
   bindEntry(entry, &controls.textBox(stem + "TextBox"), &controls.spinButton(stem + "SpinButton"),
             std::move(changed));
 }

@@ -6,8 +6,7 @@
 #include <cstdint>
 #include <functional>
 #include <optional>
-#include <span>
-#include <string_view>
+#include <string>
 
 #include "entry/channel_info.h"
 #include "entry/enumerated_parameter.h"
@@ -38,15 +37,9 @@ class SpectrumFields {
   clsEnumeratedParameter channelization;
   clsChannelInfo channels;
 
-  // One numeric field: its entry and the stem of its controls' names.
-  struct EntryField {
-    std::string_view stem;
-    clsNumericEntry& (*entry)(SpectrumFields& fields);
-  };
-  [[nodiscard]] static std::span<const EntryField> entryFields() noexcept;
-  // Connects a field's controls to its entry. `changed` is called after each event that has changed the
-  // value.
-  void bind(const EntryField& field, std::function<void()> changed);
+  // Connects an entry to the controls whose names begin with the stem. `changed` is called after each event
+  // that has changed the value.
+  void bind(const std::string& stem, clsNumericEntry& entry, std::function<void()> changed);
 
   [[nodiscard]] MeasurementInterval interval() const {
     return controls.optionButton("IntervalTimeOption").Value() ? MeasurementInterval::Time

@@ -52,17 +52,33 @@ void SpectrumView::bindFields() {
       whileOpen([this] { bandClick("UplinkOption_Click()", kUplinkRange); });
 }
 
-// In the order of SpectrumFields::entryFields.
 void SpectrumView::bindEntries() {
-  constexpr Handler kHandlers[] = {
-      &SpectrumView::newCenterFrequency, &SpectrumView::newFrequencySpan, &SpectrumView::newFrequencyRbw,
-      &SpectrumView::newStartFrequency,  &SpectrumView::newStopFrequency, &SpectrumView::newAverageCount,
-      &SpectrumView::newDisplayLength,   &SpectrumView::newSweepRate,     &SpectrumView::newVerticalScale,
-      &SpectrumView::newVerticalOffset,
+  struct EntryField {
+    const char* stem;  // of its controls' names
+    clsNumericEntry& (*entry)(SpectrumFields& fields);
+    Handler changed;
   };
-  const Handler* handler = std::begin(kHandlers);
-  for (const SpectrumFields::EntryField& field : SpectrumFields::entryFields())
-    fields_.bind(field, calling(*handler++));
+  using Fields = SpectrumFields;
+  using Entry = clsNumericEntry;
+  constexpr EntryField kFields[] = {
+      {"CenterFrequency", [](Fields& f) -> Entry& { return f.frequency.center; },
+       &SpectrumView::newCenterFrequency},
+      {"FrequencySpan", [](Fields& f) -> Entry& { return f.frequency.span; },
+       &SpectrumView::newFrequencySpan},
+      {"FrequencyRbw", [](Fields& f) -> Entry& { return f.frequencyRbw; }, &SpectrumView::newFrequencyRbw},
+      {"StartFrequency", [](Fields& f) -> Entry& { return f.frequency.start; },
+       &SpectrumView::newStartFrequency},
+      {"StopFrequency", [](Fields& f) -> Entry& { return f.frequency.stop; },
+       &SpectrumView::newStopFrequency},
+      {"AverageCount", [](Fields& f) -> Entry& { return f.averageCount; }, &SpectrumView::newAverageCount},
+      {"DisplayLength", [](Fields& f) -> Entry& { return f.displayLength; }, &SpectrumView::newDisplayLength},
+      {"SweepRate", [](Fields& f) -> Entry& { return f.sweepRate; }, &SpectrumView::newSweepRate},
+      {"VerticalScale", [](Fields& f) -> Entry& { return f.verticalScale; }, &SpectrumView::newVerticalScale},
+      {"VerticalOffset", [](Fields& f) -> Entry& { return f.verticalOffset; },
+       &SpectrumView::newVerticalOffset},
+  };
+  for (const EntryField& field : kFields)
+    fields_.bind(field.stem, field.entry(fields_), calling(field.changed));
   fields_.controls.list("AverageTypeCombo").Click = calling(&SpectrumView::newAverageType);
   fields_.controls.list("ChannelizationCombo").Click = calling(&SpectrumView::newChannelization);
 }
