@@ -101,6 +101,13 @@ TEST_F(FrequencyEntriesTest, ABandIsARangeOfTheCentreAndChangesByOffsetOrByChann
   channels.setChannelSpacing("30000", &uplink);
   EXPECT_FALSE(f.showChannels(channels, 4));
   EXPECT_EQ(said(), "clsChannelInfo::selectChannelization() ... could not find channelization lookup\r");
+  clsChannelInfo narrow;  // all channels in one place
+  narrow.setChannelLookup("3", &orders);
+  narrow.setChannelZero("870000000", &orders);
+  narrow.setChannelSpacing("0", &orders);
+  EXPECT_FALSE(f.showChannels(narrow, 3));
+  EXPECT_EQ(said(), "clsChannelInfo::selectChannelization()\rDivision by zero");
+  EXPECT_EQ(f.center.formatter(f.center.value()), "881.52 MHz");
   EXPECT_TRUE(f.showChannels(channels, 3));
   f.setCenter(881.52e6);  // (881.52 - 870) / 0.03
   EXPECT_EQ(f.center.formatter(f.center.value()), "384");

@@ -100,6 +100,16 @@ TEST_F(SpectrumFieldsTest, AnEchoInsideTheRequestIsShownAndNotSentBack) {
   EXPECT_EQ(text("CenterFrequency") + ", " + text("FrequencySpan"), "881 MHz, 11 MHz");
 }
 
+TEST_F(SpectrumFieldsTest, TheSpanThatTheUserEnteredIsSentWhateverTheHostAnswersToTheCentre) {
+  set(14, 1e6);
+  set(13, 5999.5e6);
+  owner.settingChanged = [this](std::int16_t code, const Variant&) {
+    if (code == 13) set(14, 1e6);
+  };
+  type("FrequencySpan", "2M");
+  EXPECT_EQ(requests(), "Set 5 7 13 0 5999000000, Set 5 7 14 0 2000000");
+}
+
 TEST_F(SpectrumFieldsTest, WhatTheHostSendsIsShownAndNotSentBack) {
   struct Row {
     std::int16_t code;
@@ -294,6 +304,10 @@ TEST_F(SpectrumFieldsTest, MarkerButtonsWorkOnTheActiveMarkerAndAreEnabledByIt) 
   EXPECT_EQ(markerButtons(), "1010");
   click("MarkerAddButton");
   EXPECT_EQ(markerButtons(), "1110");
+  owner.take();
+  panel->updateMarkerButtons();
+  panel->markerToCenter();
+  EXPECT_EQ(markerButtons() + requests(), "1110");
   set(322, 0);
   EXPECT_EQ(markerButtons(), "1111");
   click("MarkerDeleteButton");
@@ -344,6 +358,15 @@ TEST_F(SpectrumFieldsTest, ChannelsStandInFieldsAxisAndReadOut) {
   click("FrequencyOption");
   EXPECT_EQ(text("CenterFrequency"), "882 MHz");
   EXPECT_TRUE(shows("880.5 MHz"));
+  EXPECT_EQ(said(), "");
+  click("ChannelOption");
+  EXPECT_EQ(text("CenterFrequency"), "400");
+  panel->channels().reinitialize();
+  panel->ChannelizationCombo_Change();
+  EXPECT_EQ(text("CenterFrequency"), "882 MHz");
+  EXPECT_EQ(said(), "clsChannelInfo::selectChannelization() ... could not find channelization lookup\r");
+  set(13, 881e6);
+  set(14, 1e6);
   EXPECT_EQ(said(), "");
 }
 
