@@ -2,7 +2,6 @@
 
 #include <string>
 
-#include "entry/entry_binding.h"
 #include "framework/support/enumerated_tables.h"
 #include "framework/support/error_handler.h"
 #include "framework/support/guard.h"
@@ -56,8 +55,6 @@ void setUp(SpectrumFields& fields, const EntryRow& row) {
   entry.valueNoUpdate(row.value);
 }
 
-constexpr std::string_view kNoLabel = "SweepRate";  // its options say what it is
-
 }  // namespace
 
 SpectrumFields::SpectrumFields(ControlSet& controlsOfPanel) : controls(controlsOfPanel) {
@@ -88,12 +85,6 @@ void SpectrumFields::setUpLists() {
   channelization.parameterType(kChannelizationParameter);
   if (const auto known = enumeratedValues(kChannelizationParameter); !known.empty())
     channelization.value(known.front().value);
-}
-
-void SpectrumFields::bind(const std::string& stem, clsNumericEntry& entry, std::function<void()> changed) {
-  if (stem != kNoLabel) entry.Label(&controls.label(stem + "Label"));
-  bindEntry(entry, &controls.textBox(stem + "TextBox"), &controls.spinButton(stem + "SpinButton"),
-            std::move(changed));
 }
 
 void SpectrumFields::showInterval(MeasurementInterval interval, double value) noexcept {

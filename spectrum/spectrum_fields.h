@@ -4,9 +4,7 @@
 
 #include <array>
 #include <cstdint>
-#include <functional>
 #include <optional>
-#include <string>
 
 #include "entry/channel_info.h"
 #include "entry/enumerated_parameter.h"
@@ -36,10 +34,6 @@ class SpectrumFields {
   clsEnumeratedParameter averageType;
   clsEnumeratedParameter channelization;
   clsChannelInfo channels;
-
-  // Connects an entry to the controls whose names begin with the stem. `changed` is called after each event
-  // that has changed the value.
-  void bind(const std::string& stem, clsNumericEntry& entry, std::function<void()> changed);
 
   [[nodiscard]] MeasurementInterval interval() const {
     return controls.optionButton("IntervalTimeOption").Value() ? MeasurementInterval::Time

@@ -1,6 +1,7 @@
 // SpectrumView towards its user: what each field does when its value has been changed.
 #include <iterator>
 
+#include "entry/entry_binding.h"
 #include "framework/support/enumerated_tables.h"
 #include "framework/support/error_handler.h"
 #include "framework/support/flag_scope.h"
@@ -78,7 +79,7 @@ void SpectrumView::bindEntries() {
        &SpectrumView::newVerticalOffset},
   };
   for (const EntryField& field : kFields)
-    fields_.bind(field.stem, field.entry(fields_), calling(field.changed));
+    bindEntry(field.entry(fields_), *controls(), field.stem, calling(field.changed));
   fields_.controls.list("AverageTypeCombo").Click = calling(&SpectrumView::newAverageType);
   fields_.controls.list("ChannelizationCombo").Click = calling(&SpectrumView::newChannelization);
 }
