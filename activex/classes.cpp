@@ -1,5 +1,6 @@
 #include "activex/classes.h"
 
+#include "activex/cell_name_object.h"
 #include "activex/data_hub_object.h"
 #include "activex/diagnostics_object.h"
 #include "activex/result_buffer_object.h"
@@ -19,6 +20,8 @@ const ClassRow kClasses[] = {
     {&CLSID_DataHub, L"DataHub", L"Front Panels DataHub", false, create<DataHubObject>},
     {&CLSID_Diagnostics, L"Diagnostics", L"Front Panels Diagnostics", false, create<DiagnosticsObject>},
     {&CLSID_ResultBuffer, L"ResultBuffer", L"Front Panels ResultBuffer", false, create<ResultBufferObject>},
+    {&CLSID_clsCellNameInfo, L"clsCellNameInfo", L"Front Panels clsCellNameInfo", false,
+     create<CellNameObject>},
 };
 
 }  // namespace

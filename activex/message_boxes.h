@@ -1,6 +1,6 @@
-// Message boxes of the library. They belong to a panel that the user has in front of him; while there is
-// none, a box would stop a script or an unattended host where nobody can answer it: the message is kept and
-// nothing is shown.
+// Boxes of the library: messages and files. They belong to a panel that the user has in front of him; while
+// there is none, a box would stop a script or an unattended host where nobody can answer it: a message is
+// kept and not shown, a question for a file answers none.
 #pragma once
 
 #include "platform/win32/win32_dialogs.h"
@@ -29,6 +29,15 @@ class MessageBoxes final : public Dialogs {
 
  private:
   Win32Dialogs dialogs_;
+};
+
+class FileBoxes final : public FileDialogs {
+ public:
+  [[nodiscard]] std::optional<std::string> openFile(std::string_view filter) override;
+  [[nodiscard]] bool cancelPressed() noexcept override { return dialogs_.cancelPressed(); }
+
+ private:
+  Win32FileDialogs dialogs_;
 };
 
 }  // namespace frontpanels::activex

@@ -44,7 +44,7 @@ template <class Predicate>
 std::size_t firstPlace(const std::vector<std::uint16_t>& places, std::uint64_t hash,
                        Predicate isWanted) noexcept {
   const std::size_t mask = places.size() - 1;
-  std::size_t place = hash & mask;
+  auto place = static_cast<std::size_t>(hash) & mask;
   while (places[place] != kFree && !isWanted(places[place])) place = (place + 1) & mask;
   return place;
 }

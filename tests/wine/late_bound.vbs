@@ -160,6 +160,31 @@ Sub Channels()
   Check "an area answers", tuned.displayPanel.Visible, True
 End Sub
 
+Sub CellNames()
+  Dim names, i
+  Set names = CreateObject("FrontPanels.clsCellNameInfo")
+  Check "no cell has a name", names.GetCellName(5, -1), "Unknown"
+  names.SetCellName 5, 7, "Town Hall"
+  names.SetCellName 5, 7, "Station"
+  Check "a cell is found by one identifier", names.GetCellName(5, -1), "Town Hall"
+  Check "by both", names.GetCellName("5", 7.0), "Town Hall"
+  Check "not by another", names.GetCellName(5, 0), "Unknown"
+  Check "the longest name counts", names.maxCellNameLength, 9
+  names.maxCellNameLength = 20
+  Check "or what was set", names.maxCellNameLength, 20
+  names.SetCellName 6, 0, String(32768, "x")
+  Check "a name that is too long is reported", LastMessage(), "clsCellNameInfo::SetCellName()|Overflow"
+  diagnostics.Clear
+  For i = 1 To 32766
+    names.SetCellName i, 1, "Cell " & i
+  Next
+  Check "the last of many is refused", diagnostics.Count & names.GetCellName(32766, 1), "1Unknown"
+  Check "the one before it found", names.GetCellName(32765, 1), "Cell 32765"
+  names.Initialize
+  Check "all are forgotten", names.GetCellName(5, -1) & names.maxCellNameLength, "Unknown0"
+  diagnostics.Clear
+End Sub
+
 Sub Closing()
   Check "closing answers 0", panel.vfpOp(0, 1), 0
   Check "then everything does", panel.vfpSet(0, 312, 0, "abc"), 0
@@ -181,6 +206,7 @@ Errors
 Sweep
 Results
 Channels
+CellNames
 Closing
 Set panel = Nothing
 WScript.Echo "script finished"

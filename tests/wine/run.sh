@@ -90,7 +90,7 @@ imports_and_exports() {
   for width in 64:x86_64 32:i686; do
     file=$root/build/win${width%%:*}/frontpanels.ocx
     strange=$("${width##*:}"-w64-mingw32-objdump -p "$file" | sed -n 's/.*DLL Name: //p' |
-      grep -vixE '(advapi32|gdi32|kernel32|msvcrt|ole32|oleaut32|user32|windowscodecs)\.dll')
+      grep -vixE '(advapi32|comdlg32|gdi32|kernel32|msvcrt|ole32|oleaut32|user32|windowscodecs)\.dll')
     [ -f "$file" ] && [ -z "$strange" ]
     judge $? "the ${width%%:*}-bit library imports system libraries only${strange:+: $strange}"
     names=$("${width##*:}"-w64-mingw32-objdump -p "$file" | sed -n '/\[Ordinal\/Name Pointer\]/,/^$/s/.*\] *//p' | tail -n +2 | sort | tr '\n' ' ')
@@ -138,7 +138,8 @@ export_classes before
 timeout 60 wine regsvr32 /s "$(windows_path "$library")"
 judge $? "the library registers"
 export_classes registered
-for name in SpectrumView SpectrumView.1 DataHub DataHub.1 Diagnostics Diagnostics.1 ResultBuffer ResultBuffer.1; do
+for name in SpectrumView SpectrumView.1 DataHub DataHub.1 Diagnostics Diagnostics.1 ResultBuffer ResultBuffer.1 \
+  clsCellNameInfo clsCellNameInfo.1; do
   grep -qF "Classes\\FrontPanels.$name\\CLSID]" "$out/registered.txt"
   judge $? "FrontPanels.$name is in the registry"
 done
