@@ -11,6 +11,7 @@
 
 #include "activex/aggregable.h"
 #include "activex/panel_window.h"
+#include "activex/stored_values.h"
 #include "platform/variant.h"
 #include "platform/win32/com_pointer.h"
 
@@ -28,12 +29,6 @@ struct ControlClass {
 // and as answered.
 inline constexpr DWORD kMiscStatus = OLEMISC_RECOMPOSEONRESIZE | OLEMISC_CANTLINKINSIDE | OLEMISC_INSIDEOUT |
                                      OLEMISC_ACTIVATEWHENVISIBLE | OLEMISC_SETCLIENTSITEFIRST;
-
-// A boolean property that the container stores with its form.
-struct StoredProperty {
-  const wchar_t* name;
-  bool defaultValue;
-};
 
 class OleObjectPart;
 class InPlacePart;
@@ -74,10 +69,11 @@ class ControlCore : public Aggregable, public WindowOwner {
   // Neither while the container holds events back nor in a designer.
   [[nodiscard]] bool raisesEvents() const noexcept { return freezes_ == 0 && userMode_; }
 
-  // What the control stores through the container.
+  // What the control stores through the container. A value is of its property's kind, whatever it says: a
+  // text that the control has no use for is its to pass over, as the form would be lost with it.
   [[nodiscard]] virtual std::span<const StoredProperty> storedProperties() const = 0;
-  [[nodiscard]] virtual bool storedValue(std::size_t property) const = 0;
-  virtual void storedValue(std::size_t property, bool value) = 0;
+  [[nodiscard]] virtual Variant storedValue(std::size_t property) const = 0;
+  virtual void storedValue(std::size_t property, const Variant& value) = 0;
 
   // WindowOwner
   void holdControl() noexcept override { outer()->AddRef(); }

@@ -46,7 +46,8 @@ class DualControl : public ControlCore, public Dual {
   ULONG STDMETHODCALLTYPE Release() override { return outer()->Release(); }
 };
 
-// Shown or hidden areas are kept with the form; the numbers are those of the properties.
+// Shown or hidden areas are kept with the form; the numbers are those of the properties. A panel that keeps
+// more lists its own properties behind these and hands these on.
 enum class AreaProperty : std::size_t { DisplayPanelVisible, MeasurementPanelVisible };
 inline constexpr StoredProperty kStoredAreas[] = {{L"DisplayPanelVisible", true},
                                                   {L"MeasurementPanelVisible", true}};
@@ -393,17 +394,17 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
 
   // --- Stored properties
   std::span<const StoredProperty> storedProperties() const override { return kStoredAreas; }
-  bool storedValue(std::size_t property) const override {
+  Variant storedValue(std::size_t property) const override {
     const clsBaseVFP& common = const_cast<FrontPanelControl&>(*this).base();
     return static_cast<AreaProperty>(property) == AreaProperty::DisplayPanelVisible
                ? common.rightPanelVisible()
                : common.bottomPanelVisible();
   }
-  void storedValue(std::size_t property, bool value) override {
+  void storedValue(std::size_t property, const Variant& value) override {
     if (static_cast<AreaProperty>(property) == AreaProperty::DisplayPanelVisible)
-      base().rightPanelVisible(value);
+      base().rightPanelVisible(value.toBoolean());
     else
-      base().bottomPanelVisible(value);
+      base().bottomPanelVisible(value.toBoolean());
   }
 
  protected:
@@ -425,6 +426,12 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
   HRESULT perform(Body body) {
     const ComPointer<IUnknown> alive(this->outer());
     return barrier(__uuidof(Dual), body);
+  }
+  // A stored property has another value: the form is to be saved, and whoever watches the property is told.
+  void propertyChanged(DISPID id) {
+    this->dirty(true);
+    this->view().changed();
+    this->connections().notifyChanged(id);
   }
 
  private:
@@ -459,9 +466,7 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
   HRESULT change(AreaProperty property, VARIANT_BOOL value) {
     return perform([&] {
       storedValue(static_cast<std::size_t>(property), value != VARIANT_FALSE);
-      this->dirty(true);
-      this->view().changed();
-      this->connections().notifyChanged(kStoredAreaIds[static_cast<std::size_t>(property)]);
+      propertyChanged(kStoredAreaIds[static_cast<std::size_t>(property)]);
     });
   }
 

@@ -1,42 +1,13 @@
 #include "activex/persistence_part.h"
 
-#include <oleauto.h>
-
-#include <algorithm>
-#include <vector>
-
 #include "activex/barrier.h"
+#include "activex/stored_values.h"
 #include "framework/support/error_handler.h"
 
 namespace frontpanels::activex {
 namespace {
 
-constexpr std::uint32_t kMagic = 0x4C505046;  // "FPPL"
-constexpr std::uint16_t kVersion = 1;
-constexpr std::uint16_t kMostProperties = 64;
 constexpr wchar_t kStreamName[] = L"FrontPanels";
-
-#pragma pack(push, 1)
-struct StreamHeader {
-  std::uint32_t magic = kMagic;
-  std::uint16_t version = kVersion;
-  std::uint16_t properties = 0;
-  std::int32_t widthHimetric = 0;
-  std::int32_t heightHimetric = 0;
-};
-#pragma pack(pop)
-
-void readWhole(IStream& stream, void* data, ULONG bytes) {
-  ULONG read = 0;
-  check(stream.Read(data, bytes, &read));
-  if (read != bytes) throw ComFailure(STG_E_READFAULT);
-}
-
-void writeWhole(IStream& stream, const void* data, ULONG bytes) {
-  ULONG written = 0;
-  check(stream.Write(data, bytes, &written));
-  if (written != bytes) throw ComFailure(STG_E_WRITEFAULT);
-}
 
 // What fails is reported as well: containers load and save forms without a word.
 template <class Body>
@@ -49,35 +20,6 @@ HRESULT reported(const char* routine, Body body) {
 constexpr const char* kReading = "UserControl_ReadProperties()";
 constexpr const char* kWriting = "UserControl_WriteProperties()";
 
-// The wanted type goes in as a hint, and the value with it zeroed; whatever comes back is converted, text
-// too. The default where the bag has no such property.
-bool readFlag(IPropertyBag& bag, IErrorLog* log, const StoredProperty& property) {
-  VARIANT value;
-  VariantInit(&value);
-  V_VT(&value) = VT_BOOL;
-  V_BOOL(&value) = VARIANT_FALSE;
-  bool flag = property.defaultValue;
-  if (SUCCEEDED(bag.Read(property.name, &value, log))) {
-    if (SUCCEEDED(VariantChangeTypeEx(&value, &value, LOCALE_INVARIANT, 0, VT_BOOL))) {
-      flag = V_BOOL(&value) != VARIANT_FALSE;
-    } else if (log != nullptr) {
-      EXCEPINFO info{};
-      info.scode = DISP_E_TYPEMISMATCH;
-      log->AddError(property.name, &info);
-    }
-  }
-  VariantClear(&value);
-  return flag;
-}
-
-void writeFlag(IPropertyBag& bag, const StoredProperty& property, bool flag) {
-  VARIANT value;
-  VariantInit(&value);
-  V_VT(&value) = VT_BOOL;
-  V_BOOL(&value) = flag ? VARIANT_TRUE : VARIANT_FALSE;
-  check(bag.Write(property.name, &value));
-}
-
 }  // namespace
 
 HRESULT PersistencePart::GetClassID(CLSID* id) {
@@ -88,42 +30,39 @@ HRESULT PersistencePart::GetClassID(CLSID* id) {
 
 HRESULT PersistencePart::IsDirty() { return core().dirty() ? S_OK : S_FALSE; }
 
-void PersistencePart::setDefaults() {
-  const auto properties = core().storedProperties();
-  for (std::size_t i = 0; i < properties.size(); ++i) core().storedValue(i, properties[i].defaultValue);
+void PersistencePart::apply(const StoredValues& values) {
+  for (std::size_t i = 0; i < values.size(); ++i) core().storedValue(i, values[i]);
   core().dirty(false);
 }
 
-HRESULT PersistencePart::InitNew() {
-  return barrier([&] { setDefaults(); });
+StoredState PersistencePart::state() const {
+  StoredState state{core().extent(), {}};
+  for (std::size_t i = 0; i < core().storedProperties().size(); ++i)
+    state.values.push_back(core().storedValue(i));
+  return state;
 }
 
+HRESULT PersistencePart::InitNew() {
+  return barrier([&] {
+    StoredValues values;
+    for (const StoredProperty& property : core().storedProperties()) values.push_back(defaultOf(property));
+    apply(values);
+  });
+}
+
+// Nothing changes before all of it is read.
 void PersistencePart::readStream(IStream& stream) {
-  StreamHeader header;
-  readWhole(stream, &header, sizeof header);
-  if (header.magic != kMagic || header.version != kVersion || header.properties > kMostProperties ||
-      header.widthHimetric < 0 || header.heightHimetric < 0)
-    throw ComFailure(STG_E_DOCFILECORRUPT);
-  std::vector<std::uint8_t> flags(header.properties);
-  if (!flags.empty()) readWhole(stream, flags.data(), static_cast<ULONG>(flags.size()));
-  setDefaults();
-  const std::size_t known = std::min(flags.size(), core().storedProperties().size());
-  for (std::size_t i = 0; i < known; ++i) core().storedValue(i, flags[i] != 0);
-  core().extent({header.widthHimetric, header.heightHimetric});
+  const StoredState stored = readStored(stream, core().storedProperties());
+  apply(stored.values);
+  core().extent(stored.extentHimetric);
   core().dirty(false);
 }
 
 void PersistencePart::writeStream(IStream& stream) const {
-  const std::size_t count = core().storedProperties().size();
-  StreamHeader header;
-  header.properties = static_cast<std::uint16_t>(count);
-  header.widthHimetric = static_cast<std::int32_t>(core().extent().cx);
-  header.heightHimetric = static_cast<std::int32_t>(core().extent().cy);
-  writeWhole(stream, &header, sizeof header);
-  for (std::size_t i = 0; i < count; ++i) {
-    const std::uint8_t flag = core().storedValue(i) ? 1 : 0;
-    writeWhole(stream, &flag, sizeof flag);
-  }
+  const std::string bytes = storedBytes(state());
+  ULONG written = 0;
+  check(stream.Write(bytes.data(), static_cast<ULONG>(bytes.size()), &written));
+  if (written != bytes.size()) throw ComFailure(STG_E_WRITEFAULT);
 }
 
 HRESULT PersistencePart::Load(IStream* stream) {
@@ -141,28 +80,19 @@ HRESULT PersistencePart::Save(IStream* stream, BOOL clearDirty) {
 
 HRESULT PersistencePart::GetSizeMax(ULARGE_INTEGER* size) {
   if (size == nullptr) return E_POINTER;
-  size->QuadPart = sizeof(StreamHeader) + core().storedProperties().size();
-  return S_OK;
+  size->QuadPart = 0;
+  return barrier([&] { size->QuadPart = storedBytes(state()).size(); });
 }
 
 HRESULT PersistencePart::Load(IPropertyBag* bag, IErrorLog* log) {
   if (bag == nullptr) return E_POINTER;
-  return reported(kReading, [&] {
-    const auto properties = core().storedProperties();
-    for (std::size_t i = 0; i < properties.size(); ++i)
-      core().storedValue(i, readFlag(*bag, log, properties[i]));
-    core().dirty(false);
-  });
+  return reported(kReading, [&] { apply(readStored(*bag, log, core().storedProperties())); });
 }
 
 HRESULT PersistencePart::Save(IPropertyBag* bag, BOOL clearDirty, BOOL saveAll) {
   if (bag == nullptr) return E_POINTER;
   return reported(kWriting, [&] {
-    const auto properties = core().storedProperties();
-    for (std::size_t i = 0; i < properties.size(); ++i) {
-      const bool flag = core().storedValue(i);
-      if (saveAll || flag != properties[i].defaultValue) writeFlag(*bag, properties[i], flag);
-    }
+    writeStored(*bag, core().storedProperties(), state().values, saveAll != FALSE);
     if (clearDirty) core().dirty(false);
   });
 }

@@ -33,7 +33,8 @@ class PersistencePart final : public ControlPart<IPersistStreamInit, IPersistPro
   HRESULT STDMETHODCALLTYPE HandsOffStorage() override { return S_OK; }
 
  private:
-  void setDefaults();
+  void apply(const StoredValues& values);
+  [[nodiscard]] StoredState state() const;
   void readStream(IStream& stream);
   void writeStream(IStream& stream) const;
 };

@@ -103,7 +103,11 @@ void keepsItsPropertiesInAStream() {
   expect(loading->Load(stream.get()) == S_OK, "what was saved loads");
   other.object->GetExtent(DVASPECT_CONTENT, &back);
   expect(back.cx == 5000 && back.cy == 4000, "with the extent to the unit");
+  stream->Seek({}, STREAM_SEEK_SET, nullptr);
+  stream->SetSize({{17, 0}});
+  put(*other.members.get(), L"DisplayPanelVisible", false);
   expect(FAILED(loading->Load(stream.get())), "a stream that ends early is refused");
+  expect(call(*other.members.get(), L"DisplayPanelVisible").number() == 0, "and changes nothing");
   const auto diagnostics = create<IDispatch>(L"FrontPanels.Diagnostics");
   expect(call(*diagnostics.get(), L"Message", {0}).text() == L"UserControl_ReadProperties()\r",
          "and reported");
