@@ -5,6 +5,8 @@
 #include "activex/diagnostics_object.h"
 #include "activex/result_buffer_object.h"
 #include "activex/spectrum_control.h"
+#include "activex/tarvex_control.h"
+#include "activex/toolbox_bitmaps.h"
 #include "frontpanels_h.h"
 
 namespace frontpanels::activex {
@@ -16,12 +18,13 @@ Aggregable* create(IUnknown* outer) {
 }
 
 const ClassRow kClasses[] = {
-    {&CLSID_SpectrumView, L"SpectrumView", L"Front Panels SpectrumView", true, create<SpectrumControl>},
-    {&CLSID_DataHub, L"DataHub", L"Front Panels DataHub", false, create<DataHubObject>},
-    {&CLSID_Diagnostics, L"Diagnostics", L"Front Panels Diagnostics", false, create<DiagnosticsObject>},
-    {&CLSID_ResultBuffer, L"ResultBuffer", L"Front Panels ResultBuffer", false, create<ResultBufferObject>},
-    {&CLSID_clsCellNameInfo, L"clsCellNameInfo", L"Front Panels clsCellNameInfo", false,
-     create<CellNameObject>},
+    {&CLSID_SpectrumView, L"SpectrumView", L"Front Panels SpectrumView", SPECTRUM_TOOLBOX_BITMAP,
+     create<SpectrumControl>},
+    {&CLSID_DataHub, L"DataHub", L"Front Panels DataHub", 0, create<DataHubObject>},
+    {&CLSID_Diagnostics, L"Diagnostics", L"Front Panels Diagnostics", 0, create<DiagnosticsObject>},
+    {&CLSID_ResultBuffer, L"ResultBuffer", L"Front Panels ResultBuffer", 0, create<ResultBufferObject>},
+    {&CLSID_clsCellNameInfo, L"clsCellNameInfo", L"Front Panels clsCellNameInfo", 0, create<CellNameObject>},
+    {&CLSID_Tarvex, L"Tarvex", L"Front Panels Tarvex", PILOT_TOOLBOX_BITMAP, create<TarvexControl>},
 };
 
 }  // namespace

@@ -13,7 +13,8 @@ struct ClassRow {
   const CLSID* id;
   const wchar_t* name;  // of the ProgID, after "FrontPanels."
   const wchar_t* title;
-  bool control;                            // otherwise a plain object
+  // Resource of a control's picture for the toolboxes of designers; 0 for a plain object.
+  int toolboxBitmap;
   Aggregable* (*create)(IUnknown* outer);  // the new object has one reference
 };
 [[nodiscard]] std::span<const ClassRow> classes() noexcept;

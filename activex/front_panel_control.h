@@ -1,5 +1,6 @@
-// What is alike in all panel controls: the host's contract as automation members. `Dual` is a panel's dual
-// interface; it has these members and its own.
+// What is alike in all panel controls: the panel in its window, and the host's contract as automation
+// members. `Dual` is a panel's dual interface, with these members and its own; `Panel` is the panel, a
+// FieldPanel with marker commands.
 #pragma once
 
 #include <algorithm>
@@ -14,6 +15,7 @@
 #include "activex/panel_events.h"
 #include "activex/panel_requests.h"
 #include "activex/picture_file.h"
+#include "activex/services.h"
 #include "activex/variants.h"
 #include "activex/view_part.h"
 #include "framework/panel/field_panel.h"
@@ -53,13 +55,26 @@ inline constexpr StoredProperty kStoredAreas[] = {{L"DisplayPanelVisible", true}
                                                   {L"MeasurementPanelVisible", true}};
 inline constexpr DISPID kStoredAreaIds[] = {26, 27};
 
-template <class Dual>
+template <class Dual, class Panel>
 class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
                           public PanelEvents,
                           public PanelContainer {
  public:
-  FrontPanelControl(IUnknown* outer, const ControlClass& controlClass)
-      : Dispatching<DualControl<Dual>, Dual>(outer, controlClass), requests_(*this), baseObject_(*this) {}
+  // `ofPanel` is what the panel needs beyond its environment.
+  template <class... PanelServices>
+  FrontPanelControl(IUnknown* outer, const ControlClass& controlClass, const PanelServices&... ofPanel)
+      : Dispatching<DualControl<Dual>, Dual>(outer, controlClass),
+        requests_(*this),
+        baseObject_(*this),
+        panel_(environment(), ofPanel..., requests_, *this) {
+    this->window().events(this);
+    this->window().fields(panel_.controls());
+    panel_.Form_Resize();
+  }
+  ~FrontPanelControl() override {
+    this->window().fields(nullptr);
+    this->window().events(nullptr);
+  }
 
   // --- Entry points
   HRESULT STDMETHODCALLTYPE vfpOp(LONG hardwareId, short operation, VARIANT parameter,
@@ -224,6 +239,23 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
       paint();
       this->window().refresh();
     });
+  }
+
+  // --- Markers
+  HRESULT STDMETHODCALLTYPE addMarker() override {
+    return perform([&] { panel().addMarker(); });
+  }
+  HRESULT STDMETHODCALLTYPE addDeltaMarker() override {
+    return perform([&] { panel().addDeltaMarker(); });
+  }
+  HRESULT STDMETHODCALLTYPE deleteMarker() override {
+    return perform([&] { panel().deleteMarker(); });
+  }
+  HRESULT STDMETHODCALLTYPE markerToMax() override {
+    return perform([&] { panel().markerToMax(); });
+  }
+  HRESULT STDMETHODCALLTYPE markerToMin() override {
+    return perform([&] { panel().markerToMin(); });
   }
 
   // --- The surface that the graph is drawn on. The names are the panel's own.
@@ -408,10 +440,9 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
   }
 
  protected:
-  // The panel behind the control.
-  [[nodiscard]] virtual FieldPanel& panel() = 0;
-  [[nodiscard]] clsBaseVFP& base() { return panel().base(); }
-  [[nodiscard]] PanelHost& requests() noexcept { return requests_; }
+  [[nodiscard]] Panel& panel() noexcept { return panel_; }
+  [[nodiscard]] const Panel& panel() const noexcept { return panel_; }
+  [[nodiscard]] clsBaseVFP& base() { return panel_.base(); }
 
   // A call that hands a value out, through a pointer that a caller may have left null. The host may let go of
   // the control inside.
@@ -435,6 +466,17 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
   }
 
  private:
+  [[nodiscard]] void* findInterface(REFIID id) noexcept override {
+    if (id == __uuidof(Dual) || id == IID_IDispatch) return static_cast<Dual*>(this);
+    return this->findPart(id);
+  }
+
+  [[nodiscard]] PanelEnvironment environment() {
+    Services& shared = services();
+    return {shared.gdi, shared.windowing,    this->window(),
+            shared.hub, readScreenMetrics(), toUtf8(GetCommandLineW())};
+  }
+
   // The base as an object that lives with the control.
   class BaseInstance final : public BaseObject {
    public:
@@ -472,6 +514,7 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
 
   PanelRequests requests_;
   BaseInstance baseObject_;
+  Panel panel_;
 };
 
 }  // namespace frontpanels::activex

@@ -26,7 +26,6 @@ namespace {
 constexpr WORD kMajorVersion = 1;
 constexpr WORD kMinorVersion = 0;
 constexpr wchar_t kVersion[] = L"1.0";
-constexpr wchar_t kToolboxBitmap[] = L"101";
 // What containers list as controls.
 constexpr wchar_t kControlCategory[] = L"{40FC6ED4-2438-11CF-A3DB-080036F12502}";
 
@@ -93,12 +92,12 @@ std::vector<Entry> entriesOf(const ClassRow& row, const std::wstring& path) {
       {key + L"\\Version", nullptr, kVersion},
       {key + L"\\Programmable", nullptr, L""},
   };
-  if (!row.control) return entries;
+  if (row.toolboxBitmap == 0) return entries;
   const std::vector<Entry> ofControls = {
       {key + L"\\Control", nullptr, L""},
       {key + L"\\MiscStatus", nullptr, L"0"},
       {key + L"\\MiscStatus\\1", nullptr, std::to_wstring(kMiscStatus)},
-      {key + L"\\ToolboxBitmap32", nullptr, path + L", " + kToolboxBitmap},
+      {key + L"\\ToolboxBitmap32", nullptr, path + L", " + std::to_wstring(row.toolboxBitmap)},
       {key + L"\\Implemented Categories\\" + kControlCategory, nullptr, L""},
   };
   entries.insert(entries.end(), ofControls.begin(), ofControls.end());

@@ -1,24 +1,16 @@
 // FrontPanels.SpectrumView: the spectrum panel as a control.
 #pragma once
 
-#include <optional>
-
 #include "activex/front_panel_control.h"
 #include "frontpanels_h.h"
 #include "spectrum/spectrum_view.h"
 
 namespace frontpanels::activex {
 
-class SpectrumControl final : public FrontPanelControl<ISpectrumView> {
+class SpectrumControl final : public FrontPanelControl<ISpectrumView, SpectrumView> {
  public:
   explicit SpectrumControl(IUnknown* outer);
-  ~SpectrumControl() override;
 
-  HRESULT STDMETHODCALLTYPE addMarker() override;
-  HRESULT STDMETHODCALLTYPE markerToMax() override;
-  HRESULT STDMETHODCALLTYPE markerToMin() override;
-  HRESULT STDMETHODCALLTYPE deleteMarker() override;
-  HRESULT STDMETHODCALLTYPE addDeltaMarker() override;
   HRESULT STDMETHODCALLTYPE markerToCenter() override;
   HRESULT STDMETHODCALLTYPE updateMarkerButtons() override;
   HRESULT STDMETHODCALLTYPE evaluateEnablingMarkerToCenter() override;
@@ -31,12 +23,6 @@ class SpectrumControl final : public FrontPanelControl<ISpectrumView> {
   HRESULT STDMETHODCALLTYPE ChannelLookup(short channelization, short lowestOrder,
                                           short highestOrder) override;
   HRESULT STDMETHODCALLTYPE ClearChannels() override;
-
- private:
-  [[nodiscard]] void* findInterface(REFIID id) noexcept override;
-  [[nodiscard]] FieldPanel& panel() override { return *panel_; }
-
-  std::optional<SpectrumView> panel_;
 };
 
 }  // namespace frontpanels::activex
