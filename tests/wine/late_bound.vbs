@@ -1,20 +1,6 @@
-' A stranger's script: everything by name, nothing known beforehand. Its last line says that it came to its end.
-Option Explicit
-
+' The spectrum panel. Its last line says that the script came to its end.
 Const SpectrumPath = "Brantor Scanner/Spectrum/Spectrum Trace"
-Dim folder, diagnostics, panel, hub, buffer, length
-
-Sub Check(what, actual, expected)
-  If CStr(actual) = CStr(expected) Then
-    WScript.Echo "ok script: " & what
-  Else
-    WScript.Echo "not ok script: " & what & ": [" & actual & "], not [" & expected & "]"
-  End If
-End Sub
-
-Function LastMessage()
-  LastMessage = Replace(diagnostics.Message(diagnostics.Count - 1), vbCr, "|")
-End Function
+Dim panel, buffer, length
 
 Sub Statuses()
   Check "resource id is taken", panel.vfpSet(0, 315, 0, 7), 0
@@ -194,12 +180,7 @@ Sub Closing()
   Check "a sweep after the close is ignored", diagnostics.Count, 0
 End Sub
 
-folder = WScript.Arguments(0)
-Set diagnostics = CreateObject("FrontPanels.Diagnostics")
-diagnostics.ShowMessages = False
-diagnostics.Clear
 Set panel = CreateObject("FrontPanels.SpectrumView")
-Set hub = CreateObject("FrontPanels.DataHub.1")
 Check "messages can be kept without boxes", diagnostics.ShowMessages, False
 Statuses
 Errors

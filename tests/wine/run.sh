@@ -39,7 +39,8 @@ count() {
 
 # Script hosts hide every failure behind status 0: what counts is the last line.
 script() {
-  timeout 120 wine cscript //nologo "$(windows_path "$here/$1")" "$(windows_path "$out")" >"$out/$1.txt" 2>&1
+  cat "$here/checks.vbs" "$here/$1" >"$out/$1"
+  timeout 120 wine cscript //nologo "$(windows_path "$out/$1")" "$(windows_path "$out")" >"$out/$1.txt" 2>&1
   tr -d '\r' <"$out/$1.txt" | grep -E '^(ok|not ok) '
   passed=$((passed + $(grep -cE '^ok ' "$out/$1.txt")))
   failed=$((failed + $(grep -cE '^not ok ' "$out/$1.txt")))
@@ -139,11 +140,12 @@ timeout 60 wine regsvr32 /s "$(windows_path "$library")"
 judge $? "the library registers"
 export_classes registered
 for name in SpectrumView SpectrumView.1 DataHub DataHub.1 Diagnostics Diagnostics.1 ResultBuffer ResultBuffer.1 \
-  clsCellNameInfo clsCellNameInfo.1; do
+  clsCellNameInfo clsCellNameInfo.1 Tarvex Tarvex.1; do
   grep -qF "Classes\\FrontPanels.$name\\CLSID]" "$out/registered.txt"
   judge $? "FrontPanels.$name is in the registry"
 done
 script late_bound.vbs
+script pilots.vbs
 program container container_test "$(windows_path "$out")"
 program contract contract_test
 program foreign_container contract_test atl atl.dll
