@@ -55,9 +55,17 @@ class ValueAxis {
         originPx_(static_cast<double>(plot.top) + plot.height +
                   plot.height * range.minimum / range.extent()) {}
 
+  // Maps the smallest value to the left edge and the largest to the right one.
+  [[nodiscard]] static ValueAxis across(const PlotRect& plot, const ValueRange& range) noexcept {
+    const double pxPerUnit = static_cast<double>(plot.width) / range.extent();
+    return {-pxPerUnit, static_cast<double>(plot.left) - range.minimum * pxPerUnit};
+  }
+
   [[nodiscard]] double pixel(double value) const noexcept { return originPx_ - value * pxPerUnit_; }
 
  private:
+  ValueAxis(double pxPerUnit, double originPx) noexcept : pxPerUnit_(pxPerUnit), originPx_(originPx) {}
+
   double pxPerUnit_;
   double originPx_;
 };

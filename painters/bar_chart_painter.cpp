@@ -178,11 +178,22 @@ void clsBarChartPainter::suffixIs(std::int16_t suffix) {
   guard("clsBarChartPainter::suffixIs()...", [&] {
     requireBetween(suffix, 0, kSuffixes - 1);
     suffixIs_ = suffix;
+    yAxisLabel(valueUnit());
   });
 }
 
 void clsBarChartPainter::units(std::string_view text) {
-  guard("clsBarChartPainter::units()...", [&] { units_ = text; });
+  guard("clsBarChartPainter::units()...", [&] {
+    units_ = text;
+    yAxisLabel(valueUnit());
+  });
+}
+
+void clsBarChartPainter::numberOfHorizontalDivisions(std::int32_t divisions) {
+  guard("clsBarChartPainter::numberOfHorizontalDivisions()...", [&] {
+    requireDivisions(divisions);
+    numberOfHorizontalDivisions_ = divisions;
+  });
 }
 
 void clsBarChartPainter::ShowCellName(bool show) { showCellName_ = show; }
@@ -196,7 +207,7 @@ clsNumericEntry& clsBarChartPainter::xAxisFormatter() { return xAxisFormatter_; 
 void clsBarChartPainter::BarChartStyle(std::int16_t style) {
   guard("clsBarChartPainter::BarChartStyle()...", [&] {
     requireBetween(style, 0, 1);
-    style_ = style;
+    direction_ = static_cast<BarDirection>(style);
   });
 }
 
@@ -276,10 +287,9 @@ void clsBarChartPainter::SortBarsBySet() {
   });
 }
 
-std::span<const HeldBar> clsBarChartPainter::barsToPaint() const {
-  const std::span<const HeldBar> all = bars();
-  return barsToPaint_ == kAllBars ? all
-                                  : all.first(std::min(all.size(), static_cast<std::size_t>(barsToPaint_)));
+std::size_t clsBarChartPainter::countToPaint() const {
+  const std::size_t all = bars().size();
+  return barsToPaint_ == kAllBars ? all : std::min(all, static_cast<std::size_t>(barsToPaint_));
 }
 
 void clsBarChartPainter::DoAutoScale() {
@@ -289,13 +299,6 @@ void clsBarChartPainter::DoAutoScale() {
     if (values.found) fitAxis({values.minimum, values.maximum});
   });
 }
-
-void clsBarChartPainter::Paint(DcHandle /*dc*/) {
-  refreshStaleBars();
-  fullRedraw_ = false;
-}
-void clsBarChartPainter::Paint() {}
-void clsBarChartPainter::Label(DcHandle /*dc*/, const LabelFonts& /*fonts*/) {}
 
 float clsBarChartPainter::barValue(std::int32_t position) const {
   return guarded("clsBarChartPainter::barValue()...", 0.0F, [&] { return barAt(position).value; });

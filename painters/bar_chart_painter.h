@@ -6,6 +6,7 @@
 // the sorted order. Pixels are those of the off-screen surface, rectangles are half-open.
 #pragma once
 
+#include <array>
 #include <cstdint>
 #include <memory>
 #include <optional>
@@ -17,6 +18,7 @@
 #include "entry/numeric_entry.h"
 #include "painters/bar.h"
 #include "painters/bar_builder.h"
+#include "painters/bar_layout.h"
 #include "painters/bar_order.h"
 #include "painters/cell_names.h"
 #include "painters/plot_painter.h"
@@ -152,7 +154,8 @@ class clsBarChartPainter : public PlotPainter {
   // 1: the bar's value is among the quantities.
   [[nodiscard]] std::int16_t valueIs() const { return valueIs_; }
   void valueIs(std::int16_t which);
-  // The unit of the value axis and of values at bars: 0 that of `units`, 1 dB, 2 dBm, 3 chips.
+  // The unit of the value axis and of values at bars: 0 that of `units`, 1 dB, 2 dBm, 3 chips. Setting either
+  // of them writes it into yAxisLabel.
   [[nodiscard]] std::int16_t suffixIs() const { return suffixIs_; }
   void suffixIs(std::int16_t suffix);
   [[nodiscard]] const std::string& units() const { return units_; }
@@ -168,8 +171,12 @@ class clsBarChartPainter : public PlotPainter {
 
   // --- Appearance
 
+  // Grid lines along the bars: one more than divisions of the plot, up to 1000; none for 0 or less.
+  [[nodiscard]] std::int32_t numberOfHorizontalDivisions() const { return numberOfHorizontalDivisions_; }
+  void numberOfHorizontalDivisions(std::int32_t divisions);
+
   // 0 vertical bars side by side, 1 horizontal bars one below the other. Another style is refused.
-  [[nodiscard]] std::int16_t BarChartStyle() const { return style_; }
+  [[nodiscard]] std::int16_t BarChartStyle() const { return static_cast<std::int16_t>(direction_); }
   void BarChartStyle(std::int16_t style);
   // How bars are filled: 0 solid; 1 not at all, which leaves their border; 2 to 7 hatched horizontally,
   // vertically, diagonally down, diagonally up, crossed and crossed diagonally.
@@ -187,6 +194,9 @@ class clsBarChartPainter : public PlotPainter {
   // Directly on the surface of drawingArea, over its whole scale.
   void Paint();
   void drawMarkers(DcHandle /*dc*/) override {}
+  // Keys stand under vertical bars and before horizontal ones, quantities and names at their ends or on them.
+  // Texts that would overlap are left out, those of the strongest bars last; keys that found no room stand in
+  // the top row, the strongest first, as many as there is room for.
   void Label(DcHandle dc, const LabelFonts& fonts) override;
   void updateMarkerDisplay(DcHandle /*dc*/, const LabelFonts& /*fonts*/) override {}
 
@@ -217,7 +227,6 @@ class clsBarChartPainter : public PlotPainter {
   // --- Kept and given back: the interface that both painters share
   [[nodiscard]] std::int16_t xAxisStyle() const override { return xAxisStyle_(); }
   void xAxisStyle(std::int16_t style) override { xAxisStyle_(style); }
-  Property<std::int32_t> numberOfHorizontalDivisions{10};
   Property<bool> autoFormatX;
   Property<bool> useZas;
   [[nodiscard]] std::int16_t getDisplayStyle() const { return displayStyle_(); }
@@ -230,12 +239,37 @@ class clsBarChartPainter : public PlotPainter {
   template <class T>
   void sortBy(T& setting, const T& value);
   // Fills the records from the block, raising as fillBar does, and reports a quantity that is not known.
+  // How the members of one bar's text lie in its label.
+  struct Texts {
+    std::array<std::string_view, BarTextSizes::kQuantities + 1> parts;  // the key, then the quantities
+    std::size_t count = 0;
+  };
+  void paintPanel(DcHandle dc, const PlotRect& panel);
+  void PaintVerticalBarChart(DcHandle dc, const PlotRect& plot);
+  void PaintHorizontalBarChart(DcHandle dc, const PlotRect& plot);
+  void chooseAxis();
+  void paintBars(DcHandle dc, const BarFrame& frame);
+  void paintThreshold(DcHandle dc, const BarFrame& frame);
+  [[nodiscard]] std::int32_t shownDivisions() const override { return shownDivisions_; }
+  [[nodiscard]] BarFrame frameOf(const PlotRect& plot) const;
+
+  void LabelVerticalBarChart(DcHandle dc, const LabelFonts& fonts);
+  void LabelHorizontalBarChart(DcHandle dc, const LabelFonts& fonts);
+  void labelBars(DcHandle dc, const LabelFonts& fonts);
+  void composeTexts();
+  void composeText(HeldBar& bar, Texts& texts);
+  void layOutTexts(DcHandle dc, const BarFrame& frame);
+  void writeTexts(DcHandle dc);
+  void writeKeysWithoutRoom(DcHandle dc);
+  [[nodiscard]] std::string_view valueUnit() const;
+
   template <class ItemOf>
   void fillFromBlock(std::size_t count, ItemOf itemOf);
   void takeFilled();
   void refreshStaleBars();
   void SortBarsBySet();
-  [[nodiscard]] std::span<const HeldBar> barsToPaint() const;
+  [[nodiscard]] std::size_t countToPaint() const;
+  [[nodiscard]] std::span<const HeldBar> barsToPaint() const { return bars().first(countToPaint()); }
 
   Variant block_ = Variant::null();
   std::int32_t numberOfMeasurements_ = 0;
@@ -259,6 +293,7 @@ class clsBarChartPainter : public PlotPainter {
   bool sortFlag_ = false;
 
   double increment_ = 0;
+  std::int32_t shownDivisions_ = 10;
   std::int16_t barLabeling_ = 2;
   std::string barLabel_;
   std::int16_t valueIs_ = 0;
@@ -267,13 +302,20 @@ class clsBarChartPainter : public PlotPainter {
   bool showCellName_ = false;
   std::shared_ptr<const CellNames> cellNames_;
   clsNumericEntry xAxisFormatter_;
-  bool labelsStale_ = true;
 
-  std::int16_t style_ = 0;
+  BarDirection direction_ = BarDirection::Vertical;
+  std::int32_t numberOfHorizontalDivisions_ = 1;
   std::int16_t fillStyle_ = 0;
   Property<bool> drawBorders_;
   Property<std::int16_t> displayStyle_;
   Property<std::int16_t> xAxisStyle_;
+
+  // Storage of labelling, used again.
+  std::vector<Texts> texts_;
+  std::vector<BarTextSizes> sizes_;
+  std::vector<std::int32_t> lengthsPx_;
+  BarTextLayout layout_;
+  std::string keysWithoutRoom_;
 
   std::vector<std::int16_t> tracePns_;
   Property<std::int16_t> selectedTraceIndex_;

@@ -33,6 +33,7 @@ constexpr std::int32_t kGapBeforePlotPx = 4;
 constexpr std::int32_t kGapUnderPlotPx = 3;
 constexpr std::int32_t kGapAtPanelTopPx = 2;
 constexpr std::int32_t kGapBetweenRowsPx = 1;
+constexpr std::int32_t kGapBetweenLevelsPx = 6;
 
 // The places of the value and x axes, written in the axis font; the others are written in the corner font.
 constexpr std::array kAxisPlaces{LabelPlace::Left, LabelPlace::Right, LabelPlace::XAxis, LabelPlace::YUnit};
@@ -56,7 +57,8 @@ std::int32_t leftOf(const LabelFrame& frame, Across across, std::int32_t widthPx
 }
 
 std::int32_t topOf(const LabelFrame& frame, Row row, std::int32_t heightPx, std::int32_t linePx) {
-  const std::int32_t xAxisRow = frame.plot.bottom + kGapUnderPlotPx;
+  const std::int32_t below = frame.rowBeforeHeightPx == 0 ? 0 : frame.rowBeforeHeightPx + kGapBetweenRowsPx;
+  const std::int32_t xAxisRow = frame.plot.bottom + kGapUnderPlotPx + below;
   switch (row) {
     case Row::Line:
       return linePx - heightPx / 2;
@@ -68,10 +70,6 @@ std::int32_t topOf(const LabelFrame& frame, Row row, std::int32_t heightPx, std:
       break;
   }
   return frame.xAxisRowHeightPx == 0 ? xAxisRow : xAxisRow + frame.xAxisRowHeightPx + kGapBetweenRowsPx;
-}
-
-bool overlap(const Rect& a, const Rect& b) {
-  return a.left < b.right && b.left < a.right && a.top < b.bottom && b.top < a.bottom;
 }
 
 bool inside(const Rect& inner, const Rect& outer) {
@@ -101,6 +99,16 @@ void PlotLabels::text(LabelPlace place, std::string_view text) {
   stale_ = true;
 }
 
+void PlotLabels::valueAxisUnderPlot(bool under) {
+  stale_ = stale_ || under != valueAxisUnderPlot_;
+  valueAxisUnderPlot_ = under;
+}
+
+void PlotLabels::keepRowUnderPlot(std::int32_t heightPx) {
+  stale_ = stale_ || heightPx != keptRowHeightPx_;
+  keptRowHeightPx_ = heightPx;
+}
+
 void PlotLabels::draw(Gdi& gdi, DcHandle dc, const LabelFonts& fonts, const Rect& panel, const Rect& plot) {
   if (stale_ || inputs_ != Inputs{panel, plot, fonts.axis, fonts.corner}) {
     layOut(gdi, dc, fonts, panel, plot);
@@ -121,21 +129,27 @@ void PlotLabels::draw(Gdi& gdi, DcHandle dc, const LabelFonts& fonts, const Rect
 std::optional<Rect> PlotLabels::roomFor(LabelPlace place, Size extentPx, std::int32_t linePx) const {
   if (extentPx == Size{}) return std::nullopt;
   const Rect cell = labelCell(frame_, place, extentPx, linePx);
-  const bool free = std::none_of(placed_.begin(), placed_.end(),
-                                 [&cell](const Placed& label) { return overlap(label.cell, cell); });
-  return free && inside(cell, frame_.panel) ? std::optional(cell) : std::nullopt;
+  return isFree(cell) ? std::optional(cell) : std::nullopt;
+}
+
+bool PlotLabels::isFree(const Rect& cell) const {
+  return inside(cell, frame_.panel) && std::none_of(placed_.begin(), placed_.end(), [&](const Placed& label) {
+           return overlap(label.cell, cell);
+         });
 }
 
 void PlotLabels::layOut(Gdi& gdi, DcHandle dc, const LabelFonts& fonts, const Rect& panel, const Rect& plot) {
   placed_.clear();
   inputs_ = {panel, plot, fonts.axis, fonts.corner};
-  frame_ = {panel, plot, 0};
+  frame_ = {panel, plot, 0, keptRowHeightPx_};
   stale_ = false;
   {
     const SelectedFont selected(gdi, dc, fonts.axis);
-    layOutYAxis(gdi, dc);
+    valueAxisUnderPlot_ ? layOutYAxisUnderPlot(gdi, dc) : layOutYAxis(gdi, dc);
     layOutXAxisRow(gdi, dc);
-    for (const LabelPlace place : kAxisPlaces) placeText(gdi, dc, place);
+    for (const LabelPlace place : kAxisPlaces) {
+      if (place != LabelPlace::YUnit || !valueAxisUnderPlot_) placeText(gdi, dc, place);
+    }
   }
   const SelectedFont selected(gdi, dc, fonts.corner);
   for (const LabelPlace place : kCornerPlaces) placeText(gdi, dc, place);
@@ -153,6 +167,36 @@ void PlotLabels::layOutYAxis(Gdi& gdi, DcHandle dc) {
         divisionLinePx(static_cast<float>(plot.top), static_cast<float>(plot.height()), i, divisions);
     place(LabelPlace::YAxis, text, measure(gdi, dc, text), line);
   }
+}
+
+// A label at an end of the axis is moved into the panel where it would not fit centred.
+void PlotLabels::layOutYAxisUnderPlot(Gdi& gdi, DcHandle dc) {
+  if (yAxisTexts_.size() < 2) return;
+  const auto divisions = static_cast<std::int32_t>(yAxisTexts_.size() - 1);
+  const std::string& unit = text(LabelPlace::YUnit);
+  topLevel_.assign(yAxisTexts_.front()).append(unit.empty() ? "" : " ").append(unit);
+  Size widest{};
+  for (const std::string& text : yAxisTexts_) {
+    const Size extent = measure(gdi, dc, text);
+    widest = {std::max(widest.width, extent.width), std::max(widest.height, extent.height)};
+  }
+  const Rect& plot = frame_.plot;
+  const std::int32_t lines = linesPerLabel(plot.width(), divisions, widest.width + kGapBetweenLevelsPx);
+  for (std::int32_t i = 0; i <= divisions; i += lines) {
+    const std::string& text = i == 0 ? topLevel_ : yAxisTexts_[static_cast<std::size_t>(i)];
+    const std::int32_t line = divisionLinePx(static_cast<float>(plot.left), static_cast<float>(plot.width()),
+                                             divisions - i, divisions);
+    placeUnderPlot(text, measure(gdi, dc, text), line);
+  }
+  frame_.rowBeforeHeightPx = widest.height;
+}
+
+void PlotLabels::placeUnderPlot(std::string_view text, Size extentPx, std::int32_t linePx) {
+  const std::int32_t lastLeft = frame_.panel.right - extentPx.width;
+  const std::int32_t left = std::max(frame_.panel.left, std::min(linePx - extentPx.width / 2, lastLeft));
+  const std::int32_t top = frame_.plot.bottom + kGapUnderPlotPx;
+  const Rect cell{left, top, left + extentPx.width, top + extentPx.height};
+  if (extentPx != Size{} && isFree(cell)) placed_.push_back({cell, text, LabelPlace::YAxis});
 }
 
 void PlotLabels::layOutXAxisRow(Gdi& gdi, DcHandle dc) {

@@ -17,14 +17,14 @@ namespace frontpanels {
 // In the order in which places are given away: a label that would leave the panel or overlap one before it is
 // left out.
 enum class LabelPlace : std::uint8_t {
-  YAxis,         // at each horizontal grid line, right-aligned before the plot
-  Left,          // under the plot, from its left edge
-  Right,         // under the plot, up to its right edge
-  XAxis,         // under the plot, centred
-  YUnit,         // top row, right-aligned before the plot
-  Top,           // top row, from the plot's left edge
-  TopCenter,     // top row, centred over the plot
-  Bottom,        // below the axis labels, from the plot's left edge
+  YAxis,      // at each grid line of the value axis: right-aligned before the plot, or centred under it
+  Left,       // under the plot, from its left edge
+  Right,      // under the plot, up to its right edge
+  XAxis,      // under the plot, centred
+  YUnit,      // top row, right-aligned before the plot; with the value axis under the plot, at its top level
+  Top,        // top row, from the plot's left edge
+  TopCenter,  // top row, centred over the plot
+  Bottom,     // below the axis labels, from the plot's left edge
   BottomCenter,  // below the axis labels, centred
   Readout,       // top row, up to the plot's right edge
 };
@@ -34,7 +34,8 @@ inline constexpr std::size_t kLabelPlaces = 10;
 struct LabelFrame {
   Rect panel;
   Rect plot;
-  std::int32_t xAxisRowHeightPx = 0;  // 0 when nothing stands under the plot
+  std::int32_t xAxisRowHeightPx = 0;   // 0 when no label of the x axis stands under the plot
+  std::int32_t rowBeforeHeightPx = 0;  // of what stands between them and the plot
   friend bool operator==(const LabelFrame&, const LabelFrame&) = default;
 };
 
@@ -66,9 +67,16 @@ class PlotLabels {
   }
   [[nodiscard]] const std::vector<std::string>& yAxisTexts() const noexcept { return yAxisTexts_; }
 
+  // Whether the value axis runs along under the plot, from left to right, instead of up beside it.
+  void valueAxisUnderPlot(bool under);
+  // Keeps the first row under the plot, of this height, for whoever writes there.
+  void keepRowUnderPlot(std::int32_t heightPx);
+
   // Writes the labels round the plot in the colour of button texts on whatever lies there. Texts are measured
   // anew only when something has changed.
   void draw(Gdi& gdi, DcHandle dc, const LabelFonts& fonts, const Rect& panel, const Rect& plot);
+  // Whether a cell lies within the panel and clear of the labels that were drawn last.
+  [[nodiscard]] bool isFree(const Rect& cell) const;
   // The cell of one more label beside those that were drawn last, if there is room for it.
   [[nodiscard]] std::optional<Rect> roomFor(LabelPlace place, Size extentPx, std::int32_t linePx = 0) const;
 
@@ -83,13 +91,18 @@ class PlotLabels {
 
   void layOut(Gdi& gdi, DcHandle dc, const LabelFonts& fonts, const Rect& panel, const Rect& plot);
   void layOutYAxis(Gdi& gdi, DcHandle dc);
+  void layOutYAxisUnderPlot(Gdi& gdi, DcHandle dc);
   void layOutXAxisRow(Gdi& gdi, DcHandle dc);
   void placeText(Gdi& gdi, DcHandle dc, LabelPlace place);
   void place(LabelPlace place, std::string_view text, Size extentPx, std::int32_t linePx = 0);
+  void placeUnderPlot(std::string_view text, Size extentPx, std::int32_t linePx);
   [[nodiscard]] Size measure(Gdi& gdi, DcHandle dc, std::string_view text);
 
   std::array<std::string, kLabelPlaces> texts_;
   std::vector<std::string> yAxisTexts_;
+  std::string topLevel_;  // with its unit, where the value axis lies under the plot
+  bool valueAxisUnderPlot_ = false;
+  std::int32_t keptRowHeightPx_ = 0;
   bool stale_ = true;
   Inputs inputs_;
   LabelFrame frame_;

@@ -166,8 +166,12 @@ void PlotPainter::drawLabels(DcHandle dc, const LabelFonts& fonts) {
 }
 
 void PlotPainter::clearArea(DcHandle dc) {
-  guard("clearArea() ...",
-        [&] { gdi_.fillRect(dc, panel_.toPixels(), gdi_.sysColorBrush(SystemColor::ButtonFace)); });
+  guard("clearArea() ...", [&] { fillWithBackground(dc, panel_); });
+}
+
+void PlotPainter::fillWithBackground(DcHandle dc, const PlotRect& area) {
+  const BrushHandle background = gdi_.sysColorBrush(SystemColor::ButtonFace);
+  if (background) gdi_.fillRect(dc, area.toPixels(), background);
 }
 
 // --- Markers

@@ -161,6 +161,7 @@ class PlotPainter : public TraceObject {
   [[nodiscard]] virtual std::int32_t shownDivisions() const { return numberOfVerticalDivisions_; }
   // The value axis's labels are out of date.
   void forgetYAxisLabels() noexcept { labelledRange_.reset(); }
+  void fillWithBackground(DcHandle dc, const PlotRect& area);
   void drawGridOver(DcHandle dc, const PlotRect& plot, const GridDivisions& divisions);
   void drawLabels(DcHandle dc, const LabelFonts& fonts);
 

@@ -33,4 +33,9 @@ struct Rect {
   friend bool operator==(const Rect&, const Rect&) = default;
 };
 
+// Whether they have a pixel in common; neither is empty.
+[[nodiscard]] constexpr bool overlap(const Rect& a, const Rect& b) noexcept {
+  return a.left < b.right && b.left < a.right && a.top < b.bottom && b.top < a.bottom;
+}
+
 }  // namespace frontpanels
