@@ -13,6 +13,15 @@ PenHandle CapturingGdi::createPen(PenStyle style, std::int32_t widthPx, Color co
   return pen;
 }
 
+BrushHandle CapturingGdi::createSolidBrush(Color color) {
+  const BrushHandle brush = gdi_.createSolidBrush(color);
+  if (capturing_) {
+    createdBrushes_[brush.value] = brushes_;
+    keep(CreateBrush{brushes_++, color});
+  }
+  return brush;
+}
+
 RegionHandle CapturingGdi::createRectRgn(Rect rect) {
   const RegionHandle region = gdi_.createRectRgn(rect);
   if (capturing_) regions_[region.value] = rect;
@@ -25,6 +34,14 @@ bool CapturingGdi::deleteObject(PenHandle pen) {
     created_.erase(found);
   }
   return gdi_.deleteObject(pen);
+}
+
+bool CapturingGdi::deleteObject(BrushHandle brush) {
+  if (const auto found = createdBrushes_.find(brush.value); found != createdBrushes_.end()) {
+    keep(DeleteBrush{found->second});
+    createdBrushes_.erase(found);
+  }
+  return gdi_.deleteObject(brush);
 }
 
 bool CapturingGdi::deleteObject(RegionHandle region) {
@@ -65,7 +82,10 @@ BackgroundMode CapturingGdi::setBkMode(DcHandle dc, BackgroundMode mode) {
 }
 
 bool CapturingGdi::fillRect(DcHandle dc, Rect rect, BrushHandle brush) {
-  keep(Fill{dc, rect, brush});
+  if (const auto found = createdBrushes_.find(brush.value); found != createdBrushes_.end())
+    keep(FillWithCreated{dc, rect, found->second});
+  else
+    keep(Fill{dc, rect, brush});
   return gdi_.fillRect(dc, rect, brush);
 }
 
@@ -102,12 +122,16 @@ bool CapturingGdi::bitBlt(DcHandle to, Rect destination, DcHandle from, Point so
 struct CapturingGdi::Player {
   Gdi& gdi;
   std::vector<PenHandle>& pens;
+  std::vector<BrushHandle>& brushes;
   std::vector<Point>& points;
   std::span<const std::span<const float>> traces;
   const PlotMapping& map;
 
   void operator()(const CreatePen& c) { pens[c.slot] = gdi.createPen(c.style, c.widthPx, c.color); }
   void operator()(const DeletePen& c) { gdi.deleteObject(pens[c.slot]); }
+  void operator()(const CreateBrush& c) { brushes[c.slot] = gdi.createSolidBrush(c.color); }
+  void operator()(const DeleteBrush& c) { gdi.deleteObject(brushes[c.slot]); }
+  void operator()(const FillWithCreated& c) { gdi.fillRect(c.dc, c.rect, brushes[c.slot]); }
   void operator()(const SelectCreatedPen& c) { gdi.selectObject(c.dc, pens[c.slot]); }
   void operator()(const SelectPen& c) { gdi.selectObject(c.dc, c.pen); }
   void operator()(const SelectFont& c) { gdi.selectObject(c.dc, c.font); }
@@ -137,10 +161,11 @@ struct CapturingGdi::Player {
 
 void CapturingGdi::draw(std::span<const std::span<const float>> traces, const PlotMapping& mapping) {
   drawnPens_.resize(pens_);
+  drawnBrushes_.resize(brushes_);
   std::size_t longest = 0;
   for (const std::span<const float> trace : traces) longest = std::max(longest, trace.size());
   points_.resize(longest);
-  Player player{gdi_, drawnPens_, points_, traces, mapping};
+  Player player{gdi_, drawnPens_, drawnBrushes_, points_, traces, mapping};
   for (const Call& call : calls_) std::visit(player, call);
 }
 

@@ -31,6 +31,7 @@ class CapturingGdi : public Gdi {
   void start() {
     calls_.clear();
     created_.clear();
+    createdBrushes_.clear();
     traces_ = 0;
     capturing_ = true;
   }
@@ -44,7 +45,7 @@ class CapturingGdi : public Gdi {
     return gdi_.createCompatibleBitmap(dc, size);
   }
   PenHandle createPen(PenStyle style, std::int32_t widthPx, Color color) override;
-  BrushHandle createSolidBrush(Color color) override { return gdi_.createSolidBrush(color); }
+  BrushHandle createSolidBrush(Color color) override;
   BrushHandle createHatchBrush(HatchStyle style, Color color) override {
     return gdi_.createHatchBrush(style, color);
   }
@@ -52,7 +53,7 @@ class CapturingGdi : public Gdi {
   RegionHandle createRectRgn(Rect rect) override;
   bool deleteObject(BitmapHandle bitmap) override { return gdi_.deleteObject(bitmap); }
   bool deleteObject(PenHandle pen) override;
-  bool deleteObject(BrushHandle brush) override { return gdi_.deleteObject(brush); }
+  bool deleteObject(BrushHandle brush) override;
   bool deleteObject(FontHandle font) override { return gdi_.deleteObject(font); }
   bool deleteObject(RegionHandle region) override;
   PenHandle stockPen(StockPen pen) override { return gdi_.stockPen(pen); }
@@ -90,6 +91,18 @@ class CapturingGdi : public Gdi {
     Color color;
   };
   struct DeletePen {
+    std::size_t slot;
+  };
+  struct CreateBrush {
+    std::size_t slot;
+    Color color;
+  };
+  struct DeleteBrush {
+    std::size_t slot;
+  };
+  struct FillWithCreated {
+    DcHandle dc;
+    Rect rect;
     std::size_t slot;
   };
   struct SelectCreatedPen {
@@ -153,7 +166,8 @@ class CapturingGdi : public Gdi {
     RasterOp operation;
   };
   using Call = std::variant<CreatePen, DeletePen, SelectCreatedPen, SelectPen, SelectFont, Clip, Unclip,
-                            TextColor, TextMode, Fill, MoveTo, LineTo, Line, Trace, Text, Blit>;
+                            TextColor, TextMode, CreateBrush, DeleteBrush, FillWithCreated, Fill, MoveTo,
+                            LineTo, Line, Trace, Text, Blit>;
   struct Player;
 
   template <class C>
@@ -165,10 +179,13 @@ class CapturingGdi : public Gdi {
   bool capturing_ = false;
   std::vector<Call> calls_;
   std::map<std::uintptr_t, std::size_t> created_;  // pens alive while capturing: handle to slot
+  std::map<std::uintptr_t, std::size_t> createdBrushes_;
   std::map<std::uintptr_t, Rect> regions_;
   std::size_t pens_ = 0;
+  std::size_t brushes_ = 0;
   std::size_t traces_ = 0;
   std::vector<PenHandle> drawnPens_;
+  std::vector<BrushHandle> drawnBrushes_;
   std::vector<Point> points_;
 };
 

@@ -1,10 +1,12 @@
 #include "bench/paint_traces_report.h"
 
 #include <algorithm>
+#include <array>
 #include <chrono>
 #include <cstdio>
 
 #include "bench/allocation_count.h"
+#include "bench/bar_chart_scene.h"
 #include "bench/paint_traces_scene.h"
 #include "bench/spectrum_panel_scene.h"
 
@@ -62,6 +64,10 @@ bool reportPaintTraces(Gdi& gdi, DcHandle view, const ReadPixels& readPixels, in
   for (const SceneSize& size : kSceneSizes) {
     PaintTracesScene scene(gdi, view, size);
     same = report(scene, readPixels, rounds) && same;
+  }
+  for (const std::int16_t style : std::array<std::int16_t, 2>{0, 1}) {
+    BarChartScene chart(gdi, view, style);
+    same = report(chart, readPixels, rounds) && same;
   }
   SpectrumPanelScene panel(gdi, view);
   return report(panel, readPixels, rounds) && same;

@@ -81,6 +81,27 @@ TEST_F(PlotLabelsTest, ValueLabelsAreThinnedWhereLinesAreCloserThanText) {
   EXPECT_EQ(drawn(), (Lines{"axis 0 38,14", "axis 2 38,34", "axis 4 38,54", "axis 6 38,74", "axis 8 38,94"}));
 }
 
+TEST_F(PlotLabelsTest, TheValueAxisMayLieUnderThePlot) {
+  labels.valueAxisUnderPlot(true);
+  labels.yAxisTexts() = {"0", "-50", "-100"};
+  labels.text(LabelPlace::YUnit, "dBm");
+  labels.text(LabelPlace::XAxis, "level");
+  panel.right = 265;
+  EXPECT_EQ(drawn(), (Lines{"axis 0 dBm 225,103",     // 40 wide on line 250, moved into the panel
+                            "axis -50 138,103",       // line 150
+                            "axis -100 34,103",       // line 50
+                            "axis level 130,116"}));  // a row below
+  labels.yAxisTexts() = {"0", "1", "2", "3",   "4",   "5",  "6",
+                         "7", "8", "9", "-10", "-11", "-12"};  // 16.7 apart
+  EXPECT_EQ(drawn().size(), 1U + 7);                           // 24 wide and 6 between them: every second
+  labels.valueAxisUnderPlot(false);
+  labels.keepRowUnderPlot(20);
+  EXPECT_EQ(drawn().back(), "axis dBm 22,2");
+  EXPECT_EQ(labels.roomFor(LabelPlace::XAxis, {8, 12}), std::nullopt);  // the label is at 103 + 20 + 1
+  EXPECT_TRUE(labels.isFree({130, 103, 170, 123}));
+  EXPECT_FALSE(labels.isFree({130, 103, 170, 125}));
+}
+
 TEST_F(PlotLabelsTest, TextsAreMeasuredAgainOnlyAfterAChangeOrAFailure) {
   labels.text(LabelPlace::Left, "98 MHz");
   gdi.failAlways("textExtent");
