@@ -189,7 +189,7 @@ void ItemList::AddItem(std::string text, std::int32_t data, std::int32_t index) 
   if (index < 0 || index > ListCount()) raiseSubscriptOutOfRange();
   items_.insert(items_.begin() + index, Item{std::move(text), data});
   if (index <= listIndex_) ++listIndex_;
-  tell(ControlChange::Items);
+  if (peer() != nullptr) peer()->itemAdded(index);
 }
 
 void ItemList::RemoveItem(std::int32_t index) {
@@ -199,7 +199,7 @@ void ItemList::RemoveItem(std::int32_t index) {
     listIndex_ = -1;
   else if (index < listIndex_)
     --listIndex_;
-  tell(ControlChange::Items);
+  if (peer() != nullptr) peer()->itemRemoved(index);
 }
 
 void ItemList::Clear() {

@@ -66,6 +66,10 @@ class ControlPeer {
   virtual ~ControlPeer() = default;
 
   virtual void changed(ControlChange what) = 0;
+  // A list has a new item at `index`, or has the one at `index` no more: a window that knows which can follow
+  // a long list at little cost.
+  virtual void itemAdded(std::int32_t /*index*/) { changed(ControlChange::Items); }
+  virtual void itemRemoved(std::int32_t /*index*/) { changed(ControlChange::Items); }
   // Moves the keyboard focus to the window.
   virtual void takeFocus() = 0;
   // A refused entry: a soft sound.

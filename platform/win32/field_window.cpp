@@ -178,11 +178,18 @@ class TextField final : public FieldWindow {
 struct ListMessages {
   UINT reset;
   UINT add;
+  UINT insert;
+  UINT remove;
   UINT getSelection;
   UINT setSelection;
 };
-constexpr ListMessages kComboMessages{CB_RESETCONTENT, CB_ADDSTRING, CB_GETCURSEL, CB_SETCURSEL};
-constexpr ListMessages kListMessages{LB_RESETCONTENT, LB_ADDSTRING, LB_GETCURSEL, LB_SETCURSEL};
+constexpr ListMessages kComboMessages{CB_RESETCONTENT, CB_ADDSTRING, CB_INSERTSTRING,
+                                      CB_DELETESTRING, CB_GETCURSEL, CB_SETCURSEL};
+constexpr ListMessages kListMessages{LB_RESETCONTENT, LB_ADDSTRING, LB_INSERTSTRING,
+                                     LB_DELETESTRING, LB_GETCURSEL, LB_SETCURSEL};
+
+// The window always has the first items of its model, all of them once it has taken in the latest: those that
+// are added at the end wait for each other, what changes before that end changes in the window at once.
 
 class ListField final : public FieldWindow {
  public:
@@ -216,31 +223,39 @@ class ListField final : public FieldWindow {
 
   void changed(ControlChange what) override {
     if (what == ControlChange::Items) {
-      // Once for many items that come one after the other.
-      if (!std::exchange(stale_, true)) defer(kItems);
+      empty();
+      awaitItems();
     } else if (what == ControlChange::ListIndex) {
-      if (!stale_) showSelection();
+      showSelection();
     } else {
       FieldWindow::changed(what);
     }
   }
 
+  void itemAdded(std::int32_t index) override {
+    if (index >= shown_) return awaitItems();
+    send(messages_.insert, index);
+    ++shown_;
+    showSelection();
+  }
+
+  void itemRemoved(std::int32_t index) override {
+    if (index >= shown_) return;
+    SendMessageW(window(), messages_.remove, static_cast<WPARAM>(index), 0);
+    --shown_;
+    showSelection();
+  }
+
  protected:
   void showContents() override {
-    stale_ = false;
-    SendMessageW(window(), WM_SETREDRAW, FALSE, 0);
-    SendMessageW(window(), messages_.reset, 0, 0);
-    for (std::int32_t index = 0; index < list_.ListCount(); ++index)
-      SendMessageW(window(), messages_.add, 0,
-                   reinterpret_cast<LPARAM>(toUtf16(list_.item(index).text).c_str()));
-    SendMessageW(window(), WM_SETREDRAW, TRUE, 0);
+    empty();
+    showNewItems();
     showSelection();
-    InvalidateRect(window(), nullptr, TRUE);
   }
 
   void deferred(WPARAM work) override {
-    if (stale_) showContents();
-    if (work != kChoice || dropped()) return;  // while the list is down, the user is still looking
+    if (work == kItems) return showNewItems();
+    if (dropped()) return;  // while the list is down, the user is still looking
     if (std::exchange(cancelled_, false)) return showSelection();
     const auto index = static_cast<std::int32_t>(SendMessageW(window(), messages_.getSelection, 0, 0));
     if (index != list_.ListIndex() && index >= 0) list_.userChoice(index);
@@ -265,14 +280,38 @@ class ListField final : public FieldWindow {
   [[nodiscard]] bool dropped() const {
     return combo_ && SendMessageW(window(), CB_GETDROPPEDSTATE, 0, 0) != 0;
   }
+  // Once for many items that come one after the other.
+  void awaitItems() {
+    if (!std::exchange(awaiting_, true)) defer(kItems);
+  }
+  void empty() {
+    SendMessageW(window(), messages_.reset, 0, 0);
+    shown_ = 0;
+  }
+  void send(UINT message, std::int32_t index) {
+    SendMessageW(window(), message, static_cast<WPARAM>(index),
+                 reinterpret_cast<LPARAM>(toUtf16(list_.item(index).text).c_str()));
+  }
+  void showNewItems() {
+    awaiting_ = false;
+    const std::int32_t first = shown_;
+    SendMessageW(window(), WM_SETREDRAW, FALSE, 0);
+    for (; shown_ < list_.ListCount(); ++shown_) send(messages_.add, shown_);
+    SendMessageW(window(), WM_SETREDRAW, TRUE, 0);
+    if (list_.ListIndex() >= first) showSelection();
+    InvalidateRect(window(), nullptr, TRUE);
+  }
+  // An item that has not come into the window yet is selected with its coming.
   void showSelection() {
+    if (list_.ListIndex() >= shown_) return;
     SendMessageW(window(), messages_.setSelection, static_cast<WPARAM>(list_.ListIndex()), 0);
   }
 
   ItemList& list_;
   bool combo_;
   const ListMessages& messages_;
-  bool stale_ = false;
+  std::int32_t shown_ = 0;
+  bool awaiting_ = false;
   bool cancelled_ = false;
 };
 

@@ -65,6 +65,24 @@ TEST(ControlSetTest, ReadsTheTableAndRefusesAFaultyOne) {
   for (const auto& [number, action] : faults) EXPECT_EQ(errorNumber(action), number);
 }
 
+TEST(ItemListTest, TellsItsWindowWhichItemCameOrWent) {
+  struct : ControlPeer {
+    std::string heard;
+    void changed(ControlChange what) override { heard += what == ControlChange::Items ? " all" : " ?"; }
+    void itemAdded(std::int32_t index) override { heard += " +" + std::to_string(index); }
+    void itemRemoved(std::int32_t index) override { heard += " -" + std::to_string(index); }
+    void takeFocus() override {}
+    void beep() override {}
+  } window;
+  ItemList list(ControlKind::ListBox, "Pn");
+  list.peer(&window);
+  for (const char* text : {"a", "b"}) list.AddItem(text, 0);
+  list.AddItem("c", 0, 1);
+  list.RemoveItem(2);
+  list.Clear();
+  EXPECT_EQ(window.heard, " +0 +1 +1 -2 all");
+}
+
 TEST(ConstituentTest, TypesOverWhatIsSelectedUnlessAKeyIsConsumed) {
   ControlSet set(testing::kSampleRows);
   TextBox& box = set.textBox("Span");

@@ -6,6 +6,7 @@
 
 #include <map>
 #include <optional>
+#include <random>
 #include <span>
 #include <string>
 
@@ -47,6 +48,8 @@ class WindowPanel final : public SamplePanel, public FieldsOwner {
   void type(const std::string& text) override;
   void click(Control& control, int downPercent) override;
 
+  void pump();
+
   int failures = 0;
   HWND window = nullptr;
   std::optional<Win32Controls> controls;
@@ -58,7 +61,6 @@ class WindowPanel final : public SamplePanel, public FieldsOwner {
  private:
   void run(const std::function<void()>& body) noexcept override;
   static LRESULT CALLBACK procedure(HWND window, UINT message, WPARAM wide, LPARAM extra) noexcept;
-  void pump();
 };
 
 WindowPanel::WindowPanel() {
@@ -240,6 +242,50 @@ void eventsMayTakeTheWindowsAway() {
     }
 }
 
+// One step of a program that fills a list and changes it, with whatever the window does in between.
+void step(WindowPanel& panel, ItemList& list, std::mt19937& random) {
+  const std::int32_t count = list.ListCount();
+  const auto anywhere = [&] { return static_cast<std::int32_t>(random() % static_cast<unsigned>(count)); };
+  const unsigned kind = random() % 100;
+  if (kind < 50 || count == 0) return list.AddItem("item " + std::to_string(random() % 1000), 0);
+  if (kind < 60) return list.AddItem("early " + std::to_string(random() % 1000), 0, anywhere());
+  if (kind < 75) return list.RemoveItem(anywhere());
+  if (kind < 85) return list.ListIndex(anywhere());
+  if (kind == 85) return list.Clear();
+  if (kind < 95) panel.pump();
+}
+
+std::string contentsOf(HWND list, bool combo) {
+  const auto ask = [&](UINT ofCombo, UINT ofList, int index, void* into) {
+    return SendMessageW(list, combo ? ofCombo : ofList, static_cast<WPARAM>(index),
+                        reinterpret_cast<LPARAM>(into));
+  };
+  std::string all = std::to_string(ask(CB_GETCURSEL, LB_GETCURSEL, 0, nullptr));
+  for (int index = 0; index < ask(CB_GETCOUNT, LB_GETCOUNT, 0, nullptr); ++index) {
+    wchar_t text[100] = {};
+    ask(CB_GETLBTEXT, LB_GETTEXT, index, text);
+    all += "|" + toUtf8(text);
+  }
+  return all;
+}
+
+void listsFollowTheirModels() {
+  WindowPanel panel;
+  std::mt19937 random(11);
+  for (const char* const name : {"Type", "Pn"}) {
+    ItemList& list = panel.set.list(name);
+    int strange = 0;
+    for (int round = 0; round < 40; ++round) {
+      for (int i = 0; i < 50; ++i) step(panel, list, random);
+      panel.pump();
+      std::string wanted = std::to_string(list.ListIndex());
+      for (std::int32_t index = 0; index < list.ListCount(); ++index) wanted += "|" + list.item(index).text;
+      strange += contentsOf(panel.of(name), list.kind() == ControlKind::ComboBox) != wanted;
+    }
+    expect(strange == 0, std::string(name) + " shows its items and its choice, however they came and went");
+  }
+}
+
 void isScaledAndPictured(const std::string& folder) {
   WindowPanel panel;
   const RECT box = placeIn(panel.window, panel.of("Center"));
@@ -273,6 +319,7 @@ int main(int count, char** arguments) {
   chapter("fields");
   isUsedAsItsModels();
   eventsMayTakeTheWindowsAway();
+  listsFollowTheirModels();
   isScaledAndPictured(count > 1 ? arguments[1] : ".");
   CoUninitialize();
   return verdict();
