@@ -252,6 +252,15 @@ TEST_F(BarPaintTest, KeysWithoutRoomStandInTheTopRowAsFarAsTheyFit) {
             "101, 103, 105, 107 104,2");
 }
 
+TEST_F(BarPaintTest, TheTopRowGivesWayToTextsOfBarsThatReachIt) {
+  Items items;
+  for (int i = 0; i < 10; ++i) items.emplace_back(100.0F + static_cast<float>(i), 0.0F);
+  chart.valueIs(1);
+  update(items);
+  (void)written();  // every second bar has "0.0" at 11 to 23, the row is at 2 to 14
+  EXPECT_EQ(gdi.texts().back().text, "0.0");
+}
+
 TEST_F(BarPaintTest, WhatCannotBePaintedIsLeftOutOrReported) {
   update({{5, -25}});
   chart.scaleWidth(60);  // no plot between the insets

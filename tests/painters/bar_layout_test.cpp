@@ -198,6 +198,11 @@ TEST_F(BarTextTest, QuantitiesKeepClearOfOtherBarsAndTexts) {
   EXPECT_EQ(placed(), "0.1 52,57 | 1.1 102,57");
   layOut(kUp, {-50, -50, -90, -90}, {of(48), of(48), {}, {}}, false);
   EXPECT_EQ(placed(), "0.1 51,57");
+  // To 110, over the next bar: that may end a pixel farther, where the text begins, and no more.
+  layOut(kUp, {-50, -49, -90, -90}, {of(60), {}, {}, {}}, false);
+  EXPECT_EQ(placed(), "0.1 50,57");
+  layOut(kUp, {-50, -48, -90, -90}, {of(60), {}, {}, {}}, false);
+  EXPECT_EQ(placed(), "");
   // A text that begins 12 below another is clear of it however wide they are.
   layOut(kUp, {-50, -62, -90, -90}, {of(60), of(60), {}, {}}, false);
   EXPECT_EQ(placed(), "0.1 50,57 | 1.1 95,69");
