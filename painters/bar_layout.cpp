@@ -21,7 +21,7 @@ struct Gaps {
   std::int32_t betweenBars;  // of the texts of two of them
   std::int32_t overBar;  // by which a cell may be larger than the bar it stands in: letters have air there
 };
-constexpr std::array<Gaps, 2> kGaps{{{3, 1, 0, 4, 0}, {4, 4, 8, 0, 4}}};
+constexpr std::array<Gaps, 2> kGaps{{{3, 1, 0, 4, 0}, {4, 4, 8, 0, 2}}};
 
 const Gaps& gapsOf(const BarFrame& frame) { return kGaps[static_cast<std::size_t>(frame.direction())]; }
 

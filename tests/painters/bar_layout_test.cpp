@@ -179,11 +179,11 @@ TEST_F(BarTextTest, QuantitiesWithoutRoomAtTheEndStandInTheBar) {
   EXPECT_EQ(placed(), "");
   layOut(kAcross, {-20}, {two}, false);  // the end is at 210: room for the first alone
   EXPECT_EQ(placed(), "0.1 214,63");
-  // 100 pixels in ten slots: bars of 8 may hold letters of 12, four more, but slots of 10 may not.
-  layOut(kAcross, std::vector<double>(10, 0.0), std::vector<BarTextSizes>(10, two));
-  EXPECT_EQ(placed(), "");
+  // Bars of 11 pixels hold letters of 12, which have air over and under them; bars of 9 do not.
   layOut(kAcross, std::vector<double>(8, 0.0), std::vector<BarTextSizes>(8, two));
-  EXPECT_EQ(layout.placed().size(), 16U);  // slots of 12.5, bars of 9
+  EXPECT_EQ(placed(), "");
+  layOut(kAcross, std::vector<double>(7, 0.0), std::vector<BarTextSizes>(7, two));
+  EXPECT_EQ(layout.placed().size(), 14U);
 }
 
 TEST_F(BarTextTest, QuantitiesKeepClearOfOtherBarsAndTexts) {
