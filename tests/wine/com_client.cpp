@@ -13,7 +13,24 @@ int passed = 0;
 int failed = 0;
 std::string about;
 
+constexpr PanelKind kPanels[] = {
+    {L"SpectrumView", 10, L"Brantor Scanner/Spectrum/Spectrum Trace", -100, nullptr},
+    {L"Tarvex", 14, L"Brantor Scanner/CDMA All Pilots/AllPilotsTrace", -45, L"DfiCarrier"}};
+const PanelKind* kind = &kPanels[0];
+
 }  // namespace
+
+const PanelKind& panelKind() { return *kind; }
+
+std::wstring panelClass() { return std::wstring(L"FrontPanels.") + kind->name; }
+
+void onEachPanel(const std::function<void()>& checks) {
+  for (const PanelKind& one : kPanels) {
+    kind = &one;
+    checks();
+  }
+  kind = &kPanels[0];
+}
 
 void expect(bool good, const std::string& what) {
   std::printf("%s %s: %s\n", good ? "ok" : "not ok", about.c_str(), what.c_str());
@@ -21,7 +38,10 @@ void expect(bool good, const std::string& what) {
   ++(good ? passed : failed);
 }
 
-void chapter(std::string name) { about = std::move(name); }
+void chapter(std::string name) {
+  const std::wstring panel = kind->name;
+  about = std::string(panel.begin(), panel.end()) + ", " + name;
+}
 
 int verdict() {
   std::printf("%d passed, %d failed\n", passed, failed);
@@ -108,14 +128,14 @@ HRESULT put(IDispatch& object, const wchar_t* name, Value value) {
 }
 
 std::vector<float> carrier() {
-  std::vector<float> sweep(513, -100.0F);
-  sweep[256] = -30.0F;
+  std::vector<float> sweep(513, kind->floorDb);
+  sweep[256] = kind->floorDb + 40;
   return sweep;
 }
 
 void publish(const std::vector<float>& sweep) {
   const auto hub = create<IDispatch>(L"FrontPanels.DataHub");
-  call(*hub.get(), L"Publish", {L"Brantor Scanner/Spectrum/Spectrum Trace", Value(sweep)});
+  call(*hub.get(), L"Publish", {kind->path, Value(sweep)});
 }
 
 int pixelsOf(HDC dc, const RECT& area, COLORREF color) {

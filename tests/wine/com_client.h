@@ -83,6 +83,19 @@ HRESULT put(IDispatch& object, const wchar_t* name, Value value);
 
 void pumpMessages();
 
+// The panels that checks are made on.
+struct PanelKind {
+  const wchar_t* name;  // of the class, after "FrontPanels."
+  int resultType;       // whose trace operation 10 adds
+  const wchar_t* path;  // of that trace
+  float floorDb;        // a level at the foot of its graph, as it is at first
+  const wchar_t* text;  // a stored property that is a text; null where there is none
+};
+// The one that checks are made on now.
+[[nodiscard]] const PanelKind& panelKind();
+[[nodiscard]] std::wstring panelClass();  // its ProgID
+void onEachPanel(const std::function<void()>& checks);
+
 // A sweep with one carrier in its middle, and its way to the panels.
 [[nodiscard]] std::vector<float> carrier();
 void publish(const std::vector<float>& sweep);

@@ -118,7 +118,7 @@ void isPartOfAnAggregate() {
   struct Outer final : Counted<IUnknown> {
     void* find(REFIID id) override { return id == IID_IUnknown ? this : nullptr; }
   } outer;
-  const CLSID id = classOf(L"FrontPanels.SpectrumView");
+  const CLSID id = classOf(panelClass().c_str());
   ComPointer<IDispatch> refused;
   expect(CoCreateInstance(id, &outer, CLSCTX_INPROC_SERVER, IID_IDispatch,
                           reinterpret_cast<void**>(refused.receive())) == CLASS_E_NOAGGREGATION,
@@ -127,6 +127,27 @@ void isPartOfAnAggregate() {
   CoCreateInstance(id, &outer, CLSCTX_INPROC_SERVER, IID_IUnknown, reinterpret_cast<void**>(inner.receive()));
   const auto identity = inner.query<IOleObject>().query<IUnknown>();
   expect(identity.get() == &outer, "its parts show the outer identity");
+}
+
+// The registry names the library and the number of a picture in it, as designers show controls.
+void isPicturedInToolboxes() {
+  LPOLESTR id = nullptr;
+  StringFromCLSID(classOf(panelClass().c_str()), &id);
+  const std::wstring key = std::wstring(L"CLSID\\") + id + L"\\ToolboxBitmap32";
+  CoTaskMemFree(id);
+  wchar_t text[MAX_PATH] = L"";
+  LONG bytes = sizeof text;
+  RegQueryValueW(HKEY_CLASSES_ROOT, key.c_str(), text, &bytes);
+  const std::wstring place = text;
+  const std::size_t comma = place.rfind(L',');
+  const HMODULE library = GetModuleHandleW(place.substr(0, comma).c_str());
+  BITMAP size{};
+  if (comma != std::wstring::npos && library != nullptr) {
+    HGDIOBJ const picture = LoadBitmapW(library, MAKEINTRESOURCEW(std::stoi(place.substr(comma + 1))));
+    GetObjectW(picture, sizeof size, &size);
+    DeleteObject(picture);
+  }
+  expect(size.bmWidth == 16 && size.bmHeight == 15, "it has its picture for the toolboxes of designers");
 }
 
 // The graphics interface gives out the lowest free handle: the highest of many new pens grows with what is
@@ -169,11 +190,15 @@ void leavesNothingBehind(HWND window) {
 int check() {
   chapter("container");
   const auto checks = [](const Desk& desk) {
-    showsASweep(desk.window);
-    drawsWithoutAWindow();
-    keepsItsPropertiesInAStream();
-    isPartOfAnAggregate();
-    leavesNothingBehind(desk.window);
+    onEachPanel([&desk] {
+      chapter("container");
+      showsASweep(desk.window);
+      drawsWithoutAWindow();
+      keepsItsPropertiesInAStream();
+      isPartOfAnAggregate();
+      isPicturedInToolboxes();
+      leavesNothingBehind(desk.window);
+    });
   };
   return runChecks({800, 700}, checks, [] {
     CoFreeUnusedLibrariesEx(0, 0);

@@ -54,11 +54,10 @@ std::wstring flagsOf(USHORT flags) {
 }
 
 void printFunction(ITypeInfo& info, const FUNCDESC& function, LONG slotBytes) {
-  static const std::map<INVOKEKIND, const char*> kKinds = {
-      {INVOKE_FUNC, "method"},
-      {INVOKE_PROPERTYGET, "get"},
-      {INVOKE_PROPERTYPUT, "put"},
-      {INVOKE_PROPERTYPUTREF, "putref"}};
+  static const std::map<INVOKEKIND, const char*> kKinds = {{INVOKE_FUNC, "method"},
+                                                           {INVOKE_PROPERTYGET, "get"},
+                                                           {INVOKE_PROPERTYPUT, "put"},
+                                                           {INVOKE_PROPERTYPUTREF, "putref"}};
   BSTR names[20] = {};
   UINT named = 0;
   info.GetNames(function.memid, names, 20, &named);

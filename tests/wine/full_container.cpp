@@ -72,8 +72,8 @@ void* FullContainer::find(REFIID id) {
   return nullptr;
 }
 
-Hosted::Hosted(const wchar_t* progId)
-    : object(create<IOleObject>(progId)),
+Hosted::Hosted(const std::wstring& progId)
+    : object(create<IOleObject>(progId.c_str())),
       members(object.query<IDispatch>()),
       inPlace(object.query<IOleInPlaceObject>()) {}
 

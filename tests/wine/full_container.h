@@ -153,7 +153,7 @@ struct Hosted {
   ComPointer<IDispatch> members;
   ComPointer<IOleInPlaceObject> inPlace;
 
-  explicit Hosted(const wchar_t* progId = L"FrontPanels.SpectrumView");
+  explicit Hosted(const std::wstring& progId = panelClass());
   ~Hosted() { close(); }
   Hosted(const Hosted&) = delete;
   Hosted& operator=(const Hosted&) = delete;
