@@ -228,6 +228,8 @@ void Tarvex::showActiveTrace() {
   showVerticalAxis();
   showIo();
   markers_.updateMarkerButtons();
+  // Bars have no markers.
+  controls()->control("MarkerAddButton").Enabled(!bars);
 }
 
 // The fields of the bars show the current chart, as far as they can.
@@ -284,9 +286,8 @@ void Tarvex::showIo() {
 void Tarvex::refreshControls() {
   if (base().closing()) return;
   guard("Tarvex::refreshControls()...", [this] {
-    CellNameInfo(cellNames_);
     showActiveTrace();
-    refreshTraces();
+    CellNameInfo(cellNames_);
   });
 }
 
@@ -295,6 +296,7 @@ void Tarvex::CellNameInfo(std::shared_ptr<const CellNames> names) {
   for (const PilotSetRow& row : pilotSets())
     if (auto* const bars = dynamic_cast<clsBarChartPainter*>(displayOf(row)))
       bars->CellNameInfo(base().CellNamingEnabled ? cellNames_ : nullptr);
+  refreshTraces();
 }
 
 // What is counted in code units is written anew.

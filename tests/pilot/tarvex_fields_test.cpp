@@ -87,9 +87,11 @@ TEST_F(PilotFieldsTest, CheckBoxesAskForTheirSetsAndTakeThemOffTheGraph) {
 
 TEST_F(PilotFieldsTest, FieldsOfTheBarsChangeTheChartThatIsActive) {
   EXPECT_FALSE(control("SortByComboBox").Enabled());
+  EXPECT_TRUE(control("MarkerAddButton").Enabled());
   publishFrame(kListPath, {{5, -9}});
   publishFrame(kTopNPath, {{12, -7}, {30, -3}, {8, -5}});
   EXPECT_TRUE(control("SortByComboBox").Enabled());
+  EXPECT_FALSE(control("MarkerAddButton").Enabled());
   choose("SortByComboBox", 2);
   EXPECT_EQ(barsOf(203), "30:-3 12:-7 8:-5");
   click("SortAscendingOptionButton");

@@ -17,6 +17,7 @@ constexpr PanelKind kPanels[] = {
     {L"SpectrumView", 10, L"Brantor Scanner/Spectrum/Spectrum Trace", -100, nullptr},
     {L"Tarvex", 14, L"Brantor Scanner/CDMA All Pilots/AllPilotsTrace", -45, L"DfiCarrier"}};
 const PanelKind* kind = &kPanels[0];
+std::string prefix;  // of the chapters
 
 }  // namespace
 
@@ -27,8 +28,11 @@ std::wstring panelClass() { return std::wstring(L"FrontPanels.") + kind->name; }
 void onEachPanel(const std::function<void()>& checks) {
   for (const PanelKind& one : kPanels) {
     kind = &one;
+    const std::wstring name = one.name;
+    prefix = std::string(name.begin(), name.end()) + ", ";
     checks();
   }
+  prefix.clear();
   kind = &kPanels[0];
 }
 
@@ -38,10 +42,7 @@ void expect(bool good, const std::string& what) {
   ++(good ? passed : failed);
 }
 
-void chapter(std::string name) {
-  const std::wstring panel = kind->name;
-  about = std::string(panel.begin(), panel.end()) + ", " + name;
-}
+void chapter(const std::string& name) { about = prefix + name; }
 
 int verdict() {
   std::printf("%d passed, %d failed\n", passed, failed);

@@ -19,7 +19,7 @@ namespace frontpanels::testing {
 // Prints "ok NAME: WHAT" or "not ok NAME: WHAT" and counts it.
 void expect(bool good, const std::string& what);
 // What the checks that follow are about.
-void chapter(std::string name);
+void chapter(const std::string& name);
 // Prints "N passed, N failed"; 0 when all passed.
 [[nodiscard]] int verdict();
 

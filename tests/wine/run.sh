@@ -11,7 +11,7 @@ if [ "${FRONTPANELS_WINE_SESSION:-}" != yes ]; then
   export FRONTPANELS_WINE_SESSION=yes WINEPREFIX="$root/build/wine" WINEDEBUG=-all WINEDLLOVERRIDES='mscoree,mshtml='
   wineserver -k >/dev/null 2>&1
   mkdir -p "$WINEPREFIX"
-  exec xvfb-run -a -s '-screen 0 1280x1024x24' bash "$0" "$@"
+  exec xvfb-run -a -s '-screen 0 2560x1920x24' bash "$0" "$@"
 fi
 
 here=$root/tests/wine
@@ -68,14 +68,15 @@ unit_tests() {
 fields() {
   local dpi key='HKCU\Control Panel\Desktop' pictures=$root/build/screenshots
   mkdir -p "$pictures"
-  rm -f "$pictures"/controls_*.png "$pictures"/panel_*.png
+  rm -f "$pictures"/controls_*.png "$pictures"/panel_*.png "$pictures"/pilots_*.png
   for dpi in 144 96; do
     wine reg add "$key" /v LogPixels /t REG_DWORD /d "$dpi" /f >/dev/null 2>&1
     wineserver -k
     wineserver -w
     program "controls_$dpi" controls_test "$(windows_path "$pictures")"
     program "fields_$dpi" fields_test "$(windows_path "$pictures")"
-    [ -s "$pictures/controls_$dpi.png" ] && [ -s "$pictures/panel_whole_$dpi.png" ]
+    program "pilots_$dpi" pilots_test "$(windows_path "$pictures")"
+    [ -s "$pictures/controls_$dpi.png" ] && [ -s "$pictures/panel_whole_$dpi.png" ] && [ -s "$pictures/pilots_four_1200_$dpi.png" ]
     judge $? "the fields are pictured at $dpi dots an inch"
   done
 }
