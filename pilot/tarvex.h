@@ -77,7 +77,7 @@ class Tarvex final : public FieldPanel {
   // --- Marker commands, on the traces over PN offset
   void addMarker() { markers_.addMarker(); }
   void addDeltaMarker() { markers_.addDeltaMarker(); }
-  void deleteMarker() { markers_.deleteMarker(), refreshTraces(); }
+  void deleteMarker() { markers_.deleteMarker(); }
   void markerToMax() { markers_.markerToMax(); }
   void markerToMin() { markers_.markerToMin(); }
 
