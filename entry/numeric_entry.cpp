@@ -50,7 +50,8 @@ void clsNumericEntry::valueNoUpdateAutoChoose(double value) noexcept {
 
 clsNumericEntry::Entered clsNumericEntry::setValue(double wanted, bool chooseRange) noexcept {
   return guarded("clsNumericEntry::value() failed. ", Entered::Refused, [&] {
-    if (wanted == value_ && limits_.hold(wanted)) {
+    const bool wasBlank = blank_ && preserveBlankEntry_;
+    if (!wasBlank && wanted == value_ && limits_.hold(wanted)) {
       if (redisplay_ || text() != lastText_) reformat();
       return Entered::Same;
     }
@@ -62,7 +63,7 @@ clsNumericEntry::Entered clsNumericEntry::setValue(double wanted, bool chooseRan
     value_ = result.value;
     blank_ = false;
     reformat();
-    return value_ == previousValue_ ? Entered::Same : Entered::Changed;
+    return value_ == previousValue_ && !wasBlank ? Entered::Same : Entered::Changed;
   });
 }
 

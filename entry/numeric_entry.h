@@ -167,7 +167,8 @@ class clsNumericEntry {
   // The user's, in texts shown and typed; "." at first, and where it is empty.
   [[nodiscard]] const std::string& decimalSeparator() const noexcept { return decimalSeparator_; }
   void decimalSeparator(std::string_view separator);
-  // Whether a user may leave the field empty; the value stays.
+  // Whether a user may leave the field empty. The value stays; that the field has become empty, or holds a
+  // value again, is a change.
   [[nodiscard]] bool preserveBlankEntry() const noexcept { return preserveBlankEntry_; }
   void preserveBlankEntry(bool preserve) noexcept { preserveBlankEntry_ = preserve; }
 
@@ -197,6 +198,7 @@ class clsNumericEntry {
   void reformat() noexcept;
   // Shows no text until a value is set.
   void blank() noexcept;
+  [[nodiscard]] bool isBlank() const noexcept { return blank_; }
   // Takes back units, ranges, limits, sequence, power, step and resolution, so that the entry can be set up
   // for another quantity; value, text, flags and the bound controls stay.
   void Clear() noexcept;

@@ -123,7 +123,8 @@ std::optional<double> clsNumericEntry::parsed(std::string_view text) const {
 }
 
 std::optional<double> clsNumericEntry::shownValue() const {
-  if (textBox_ == nullptr || (!lastText_.empty() && text() == lastText_)) return value_;
+  const bool asWritten = text() == lastText_ && (blank_ || !lastText_.empty());
+  if (textBox_ == nullptr || asWritten) return value_;
   return textToNumeric();
 }
 
@@ -168,13 +169,12 @@ void clsNumericEntry::Clear() noexcept {
 
 clsNumericEntry::Entered clsNumericEntry::commit(const std::string& typed) {
   if (preserveBlankEntry_ && isBlankText(typed)) {
-    blank_ = true;
+    const bool news = !std::exchange(blank_, true);
     reformat();
-    return Entered::Same;
+    return news ? Entered::Changed : Entered::Same;
   }
   const std::optional<double> number = parsed(typed);
   if (!number) return Entered::Refused;
-  blank_ = false;
   return setValue(*number, autoChoose_);
 }
 

@@ -331,19 +331,24 @@ void clsMultiTracePainter::updateXAxisLabels() {
         break;
       case 1:
         writeXLabel(LabelPlace::Left, xStart_);
-        writeXLabel(LabelPlace::Right, xStop_);
+        writeXLabel(LabelPlace::Right, rightEdgeX());
         writeDivisionLabel(LabelPlace::XAxis);
         break;
       case 2:
       case 3:
         leftLabel("");
-        writeXLabel(LabelPlace::XAxis, (xStart_ + xStop_) / 2);
+        writeXLabel(LabelPlace::XAxis, (xStart_ + rightEdgeX()) / 2);
         xAxisStyle_ == 2 ? writeDivisionLabel(LabelPlace::Right) : rightLabel("");
         break;
       default:
         break;
     }
   });
+}
+
+double clsMultiTracePainter::rightEdgeX() const {
+  if (xPerPoint() == 0 || numberOfMeasurements() <= 2) return xStop_;
+  return xStart_ + (numberOfMeasurements() - 2.0) * xPerPoint();
 }
 
 void clsMultiTracePainter::writeXLabel(LabelPlace place, double value) {
@@ -355,7 +360,7 @@ void clsMultiTracePainter::writeXLabel(LabelPlace place, double value) {
 void clsMultiTracePainter::writeDivisionLabel(LabelPlace place) {
   text_.clear();
   if (numberOfHorizontalDivisions_ > 0) {
-    xAxisFormatter_.appendDifference(text_, (xStop_ - xStart_) / numberOfHorizontalDivisions_,
+    xAxisFormatter_.appendDifference(text_, (rightEdgeX() - xStart_) / numberOfHorizontalDivisions_,
                                      xAxisFormatter_.formatString(), !xAxisFormatter_.suppressSuffix());
     text_ += "/div";
   }

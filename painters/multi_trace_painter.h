@@ -115,7 +115,8 @@ class clsMultiTracePainter : public PlotPainter {
   [[nodiscard]] double span() const { return xStop_ - xStart_; }
   void span(double span);
   Property<std::int32_t> numberOfMeasurements;
-  // What lies between two points, for markers to read. 0: the points share the span.
+  // What lies between two points, for markers and labels. 0: the points share the span. Otherwise the labels
+  // go by the points: the last but one lies on the plot's right edge.
   Property<double> xPerPoint;
   [[nodiscard]] std::int32_t numberOfHorizontalDivisions() const { return numberOfHorizontalDivisions_; }
   void numberOfHorizontalDivisions(std::int32_t divisions);  // as for the value axis
@@ -210,6 +211,7 @@ class clsMultiTracePainter : public PlotPainter {
   [[nodiscard]] std::optional<ValueRange> dataRange();
   void computeMinMax(TraceSlot& slot);
   [[nodiscard]] const MinMax& currentMinMax(TraceSlot& slot);
+  [[nodiscard]] double rightEdgeX() const;
   void writeXLabel(LabelPlace place, double value);
   void writeDivisionLabel(LabelPlace place);
 

@@ -11,8 +11,8 @@ inline constexpr std::int32_t kLastIs95BChip = 32767;  // of the short code's 51
 inline constexpr std::int32_t kIs95BChipsPerPn = 64;
 inline constexpr std::int32_t kTripleRateChipsPerPn = 192;
 
-// From chips of a code format to IS-95B chips and back, to the nearest whole number, halves to even. Reported,
-// and 0, where that has no 32 bits.
+// From chips of a code format to IS-95B chips and back, to the nearest whole number, halves to even.
+// Reported, and 0, where that has no 32 bits.
 [[nodiscard]] std::int32_t CurrentToIS95BChips(std::int16_t codeFormat, std::int32_t chips) noexcept;
 [[nodiscard]] std::int32_t IS95BToCurrentChips(std::int16_t codeFormat, std::int32_t is95BChips) noexcept;
 

@@ -22,11 +22,11 @@ struct EntryRow {
 
 constexpr EntryRow kEntries[] = {
     {&PilotFields::topN, &clsNumericEntry::noSuffix, 1, 40, 20, 1, "0"},
-    {&PilotFields::threshold, &clsNumericEntry::noSuffix, -200, 100, 0, 0, "0.##"},
+    {&PilotFields::threshold, &clsNumericEntry::noSuffix, -1000, 1000, 0, 0, "0.##"},
     {&PilotFields::carrierFrequency, &clsNumericEntry::frequencySuffix, 0, 6e9, 1e9, 0, "0.########"},
     {&PilotFields::io, &clsNumericEntry::dBmSuffix, -1e9, 1e9, 0, 0, "0.##"},
-    {&PilotFields::verticalScale, &clsNumericEntry::noSuffix, 0.1, 50, 3, 0, "0.###"},
-    {&PilotFields::verticalOffset, &clsNumericEntry::noSuffix, -200, 100, 0, 0, "0.##"},
+    {&PilotFields::verticalScale, &clsNumericEntry::noSuffix, 0.001, 1000, 3, 0, "0.###"},
+    {&PilotFields::verticalOffset, &clsNumericEntry::noSuffix, -1000, 1000, 0, 0, "0.##"},
 };
 
 struct ListRow {
@@ -82,6 +82,7 @@ void PilotFields::setUpEntries() {
     entry.valueNoUpdate(row.value);
   }
   threshold.preserveBlankEntry(true);
+  threshold.blank();
   io.preserveBlankEntry(true);
   io.textBox(&controls.textBox("I0TextBox"));
   io.blank();

@@ -56,11 +56,7 @@ const Tarvex::ParameterRow Tarvex::kParameters[] = {
      [](Tarvex& panel, double value) { panel.fields_.carrierFrequency.valueNoUpdate(value); }},
     {kChannelizationParameter,
      [](Tarvex& panel, double value) { panel.fields_.channelization.value(toInt16(value)); }},
-    {kCodeFormatParameter,
-     [](Tarvex& panel, double value) {
-       panel.fields_.format.value(toInt16(value));
-       panel.newCdmaFormat(toInt16(value));
-     }},
+    {kCodeFormatParameter, [](Tarvex& panel, double value) { panel.formatFromHost(toInt16(value)); }},
     {kCodeCenterParameter, [](Tarvex& panel, double value) { panel.fields_.code.centerFromHost(value); }},
     {kCodeStartParameter, [](Tarvex& panel, double value) { panel.fields_.code.startFromHost(value); }},
     {kCodeSpanParameter, [](Tarvex& panel, double value) { panel.fields_.code.spanFromHost(value); }},
@@ -100,7 +96,8 @@ std::int32_t Tarvex::vfpSet(std::int32_t hardwareId, std::int16_t parameterType,
   if (base().closing()) return kStatusDone;
   return guarded("Tarvex::vfpSet() ... ", kStatusUnusableParameter, [&] {
     if (parameterType == kTopNSetParameter || parameterType == kUserListSetParameter) {
-      const bool on = BooleanValue(value.toText());
+      // A word that is no boolean is an error: what is on stays on.
+      const bool on = Variant(value.toText()).toBoolean();
       switchSet(parameterType == kTopNSetParameter ? PilotSet::TopN : PilotSet::UserList, on);
       return kStatusDone;
     }
@@ -132,6 +129,15 @@ bool Tarvex::setOwnParameter(std::int16_t parameterType, std::int16_t index, con
     refreshTraces();
   }
   return true;
+}
+
+// A format that nobody knows is reported and changes nothing.
+void Tarvex::formatFromHost(std::int16_t format) {
+  const FlagScope inProgress = changeOption();
+  fields_.format.value(format);
+  const ItemList& list = *fields_.format.ComboBox();
+  if (list.item(list.ListIndex()).data == format) return newCdmaFormat(format);
+  fields_.format.value(fields_.code.format());
 }
 
 // --- What the host keeps
@@ -243,7 +249,8 @@ std::string Tarvex::reportHtml() {
   for (const PilotSetRow& row : pilotSets()) {
     const TraceObject* const display = displayOf(row);
     if (display == nullptr) continue;
-    page.settings.push_back({std::string("Io, ") + row.title, numberToText(state(row.set).ioDbm) + " dBm"});
+    if (const auto& ioDbm = state(row.set).ioDbm)
+      page.settings.push_back({std::string("Io, ") + row.title, numberToText(*ioDbm) + " dBm"});
     const auto* const bars = dynamic_cast<const clsBarChartPainter*>(display);
     for (std::int16_t i = 1; bars != nullptr && i <= bars->barArraySize(); ++i)
       page.readings.push_back({row.title, numberToText(bars->barOffset(i)),

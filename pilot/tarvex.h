@@ -2,9 +2,9 @@
 // energy over PN offset, the strongest ones and those of a list as bars. This is the whole control except its
 // window.
 //
-// A set of pilots is on display from its first whole frame, or from the host's word, until the host or the
-// user takes it away. What the user enters about the measurement is a request to the host; what only changes
-// the picture stays on the panel, for the trace that is the active one, and goes to the host with the
+// A set of pilots is on display from its first whole frame, or from the host's word, until the user or the
+// host switches it off. What the user enters about the measurement is a request to the host; what only
+// changes the picture stays on the panel, for the trace that is the active one, and goes to the host with the
 // settings.
 #pragma once
 
@@ -101,7 +101,7 @@ class Tarvex final : public FieldPanel {
 
   // One set's data, and whether it is to be seen.
   struct SetState {
-    float ioDbm = 0;
+    std::optional<float> ioDbm;
     std::array<float, kMaxPoints> levels{};  // of a trace
     std::size_t points = 0;
     MultipathFrame frame;      // of bars
@@ -146,6 +146,7 @@ class Tarvex final : public FieldPanel {
   [[nodiscard]] static bool withIo(const TraceObject& display);
   void showActiveTrace();
   void showBarSettings();
+  void showBarLabel(std::int16_t otherIs);
   void showVerticalAxis();
   void tracesRefreshed() override;
 
@@ -195,11 +196,13 @@ class Tarvex final : public FieldPanel {
   void userPNListImportButton();
   [[nodiscard]] std::optional<std::vector<std::int32_t>> readPnFile(const std::string& path);
   void importPns(std::span<const std::int32_t> pns);
-  [[nodiscard]] bool tellHostOfPn(std::string_view routine, std::int16_t index, std::int32_t pn);
+  [[nodiscard]] bool tellHostOfPn(std::string_view routine, const PnEdit& edit);
+  void takeBack(std::int32_t position, std::int32_t pn);
   void userPnListChanged();
 
   // What the host sends
   bool setOwnParameter(std::int16_t parameterType, std::int16_t index, const Variant& value);
+  void formatFromHost(std::int16_t format);
   void setUserPn(std::int16_t index, const Variant& value);
   void showCodeWindow();
   void showPower(const PilotSetRow& row, bool withIo);
@@ -223,8 +226,8 @@ class Tarvex final : public FieldPanel {
   // What the vertical entries show of a display that scales itself.
   std::optional<double> shownTop_;
   double shownPerDivision_ = 0;
-  std::optional<PnEdit> editWithHost_;  // the edit of the list that the host is being told of
-  bool updateInProgress_ = false;       // an entry of the code window is with the host
+  const PnEdit* editWithHost_ = nullptr;  // the edit of the list that the host is being told of
+  bool updateInProgress_ = false;         // an entry of the code window is with the host
 
   std::vector<std::unique_ptr<DataServer>> servers_;  // in the order of PilotServer
 };

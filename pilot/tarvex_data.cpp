@@ -79,7 +79,8 @@ void Tarvex::pathChanged(PilotServer server, std::int32_t index) {
           const DataServer& source = *servers_[static_cast<std::size_t>(server)];
           if (server == PilotServer::Carrier) return showCarrier(source, index);
           const auto set = static_cast<PilotSet>(server);
-          if (index == kIoPath) return takeIo(set, source.value(index, 0));
+          if (index == kIoPath)
+            return takeIo(set, source.itemCount(index) == 0 ? Variant() : source.value(index, 0));
           if (pilotSet(set).bars)
             takeColumn(set, source, index);
           else if (index == kTracePath)
@@ -90,13 +91,16 @@ void Tarvex::pathChanged(PilotServer server, std::int32_t index) {
 void Tarvex::showCarrier(const DataServer& source, std::int32_t index) {
   if (index >= static_cast<std::int32_t>(std::size(kCarrier))) return;
   const CarrierRow& row = kCarrier[index];
-  controls()->control(row.label).Caption(row.text + row.shown(source.value(index, 0)));
+  const bool known = source.itemCount(index) > 0;
+  controls()->control(row.label).Caption(known ? row.text + row.shown(source.value(index, 0))
+                                               : std::string());
 }
 
+// An empty value: the host has taken it back.
 void Tarvex::takeIo(PilotSet set, const Variant& value) {
   double ioDbm = 0;
-  if (!textToNumber(value.toText(), ioDbm)) raiseTypeMismatch();
-  state(set).ioDbm = Variant(ioDbm).toSingle();
+  if (!value.isEmpty() && !textToNumber(value.toText(), ioDbm)) raiseTypeMismatch();
+  state(set).ioDbm = value.isEmpty() ? std::nullopt : std::optional(Variant(ioDbm).toSingle());
   showIo();
 }
 
@@ -140,7 +144,7 @@ void Tarvex::showLevels(PilotSet set) {
   painter->span(points);
   painter->trace(std::span(data.levels).first(data.points));
   painter->traceSize(points);
-  painter->offset(data.ioDbm);
+  painter->offset(data.ioDbm.value_or(0));
   placeXAxis(*painter, set);
   completeUpdate();
 }
@@ -153,7 +157,7 @@ void Tarvex::showBars(PilotSet set) {
   painter->dataChanged(true);
   painter->trace(records);
   painter->elementsPerValue(kValuesPerPilot);
-  painter->offset(state(set).ioDbm);
+  painter->offset(state(set).ioDbm.value_or(0));
   completeUpdate();
 }
 

@@ -58,6 +58,8 @@ std::int32_t Tarvex::removeDisplay(const Variant& resultType) {
   const PilotSetRow* const row =
       resultType.isNumeric() ? pilotSetOfResultType(resultType.toInt32()) : nullptr;
   if (row == nullptr) return kStatusUnusableParameter;
+  // The user was quicker.
+  if (state(row->set).switchedOff && displayOf(*row) == nullptr) return kStatusDone;
   removeDisplay(*row);
   return kStatusDone;
 }
@@ -187,7 +189,6 @@ void Tarvex::changedTraceConfiguration(TraceState state, TraceObject* activeTrac
     } else if (state != TraceState::Removed) {
       return fail("unrecognized trace state");
     }
-    chooseCurrentBars(activeTrace);
     showActiveTrace();
   });
 }
@@ -215,6 +216,7 @@ clsBarChartPainter* Tarvex::userListBars() {
 }
 
 void Tarvex::showActiveTrace() {
+  chooseCurrentBars(base().traceManager().activeTrace());
   const bool bars = dynamic_cast<clsBarChartPainter*>(base().traceManager().activeTrace()) != nullptr;
   {
     const FlagScope inProgress = changeOption();
@@ -240,7 +242,7 @@ void Tarvex::showBarSettings() {
   const FlagScope inProgress = changeOption();
   fields_.sortBy.value(bars->barSortByMode());
   select(bars->barSortOrder() == 1 ? "SortAscendingOptionButton" : "SortDescendingOptionButton");
-  if (active == bars) fields_.barLabel.value(bars->otherIs());
+  if (active == bars) showBarLabel(bars->otherIs());
   fields_.barChartStyle.value(bars->BarChartStyle());
   if (bars->threshold())
     fields_.threshold.valueNoUpdate(*bars->threshold());
@@ -249,6 +251,14 @@ void Tarvex::showBarSettings() {
   CheckBox& names = controls()->checkBox("ShowCellNameCheckBox");
   names.Value(bars->ShowCellName() ? 1 : 0);
   names.Enabled(active == bars && base().CellNamingEnabled);
+}
+
+// Hosts know quantities that the list does not offer.
+void Tarvex::showBarLabel(std::int16_t otherIs) {
+  ItemList& list = *fields_.barLabel.ComboBox();
+  for (std::int32_t i = 0; i < list.ListCount(); ++i)
+    if (list.item(i).data == otherIs) return fields_.barLabel.value(otherIs);
+  list.ListIndex(-1);
 }
 
 void Tarvex::showVerticalAxis() {
@@ -280,7 +290,10 @@ void Tarvex::tracesRefreshed() {
 void Tarvex::showIo() {
   const TraceObject* const active = base().traceManager().activeTrace();
   const PilotSetRow* const row = active == nullptr ? nullptr : pilotSetOfTrace(active->resultType());
-  if (row != nullptr) fields_.io.valueNoUpdate(state(row->set).ioDbm);
+  if (row != nullptr && state(row->set).ioDbm)
+    fields_.io.valueNoUpdate(*state(row->set).ioDbm);
+  else
+    fields_.io.blank();
 }
 
 void Tarvex::refreshControls() {

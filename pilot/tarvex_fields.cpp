@@ -182,8 +182,10 @@ void Tarvex::newFormat() {
   fields_.format.Click();
   if (optionChangeInProgress() || !fields_.format.newValue()) return;
   guard("Tarvex::newCdmaFormat()", [this] {
-    newCdmaFormat(fields_.format.value());
-    request("newCdmaFormat()", kCodeFormatParameter, fields_.format.value());
+    const std::int16_t format = fields_.format.value();
+    if (request("newCdmaFormat()", kCodeFormatParameter, format)) return newCdmaFormat(format);
+    const FlagScope inProgress = changeOption();
+    fields_.format.value(fields_.code.format());
   });
 }
 
@@ -279,7 +281,9 @@ void Tarvex::NewBarChartStyle() {
 
 void Tarvex::newThreshold() {
   guard("Tarvex::newThreshold() ... failed", [this] {
-    changeBars([this](clsBarChartPainter& bars) { bars.threshold(fields_.threshold.value()); });
+    changeBars([this](clsBarChartPainter& bars) {
+      bars.threshold(fields_.threshold.isBlank() ? std::nullopt : std::optional(fields_.threshold.value()));
+    });
   });
 }
 
@@ -302,7 +306,7 @@ void Tarvex::PowerDisplayComboBox_LostFocus() {
     if (active == nullptr || withIo(*active) == on) return;
     const PilotSetRow* const row = pilotSetOfTrace(active->resultType());
     if (row == nullptr) return;
-    const double ioDbm = state(row->set).ioDbm;
+    const double ioDbm = static_cast<double>(state(row->set).ioDbm.value_or(0));
     const double division = active->verticalResolution();
     const double top = active->gridScaleTop().value_or(0) + (on ? ioDbm : -ioDbm);
     active->gridScaleTop(roundHalfEven(top / division) * division);

@@ -22,28 +22,35 @@ std::int16_t indexToDelete(std::int32_t position) { return static_cast<std::int1
 
 // A host that echoes an edit while it is told of it changes nothing a second time.
 void Tarvex::setUserPn(std::int16_t index, const Variant& value) {
-  if (editWithHost_ && editWithHost_->index == index && editWithHost_->pn == value.toDouble()) return;
+  if (editWithHost_ != nullptr && editWithHost_->index == index && editWithHost_->pn == value.toDouble())
+    return;
   if (!fields_.userPnList.edit(index, value)) return;
   if (index < 0) userPnListChanged();
   fields_.updateDeleteButton();
 }
 
-bool Tarvex::tellHostOfPn(std::string_view routine, std::int16_t index, std::int32_t pn) {
-  editWithHost_ = PnEdit{index, pn};
-  const bool taken = request(routine, CDMA_CODE_OFFSET, index, static_cast<double>(pn));
-  editWithHost_.reset();
-  return taken;
+bool Tarvex::tellHostOfPn(std::string_view routine, const PnEdit& edit) {
+  const ValueScope telling(editWithHost_, &edit);
+  return request(routine, CDMA_CODE_OFFSET, edit.index, static_cast<double>(edit.pn));
+}
+
+// An item that the host has refused. It may have edited the list before it did so.
+void Tarvex::takeBack(std::int32_t position, std::int32_t pn) {
+  UserPnList& list = fields_.userPnList;
+  if (position < list.count() && list.pn(position) == pn) list.remove(position);
 }
 
 void Tarvex::userPNListAddButton_Click() {
   guard("Tarvex::userPNListAddButton_Click()", [this] {
     UserPnList& list = fields_.userPnList;
+    // A text that was refused when the field was left: the number that is back is not what was meant.
+    if (!list.entry.validNumeric()) return list.entry.validNumeric(true);
     const std::int32_t position = list.count();
     const auto pn = static_cast<std::int32_t>(list.entry.value());
     if (position >= UserPnList::kMostItems) raiseOverflow();
     list.append(pn);
-    if (!tellHostOfPn("userPNListAddButton_Click()", static_cast<std::int16_t>(position), pn))
-      list.remove(position);
+    if (!tellHostOfPn("userPNListAddButton_Click()", {static_cast<std::int16_t>(position), pn}))
+      takeBack(position, pn);
     fields_.updateDeleteButton();
   });
 }
@@ -54,9 +61,8 @@ void Tarvex::userPNListDeleteButton() {
     const std::int32_t position = list.selected();
     if (position < 0) return;
     const std::int32_t pn = list.pn(position);
-    if (!tellHostOfPn("userPNListDeleteButton()", indexToDelete(position), pn)) return;
-    // The host may have edited the list inside the request.
-    if (position < list.count() && list.pn(position) == pn) list.remove(position);
+    if (!tellHostOfPn("userPNListDeleteButton()", {indexToDelete(position), pn})) return;
+    takeBack(position, pn);
     userPnListChanged();
     fields_.updateDeleteButton();
   });
@@ -73,7 +79,7 @@ void Tarvex::userPnListChanged() {
 void Tarvex::userPNListImportButton() {
   guard("Tarvex::userPNListImportButton()", [this] {
     const std::optional<std::string> path = services_.fileDialogs.openFile(kImportFilter);
-    if (!path) return;
+    if (!path || base().closing()) return;
     if (const std::optional<std::vector<std::int32_t>> pns = readPnFile(*path)) importPns(*pns);
     fields_.updateDeleteButton();
   });
@@ -104,8 +110,8 @@ void Tarvex::importPns(std::span<const std::int32_t> pns) {
     if (i % kLinesPerLook == kLinesPerLook - 1 && services_.fileDialogs.cancelPressed()) break;
     const std::int32_t position = list.count();
     list.append(pns[i]);
-    if (tellHostOfPn("userPNListImportButton()", static_cast<std::int16_t>(position), pns[i])) continue;
-    list.remove(position);
+    if (tellHostOfPn("userPNListImportButton()", {static_cast<std::int16_t>(position), pns[i]})) continue;
+    takeBack(position, pns[i]);
     break;
   }
   request("userPNListImportButton()", kPnIncrementParameter, fields_.code.pnIncrement.value());

@@ -67,7 +67,8 @@ bool UserPnList::insertFromHost(std::int32_t position, const Variant& value) {
     return false;
   }
   if (count() >= kMostItems) raiseOverflow();
-  const std::int32_t offset = std::clamp(toInt32(value.toDouble()), 0, kLastPn);
+  const auto offset = static_cast<std::int32_t>(
+      roundHalfEven(std::clamp(value.toDouble(), 0.0, static_cast<double>(kLastPn))));
   insert(offset, position);
   if (pn(position) == value.toDouble()) return true;
   report("::vfpSet()...CDMA_CODE_OFFSET not added at the correct index");

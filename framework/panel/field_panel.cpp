@@ -109,6 +109,7 @@ bool FieldPanel::accepted(std::string_view routine, std::int32_t status) const {
 
 bool FieldPanel::request(std::string_view routine, std::int16_t parameterType, std::int16_t index,
                          const Variant& value) {
+  if (base_.closing()) return false;
   return accepted(routine,
                   frontPanelSet(base_.resourceId(), base_.virtualFrontPanelId, parameterType, index, value));
 }
@@ -116,6 +117,7 @@ bool FieldPanel::request(std::string_view routine, std::int16_t parameterType, s
 bool FieldPanel::operate(std::string_view routine, std::int16_t operation, const Variant& argument) {
   return guarded([&] { return named(routine); }, false,
                  [&] {
+                   if (base_.closing()) return false;
                    return accepted(routine, frontPanelOp(base_.resourceId(), base_.virtualFrontPanelId,
                                                          operation, argument));
                  });

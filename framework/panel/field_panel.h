@@ -128,8 +128,8 @@ class FieldPanel : public HostedPanel {
     };
   }
 
-  // Requests to the host; false, after a report in the routine's name, for one that is refused. A number
-  // goes without an index.
+  // Requests to the host; false, after a report in the routine's name, for one that is refused, and without
+  // one in a panel that the host has closed meanwhile. A number goes without an index.
   bool request(std::string_view routine, std::int16_t parameterType, double value) {
     return request(routine, parameterType, 0, value);
   }

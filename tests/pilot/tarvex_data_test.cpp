@@ -60,6 +60,7 @@ TEST_F(PilotTest, AZoomedTraceBeginsAtTheCodeWindow) {
   EXPECT_EQ(trace(17)->xStart(), 100);
   EXPECT_EQ(trace(17)->xStop(), 121);
   EXPECT_EQ(trace(17)->leftLabel(), "100 PN");
+  EXPECT_EQ(trace(17)->rightLabel(), "119 PN");  // the last point but one lies on the plot's right edge
   panel->controls()->optionButton("CdmaUnitsChipsOption").Value(true);
   EXPECT_EQ(trace(17)->leftLabel(), "6400 chips");
   EXPECT_EQ(panel->ZoomedPilotsData().size(), 21U);
@@ -131,8 +132,8 @@ TEST_F(PilotTest, AFrameThatIsNotWholeIsReportedAndThePictureStays) {
         {"Delay Spread", 2},
         {"Aggr Minus Peak EcIo", 3}},
        true},
-      {"one is missing",
-       {{"Pn", 1}, {"Peak EcIo", 1}, {"Delay", 1}, {"Aggr EcIo", 1}, {"Aggr Minus Peak EcIo", 1}},
+      {"one is missing, which the frame before had",
+       {{"Pn", 2}, {"Peak EcIo", 2}, {"Delay", 2}, {"Aggr EcIo", 2}, {"Aggr Minus Peak EcIo", 2}},
        true},
       {"the last comes early",
        {{"Pn", 1},
@@ -210,6 +211,21 @@ TEST_F(PilotTest, TheCarrierIsReadOut) {
     hub.publish(kCarrierPath + "One Pps", row.value);
     EXPECT_EQ(control("onePpsLabel").Caption(), row.shown);
   }
+}
+
+TEST_F(PilotTest, WhatTheHostTakesBackIsNoLongerReadOut) {
+  publishFrame(kTopNPath, {{12, -7}}, 0);
+  EXPECT_EQ(text("I0TextBox"), "0 dBm");
+  panel->vfpOp(0, 10, 14);
+  EXPECT_EQ(text("I0TextBox"), "");  // of a set that has had none
+  hub.publish(kAllPilotsPath + "Io", Variant(-70));
+  EXPECT_EQ(text("I0TextBox"), "-70 dBm");
+  hub.publish(kAllPilotsPath + "Io", Variant());
+  hub.publish(kCarrierPath + "One Pps", Variant(1));
+  hub.publish(kCarrierPath + "One Pps", Variant());
+  EXPECT_EQ(text("I0TextBox"), "");
+  EXPECT_EQ(control("onePpsLabel").Caption(), "");
+  EXPECT_EQ(said(), "");
 }
 
 TEST_F(PilotTest, ARecordInAResultBufferIsShownLikeAFrame) {

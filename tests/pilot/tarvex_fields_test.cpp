@@ -57,6 +57,39 @@ TEST_F(PilotFieldsTest, ARefusedRequestIsReportedOnce) {
   click("userPNListAddButton");
   EXPECT_EQ(said(), "Tarvex::userPNListAddButton_Click() status = -8");
   EXPECT_EQ(listed(), "");
+  owner.settingChanged = [this](std::int16_t, const Variant&) { set(230, 5, 0); };
+  click("userPNListAddButton");  // the host edits the list and refuses
+  EXPECT_EQ(said(), "Tarvex::userPNListAddButton_Click() status = -8");
+  EXPECT_EQ(listed(), "5 0");
+  owner.settingChanged = {};
+  choose("FormatComboBox", 2);
+  EXPECT_EQ(said(), "Tarvex::newCdmaFormat() status = -8");
+  EXPECT_EQ(panel->fields().code.format(), 0);
+  EXPECT_EQ(panel->controls()->list("FormatComboBox").Text(), "IS-95B");
+}
+
+TEST_F(PilotFieldsTest, AThresholdComesAndGoesWithItsField) {
+  publishFrame(kTopNPath, {{12, -7}});
+  EXPECT_EQ(text("ThresholdTextBox"), "");
+  type("ThresholdTextBox", "0");
+  EXPECT_EQ(bars(203)->threshold(), 0);
+  panel->controls()->textBox("ThresholdTextBox").userText("");
+  control("ThresholdTextBox").userKey(13);
+  EXPECT_EQ(bars(203)->threshold(), std::nullopt);
+  panel->controls()->spinButton("ThresholdSpinButton").press(true);  // from the last one, by one
+  EXPECT_EQ(bars(203)->threshold(), 1);
+  publishFrame(kListPath, {{5, -9}});
+  EXPECT_EQ(text("ThresholdTextBox"), "");
+  type("ThresholdTextBox", "1");
+  EXPECT_EQ(bars(204)->threshold(), 1);
+  EXPECT_EQ(messages(), Messages{});
+}
+
+TEST_F(PilotFieldsTest, AHostThatClosesThePanelInsideARequestIsAskedNothingMore) {
+  owner.settingChanged = [this](std::int16_t, const Variant&) { panel->vfpOp(0, 1, {}); };
+  type("CodeStopTextBox", "100");
+  EXPECT_EQ(asked().size(), 2U);  // the request, and the view that goes
+  EXPECT_EQ(messages(), Messages{});
 }
 
 TEST_F(PilotFieldsTest, TheHostsAnswerInsideARequestIsTakenAndDoesNotChangeTheNext) {
@@ -83,6 +116,8 @@ TEST_F(PilotFieldsTest, CheckBoxesAskForTheirSetsAndTakeThemOffTheGraph) {
   EXPECT_EQ(asked(), (Calls{"frontPanelSet 7 4 750 0 False", "frontPanelOp 7 4 11 14"}));
   publishFrame(kTopNPath, {{12, -7}});
   EXPECT_EQ(bars(203), nullptr);
+  panel->vfpOp(0, 11, 14);  // the host does as it was asked
+  EXPECT_EQ(messages(), Messages{});
 }
 
 TEST_F(PilotFieldsTest, FieldsOfTheBarsChangeTheChartThatIsActive) {
@@ -182,6 +217,9 @@ TEST_F(PilotFieldsTest, TheUsersListIsEditedAndTheHostIsTold) {
   click("userPNListAddButton");
   type("userPNListTextBox", "600");  // the last one
   click("userPNListAddButton");
+  control("userPNListTextBox").SetFocus();
+  control("userPNListTextBox").userKey('x');
+  click("userPNListAddButton");  // the text is refused: what is back in the field was not meant
   EXPECT_EQ(listed(), "12 511");
   EXPECT_EQ(asked(), (Calls{"frontPanelSet 7 4 230 0 12", "frontPanelSet 7 4 230 1 511"}));
   EXPECT_FALSE(control("userPNListDeleteButton").Enabled());

@@ -85,6 +85,19 @@ TEST_F(PilotTest, CodesOfTheBarsChangeTheCurrentChartAndWithoutOneNothing) {
   EXPECT_EQ(messages(), Messages{});
 }
 
+TEST_F(PilotTest, TheChartThatTheHostChoosesIsTheCurrentOne) {
+  publishFrame(kListPath, {{5, -9}});
+  publishFrame(kTopNPath, {{12, -7}});
+  EXPECT_EQ(set(737, 204), 0);
+  set(729, 2);
+  EXPECT_EQ(bars(204)->barSortByMode(), 2);
+  EXPECT_EQ(bars(203)->barSortByMode(), 1);
+  set(731, 9);  // a quantity that the list does not offer
+  EXPECT_EQ(bars(204)->otherIs(), 9);
+  EXPECT_EQ(panel->controls()->list("BarLabelComboBox").ListIndex(), -1);
+  EXPECT_EQ(messages(), Messages{});
+}
+
 TEST_F(PilotTest, CellNamesStandOnlyWhereNamingIsEnabled) {
   publishFrame(kTopNPath, {{12, -7}});
   set(799, false);
@@ -119,6 +132,7 @@ TEST_F(PilotTest, CodesOfTheCodeWindowFillItsFieldsAndSayNothingBack) {
   EXPECT_EQ(messages(), Messages{});
   set(500, 9);
   EXPECT_EQ(said(), "clsEnumeratedParameter::value() ... could not find value (9) for ParameterType 231\r");
+  EXPECT_EQ(panel->fields().format.value(), 0);
 }
 
 TEST_F(PilotTest, ASetThatTheHostSwitchesOffStaysAwayUntilItIsSwitchedOn) {
@@ -132,8 +146,9 @@ TEST_F(PilotTest, ASetThatTheHostSwitchesOffStaysAwayUntilItIsSwitchedOn) {
   EXPECT_EQ(bars(203), nullptr);  // comes with its next frame
   publishFrame(kTopNPath, {{12, -7}});
   EXPECT_NE(bars(203), nullptr);
-  set(751, Variant("perhaps"));
-  EXPECT_EQ(said(), "BooleanValue(perhaps) ... unrecognized input\r");
+  EXPECT_EQ(set(750, Variant("perhaps")), -8);
+  EXPECT_EQ(said(), "Tarvex::vfpSet() ... \rType mismatch");
+  EXPECT_NE(bars(203), nullptr);
   EXPECT_EQ(asked(), Calls{});
 }
 
