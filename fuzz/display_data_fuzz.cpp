@@ -39,7 +39,7 @@ SpectrumView& servingPanel() {
     test = new PanelUnderTest;
     inputsLeft = kInputsPerPanel - 1;
   }
-  return test->panel();
+  return *test->spectrum();
 }
 
 void display(SpectrumView& panel, const std::vector<std::uint8_t>& buffer, std::int32_t cursor,

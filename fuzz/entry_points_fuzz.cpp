@@ -1,8 +1,9 @@
-// Any sequence of what a host, its container and its user can do to a panel: a byte a call, and what the call
-// takes.
+// Any sequence of what a host, its container and its user can do to a panel: a byte for the panel, then a
+// byte a call, and what the call takes.
 #include <cstdint>
 #include <iterator>
 #include <memory>
+#include <string>
 #include <vector>
 
 #include "entry/host_record_list.h"
@@ -13,6 +14,7 @@
 #include "fuzz/fuzz_variant.h"
 #include "fuzz/panel_under_test.h"
 #include "painters/multi_trace_painter.h"
+#include "pilot/cell_name_info.h"
 #include "platform/runtime_error.h"
 
 namespace frontpanels::fuzz {
@@ -53,14 +55,17 @@ void set(PanelUnderTest& test, Entry entry, FuzzInput& input) {
 
 void vfpOp(PanelUnderTest& test, FuzzInput& input) {
   operate(
-      test, [&](auto id, auto code, const auto& value) { return test.panel().vfpOp(id, code, value); },
+      test,
+      [&](auto id, auto code, const auto& value) { return test.panel().vfpOp(id, code, value, nullptr); },
       input);
 }
 
 void vfpSet(PanelUnderTest& test, FuzzInput& input) {
   set(
       test,
-      [&](auto id, auto code, auto, const auto& value) { return test.panel().vfpSet(id, code, 0, value); },
+      [&](auto id, auto code, auto index, const auto& value) {
+        return test.panel().vfpSet(id, code, index, value, nullptr);
+      },
       input);
 }
 
@@ -99,10 +104,12 @@ void limits(PanelUnderTest& test, FuzzInput& input) {
   const auto order = input.number<std::int8_t>();
   const HostRecordList records(
       std::vector<HostRecordList::Record>{{order, takeVariant(input), takeVariant(input)}});
-  enter(test, [&] { return test.panel().Limits(parameterType, records); });
-  test.panel().channels().setChannelLookup("0", &records);
-  test.panel().channels().setChannelZero(numberToText(input.number<double>()), &records);
-  test.panel().channels().setChannelSpacing("30000", &records);
+  SpectrumView* const panel = test.spectrum();
+  if (panel == nullptr) return;
+  enter(test, [&] { return panel->Limits(parameterType, records); });
+  panel->channels().setChannelLookup("0", &records);
+  panel->channels().setChannelZero(numberToText(input.number<double>()), &records);
+  panel->channels().setChannelSpacing("30000", &records);
 }
 
 void displayData(PanelUnderTest& test, FuzzInput& input) {
@@ -123,8 +130,55 @@ void PopUp_Click(PanelUnderTest& test, FuzzInput& input) {
   test.panel().PopUp_Click(subjectId, input.number<std::int16_t>());
 }
 
+std::vector<std::string> pathsOf(const Tarvex& panel, FuzzInput& input) {
+  const auto server = static_cast<PilotServer>(input.number<std::uint8_t>() % kPilotServers);
+  std::vector<std::string> paths(1);
+  for (const char letter : panel.paths(server)) {
+    if (letter == DataServer::kPathSeparator)
+      paths.emplace_back();
+    else
+      paths.back().push_back(letter);
+  }
+  return paths;
+}
+
 void publish(PanelUnderTest& test, FuzzInput& input) {
-  test.hub.publish(SpectrumView::kSpectrumPath, takeVariant(input));
+  if (test.pilots() == nullptr) return test.hub.publish(SpectrumView::kSpectrumPath, takeVariant(input));
+  const std::vector<std::string> paths = pathsOf(*test.pilots(), input);
+  test.hub.publish(paths[input.number<std::uint8_t>() % paths.size()], takeVariant(input));
+}
+
+// All paths of a server in their order: as many values for each, or for one of them another number or kind.
+void publishFrame(PanelUnderTest& test, FuzzInput& input) {
+  if (test.pilots() == nullptr) return;
+  const std::vector<std::string> paths = pathsOf(*test.pilots(), input);
+  const auto pilots = input.number<std::uint8_t>();
+  const std::size_t strange = input.number<std::uint8_t>() % (2 * paths.size());
+  for (std::size_t path = 0; path < paths.size(); ++path) {
+    if (path == strange) {
+      test.hub.publish(paths[path], takeVariant(input));
+      continue;
+    }
+    std::vector<float> values(pilots);
+    for (float& value : values) value = input.number<std::int8_t>();
+    test.hub.publish(paths[path], std::span<const float>(values));
+  }
+}
+
+void nameCells(PanelUnderTest& test, FuzzInput& input) {
+  if (test.pilots() == nullptr) return;
+  const auto names = std::make_shared<clsCellNameInfo>();
+  const auto text = input.bytes(input.number<std::uint8_t>());
+  names->SetCellName(input.number<std::int8_t>(), input.number<std::int8_t>(),
+                     std::string(text.begin(), text.end()));
+  test.pilots()->CellNameInfo(names);
+}
+
+void subscribe(PanelUnderTest& test, FuzzInput& input) {
+  if (test.pilots() == nullptr) return;
+  const auto server = static_cast<PilotServer>(input.number<std::uint8_t>() % kPilotServers);
+  const auto text = input.bytes(input.number<std::uint8_t>() % 16);
+  test.pilots()->paths(server, std::string(text.begin(), text.end()));
 }
 
 void resize(PanelUnderTest& test, FuzzInput& input) {
@@ -149,9 +203,16 @@ void KeyDown(PanelUnderTest& test, FuzzInput& input) {
   test.panel().KeyDown(keyCode, input.number<std::int8_t>());
 }
 
+// What both panels have under one name, and what the spectrum panel alone has.
+template <auto ofSpectrum, auto ofPilots>
+void call(PanelUnderTest& test, FuzzInput&) {
+  if (SpectrumView* const panel = test.spectrum()) (panel->*ofSpectrum)();
+  if (Tarvex* const panel = test.pilots()) (panel->*ofPilots)();
+}
+
 template <auto member>
 void call(PanelUnderTest& test, FuzzInput&) {
-  (test.panel().*member)();
+  if (SpectrumView* const panel = test.spectrum()) (panel->*member)();
 }
 
 template <auto member>
@@ -202,6 +263,7 @@ void setFlags(PanelUnderTest& test, FuzzInput& input) {
 }
 
 using V = SpectrumView;
+using T = Tarvex;
 using B = clsBaseVFP;
 
 // make_seeds writes the places of these rows.
@@ -210,17 +272,17 @@ constexpr Call kCalls[] = {
     vfpSet,
     publish,
     resize,
-    call<&V::Paint>,
-    mouse<&V::MouseDown, std::int16_t>,
-    mouse<&V::MouseMove, std::int16_t>,
-    mouse<&V::MouseUp, std::int16_t>,
-    mouse<&V::MouseDown, float>,
-    mouse<&V::MouseMove, float>,
-    mouse<&V::MouseUp, float>,
+    [](PanelUnderTest& test, FuzzInput&) { test.panel().Paint(); },
+    mouse<&FieldPanel::MouseDown, std::int16_t>,
+    mouse<&FieldPanel::MouseMove, std::int16_t>,
+    mouse<&FieldPanel::MouseUp, std::int16_t>,
+    mouse<&FieldPanel::MouseDown, float>,
+    mouse<&FieldPanel::MouseMove, float>,
+    mouse<&FieldPanel::MouseUp, float>,
     KeyDown,
-    call<&V::addMarker>,
-    call<&V::markerToMax>,
-    call<&V::markerToMin>,
+    call<&V::addMarker, &T::addMarker>,
+    call<&V::markerToMax, &T::markerToMax>,
+    call<&V::markerToMin, &T::markerToMin>,
     setFlags,
     displayData,
     displayParameter,
@@ -241,17 +303,20 @@ constexpr Call kCalls[] = {
     addTraceObject,
     useControl,
     limits,
-    call<&V::addDeltaMarker>,
-    call<&V::deleteMarker>,
+    call<&V::addDeltaMarker, &T::addDeltaMarker>,
+    call<&V::deleteMarker, &T::deleteMarker>,
     call<&V::markerToCenter>,
     call<&V::ChannelizationCombo_Change>,
     [](PanelUnderTest& test, FuzzInput& input) {
       test.panel().contextMenuClick(input.number<std::int8_t>());
     },
+    publishFrame,
+    nameCells,
+    subscribe,
 };
 
 void run(FuzzInput input) {
-  PanelUnderTest test;
+  PanelUnderTest test((input.number<std::uint8_t>() & 1) == 0 ? PanelKind::Spectrum : PanelKind::Pilots);
   for (int i = 0; i < kMaxCalls && !input.empty(); ++i)
     kCalls[input.number<std::uint8_t>() % std::size(kCalls)](test, input);
 }

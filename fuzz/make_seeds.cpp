@@ -184,12 +184,14 @@ constexpr std::uint8_t kShown = 64;  // one of them
 constexpr std::uint8_t kObeys = 128;
 constexpr std::uint8_t kDisplayData = 16;
 constexpr std::uint8_t kPopUpClick = 18;
-constexpr std::uint8_t kAddTraceObject = 30;  // the last
+constexpr std::uint8_t kAddTraceObject = 30;  // up to it each call is a seed of its own
+constexpr std::uint8_t kPublishFrame = 38;
 constexpr std::uint8_t kKinds = 20;
 constexpr std::int16_t kButtons[] = {1, 9, 21, 900, 901, 1002};
 
-constexpr std::int16_t kParameterCodes[] = {11,  13,  14,  15,  18,  43,  44,  45,  312, 314, 315, 322,
-                                            700, 701, 702, 703, 704, 705, 706, 714, 716, 717, 719, 722,
+constexpr std::int16_t kParameterCodes[] = {11,  13,  14,  15,  18,  43,  44,  45,  230, 312, 314, 315, 322,
+                                            500, 502, 728, 729, 730, 731, 732, 750, 751, 775, 776, 780, 803,
+                                            804, 700, 701, 702, 703, 704, 705, 706, 714, 716, 717, 719, 722,
                                             726, 727, 735, 736, 737, 740, 741, 742, 743, 744, 799, 810};
 
 Bytes operation(std::int16_t code, const Bytes& parameter) {
@@ -229,6 +231,32 @@ Bytes draggedBar() {
   return bytes;
 }
 
+// A frame of three pilots for each server. The byte before the values says which path is strange: none.
+Bytes pilotFrames() {
+  struct Server {
+    std::uint8_t paths;
+    std::uint8_t noneStrange;
+  };
+  constexpr Server kServers[] = {{2, 3}, {2, 3}, {7, 13}, {7, 13}, {3, 5}};
+  Bytes bytes = joined(kFlags, kShown);
+  for (std::uint8_t server = 0; server < 5; ++server) {
+    bytes = joined(bytes, kPublishFrame, server, std::uint8_t{3}, kServers[server].noneStrange);
+    for (int value = 0; value < 3 * kServers[server].paths; ++value)
+      bytes.push_back(static_cast<std::uint8_t>(value * 11));
+  }
+  return bytes;
+}
+
+// Each session on both panels.
+Seeds onBothPanels(const Seeds& sessions) {
+  Seeds seeds;
+  for (const Seed& seed : sessions) {
+    seeds.push_back({seed.name, joined(std::uint8_t{0}, seed.bytes)});
+    seeds.push_back({seed.name + "_pilots", joined(std::uint8_t{1}, pilotFrames(), seed.bytes)});
+  }
+  return seeds;
+}
+
 Seeds entryPointSeeds() {
   const Bytes one = joined(Kind::Int16, std::int16_t{1});
   const Bytes yes = joined(Kind::Boolean, std::uint8_t{1});
@@ -261,7 +289,7 @@ Seeds entryPointSeeds() {
                      session(kDisplayData, static_cast<std::uint16_t>(seed.bytes.size()), seed.bytes)});
   for (std::uint8_t kind = 0; kind < kKinds; ++kind)
     add("value", kind, session(parameter(717, joined(kind, std::uint8_t{2}, 1.5, 2.5))));
-  return seeds;
+  return onBothPanels(seeds);
 }
 
 // Steps by their places in the table of entry_parser_fuzz.cpp.

@@ -23,10 +23,14 @@ std::size_t objects() { return drawing().liveObjects() + drawing().liveDcs(); }
 
 }  // namespace
 
-PanelUnderTest::PanelUnderTest() : view(screen(), kViewPx), objectsBefore_(objects()) {
+PanelUnderTest::PanelUnderTest(PanelKind kind) : view(screen(), kViewPx), objectsBefore_(objects()) {
   messageLog().clear();
-  panel_ = std::make_unique<SpectrumView>(
-      PanelEnvironment{drawing(), windowing, view, hub, ScreenMetrics{}, ""}, owner, owner);
+  const PanelEnvironment environment{drawing(), windowing, view, hub, ScreenMetrics{}, ""};
+  if (kind == PanelKind::Spectrum)
+    panel_ = std::make_unique<SpectrumView>(environment, owner, owner);
+  else
+    panel_ = std::make_unique<Tarvex>(
+        environment, PilotServices{fileDialogs_, systemTextFiles(), separators_}, owner, owner);
   panel_->Form_Resize();
 }
 
