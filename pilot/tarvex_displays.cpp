@@ -226,6 +226,7 @@ void Tarvex::showActiveTrace() {
           "addItems/removeItems been updated?");
     fields_.enableBarFields(bars);
   }
+  if (bars) controls()->control("MarkerFrame").ForeColor(std::nullopt);  // of the trace that was active
   showBarSettings();
   showVerticalAxis();
   showIo();
