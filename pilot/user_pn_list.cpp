@@ -36,6 +36,7 @@ void UserPnList::units(CodeUnits units, std::int32_t chipsPerPn) {
   showCodeUnits(entry, units, chipsPerPn, chipsPerPn);
   entry.step(step);
   std::vector<std::int32_t> offsets;
+  offsets.reserve(static_cast<std::size_t>(count()));
   for (std::int32_t i = 0; i < count(); ++i) offsets.push_back(pn(i));
   const std::int32_t chosen = selected();
   list_.Clear();
