@@ -162,7 +162,6 @@ void Tarvex::placeXAxis(clsMultiTracePainter& painter, PilotSet set) {
 void Tarvex::showPower(clsBarChartPainter& bars, bool withIo) {
   bars.useOffset(withIo);
   bars.suffixIs(withIo ? kDecibelMilliwatts : kDecibels);
-  bars.yAxisLabel(unitOf(withIo));
 }
 
 void Tarvex::showPower(clsMultiTracePainter& painter, bool withIo) {

@@ -63,8 +63,7 @@ bool UserPnList::edit(std::int16_t index, const Variant& value) {
 bool UserPnList::insertFromHost(std::int32_t position, const Variant& value) {
   if (position > count()) {
     report(
-        "::vfpSet() attempt to add an item at an index past the end of the List Box list/CDMA_CODE_OFFSET, ",
-        value);
+        "::vfpSet() attempt to add an item at an index past the end of the List Box list/CDMA_CODE_OFFSET, ");
     return false;
   }
   if (count() >= kMostItems) raiseOverflow();
