@@ -238,7 +238,6 @@ class clsBarChartPainter : public PlotPainter {
   void fillBy(T& setting, const T& value);
   template <class T>
   void sortBy(T& setting, const T& value);
-  // Fills the records from the block, raising as fillBar does, and reports a quantity that is not known.
   // How the members of one bar's text lie in its label.
   struct Texts {
     std::array<std::string_view, BarTextSizes::kQuantities + 1> parts;  // the key, then the quantities
@@ -263,6 +262,7 @@ class clsBarChartPainter : public PlotPainter {
   void writeKeysWithoutRoom(DcHandle dc);
   [[nodiscard]] std::string_view valueUnit() const;
 
+  // Fills the records from the block, raising as fillBar does, and reports a quantity that is not known.
   template <class ItemOf>
   void fillFromBlock(std::size_t count, ItemOf itemOf);
   void takeFilled();
