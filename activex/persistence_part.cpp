@@ -1,5 +1,7 @@
 #include "activex/persistence_part.h"
 
+#include <utility>
+
 #include "activex/barrier.h"
 #include "activex/stored_values.h"
 #include "framework/support/error_handler.h"
@@ -109,18 +111,22 @@ HRESULT PersistencePart::Load(IStorage* storage) {
 }
 
 // Stays dirty until the container says that the save is complete.
-HRESULT PersistencePart::Save(IStorage* storage, BOOL) {
+HRESULT PersistencePart::Save(IStorage* storage, BOOL sameAsLoad) {
   if (storage == nullptr) return E_POINTER;
   return reported(kWriting, [&] {
     ComPointer<IStream> stream;
     check(storage->CreateStream(kStreamName, STGM_CREATE | STGM_WRITE | STGM_SHARE_EXCLUSIVE, 0, 0,
                                 stream.receive()));
     writeStream(*stream.get());
+    saved_ = sameAsLoad ? Saved::Original : Saved::Copy;
   });
 }
 
-HRESULT PersistencePart::SaveCompleted(IStorage*) {
-  core().dirty(false);
+// A copy leaves the original unsaved, unless the container goes on with the copy's storage. After a save that
+// failed a storage comes back as well: the control is as dirty as it was then.
+HRESULT PersistencePart::SaveCompleted(IStorage* storage) {
+  const Saved saved = std::exchange(saved_, Saved::Nothing);
+  if (saved == Saved::Original || (saved == Saved::Copy && storage != nullptr)) core().dirty(false);
   return S_OK;
 }
 

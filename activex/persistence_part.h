@@ -33,10 +33,15 @@ class PersistencePart final : public ControlPart<IPersistStreamInit, IPersistPro
   HRESULT STDMETHODCALLTYPE HandsOffStorage() override { return S_OK; }
 
  private:
+  // What a storage got since the container last said that a save is complete.
+  enum class Saved { Nothing, Original, Copy };
+
   void apply(const StoredValues& values);
   [[nodiscard]] StoredState state() const;
   void readStream(IStream& stream);
   void writeStream(IStream& stream) const;
+
+  Saved saved_ = Saved::Nothing;
 };
 
 }  // namespace frontpanels::activex
