@@ -25,7 +25,6 @@ namespace {
 constexpr int kHardwareId = 7;
 
 using Texts = std::vector<std::string>;
-using Lines = std::vector<std::wstring>;
 
 std::wstring takeMessages(const Desk& desk) {
   std::wstring all;
@@ -36,32 +35,6 @@ std::wstring takeMessages(const Desk& desk) {
 }
 
 // --- Requests
-
-// Notes any event: its number, then the arguments as texts, none for an empty one, the status as it came in.
-class EventSink final : public Listener {
- public:
-  Lines received;
-  std::function<void()> during = [] {};  // in the middle of the event
-  HRESULT answer = S_OK;                 // DISP_E_MEMBERNOTFOUND: no handler
-  LONG status = 0;                       // what is written into the status
-
-  HRESULT STDMETHODCALLTYPE Invoke(DISPID member, REFIID, LCID, WORD, DISPPARAMS* parameters, VARIANT*,
-                                   EXCEPINFO*, UINT*) override {
-    if (answer != S_OK) return answer;
-    VARIANT* const arguments = parameters->rgvarg;  // the last comes first
-    if (V_VT(&arguments[0]) != (VT_BYREF | VT_I4)) return DISP_E_TYPEMISMATCH;
-    std::wstring line = std::to_wstring(member);
-    for (UINT i = parameters->cArgs; i > 0; --i) {
-      Value text;
-      const bool plain = SUCCEEDED(VariantChangeType(text.get(), &arguments[i - 1], 0, VT_BSTR));
-      line += L" " + (plain ? text.text() : std::wstring(L"?"));
-    }
-    received.push_back(line);
-    *V_I4REF(&arguments[0]) = status;
-    during();
-    return S_OK;
-  }
-};
 
 void answersOfTheHost(const Desk& desk) {
   Hosted hosted;
@@ -440,38 +413,6 @@ void drawsIntoMetafiles(const Desk&) {
 }
 
 // --- Storage
-
-// Knows texts only, as a page does.
-class TextBag final : public Counted<IPropertyBag> {
- public:
-  std::map<std::wstring, std::wstring> texts;
-  HRESULT STDMETHODCALLTYPE Read(LPCOLESTR name, VARIANT* value, IErrorLog*) override {
-    if (texts.count(name) == 0) return E_INVALIDARG;
-    V_VT(value) = VT_BSTR;
-    V_BSTR(value) = SysAllocString(texts[name].c_str());
-    return S_OK;
-  }
-  HRESULT STDMETHODCALLTYPE Write(LPCOLESTR name, VARIANT* value) override {
-    Value text;
-    VariantChangeType(text.get(), value, VARIANT_ALPHABOOL, VT_BSTR);
-    texts[name] = text.text();
-    return S_OK;
-  }
-
- protected:
-  void* find(REFIID id) override { return id == IID_IUnknown || id == IID_IPropertyBag ? this : nullptr; }
-};
-
-class ErrorLog final : public Counted<IErrorLog> {
- public:
-  Lines names;
-  HRESULT STDMETHODCALLTYPE AddError(LPCOLESTR name, EXCEPINFO*) override {
-    return names.push_back(name), S_OK;
-  }
-
- protected:
-  void* find(REFIID id) override { return id == IID_IUnknown || id == IID_IErrorLog ? this : nullptr; }
-};
 
 using Bag = std::map<std::wstring, std::wstring>;
 

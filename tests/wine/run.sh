@@ -149,6 +149,7 @@ script late_bound.vbs
 script pilots.vbs
 program container container_test "$(windows_path "$out")"
 program contract contract_test
+program hosts hosts_test
 program foreign_container contract_test atl atl.dll
 program closed_loop closed_loop_test
 fields
