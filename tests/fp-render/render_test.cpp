@@ -115,7 +115,7 @@ TEST_F(RenderTest, LeavesNoHalfPictureWhereItCannotWrite) {
 
 TEST_F(RenderTest, ExplainsItself) {
   EXPECT_EQ(run({"--version"}), 0);
-  EXPECT_EQ(output.str(), "fp-render 0.1.0\n");
+  EXPECT_EQ(output.str(), "fp-render " FRONTPANELS_VERSION "\n");
   EXPECT_EQ(run({"--help"}), 0);
   EXPECT_TRUE(output.str().starts_with("usage: fp-render RECORDING [-o DIR] [--sweep N]\n"));
   EXPECT_EQ(run({"--sweep", "none", "a.csv"}), 2);
