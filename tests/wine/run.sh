@@ -52,7 +52,7 @@ script() {
 program() {
   local name=$1 file=$2
   shift 2
-  timeout 300 wine "$root/build/win64/tests/wine/$file.exe" "$@" 2>&1 </dev/null | tr -d '\r' >"$out/$name.log"
+  timeout 600 wine "$root/build/win64/tests/wine/$file.exe" "$@" 2>&1 </dev/null | tr -d '\r' >"$out/$name.log"
   grep -E '^(ok|not ok) ' "$out/$name.log"
   count "$out/$name.log" "$name"
 }
@@ -150,6 +150,7 @@ script pilots.vbs
 program container container_test "$(windows_path "$out")"
 program contract contract_test
 program hosts hosts_test
+program lives lives_test
 program foreign_container contract_test atl atl.dll
 program closed_loop closed_loop_test
 fields
