@@ -401,7 +401,8 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
   void mouseDown(const MouseEvent& e) override { base().MouseDown(e.button, e.shift, e.xTwips, e.yTwips); }
   void mouseMove(const MouseEvent& e) override { base().MouseMove(e.button, e.shift, e.xTwips, e.yTwips); }
   void mouseUp(const MouseEvent& e) override { base().MouseUp(e.button, e.shift, e.xTwips, e.yTwips); }
-  void keyDown(std::int16_t keyCode, std::int16_t shift) override { base().KeyDown(keyCode, shift); }
+  bool usesKey(std::int16_t keyCode, std::int16_t shift) override { return base().usesKey(keyCode, shift); }
+  bool keyDown(std::int16_t keyCode, std::int16_t shift) override { return base().KeyDown(keyCode, shift); }
   std::vector<PanelMenuItem> contextMenu() override { return panel().contextMenu(); }
   void contextMenuClick(std::int16_t id) override { panel().contextMenuClick(id); }
 

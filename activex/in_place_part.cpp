@@ -11,7 +11,7 @@ namespace {
 
 constexpr wchar_t kObjectName[] = L"Front Panels";
 
-// Keys that move markers, and the caret of a field.
+// Keys that move the caret of a field. Those of the graph never come this far.
 constexpr WPARAM kArrowKeys[] = {VK_LEFT, VK_RIGHT, VK_UP, VK_DOWN, VK_HOME, VK_END};
 
 bool isArrow(WPARAM key) {

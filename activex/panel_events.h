@@ -31,7 +31,9 @@ class PanelEvents {
   virtual void mouseDown(const MouseEvent& event) = 0;
   virtual void mouseMove(const MouseEvent& event) = 0;
   virtual void mouseUp(const MouseEvent& event) = 0;
-  virtual void keyDown(std::int16_t keyCode, std::int16_t shift) = 0;
+  // Whether the graph has a use for the key, and the key itself with the same answer.
+  [[nodiscard]] virtual bool usesKey(std::int16_t keyCode, std::int16_t shift) = 0;
+  virtual bool keyDown(std::int16_t keyCode, std::int16_t shift) = 0;
   // The graph's own menu, empty for none.
   [[nodiscard]] virtual std::vector<PanelMenuItem> contextMenu() = 0;
   virtual void contextMenuClick(std::int16_t id) = 0;

@@ -294,12 +294,11 @@ LRESULT PanelWindow::handleInput(UINT message, WPARAM wParam, LPARAM lParam) {
       if (events_ != nullptr && owner_.inUse()) events_->mouseMove(mouseEvent(buttonsHeld(wParam), lParam));
       return 0;
     case WM_KEYDOWN:
-      return keyDown(wParam), 0;
     case WM_SYSCHAR:
       if (untranslatedKey(message, wParam)) return 0;
       break;
     case WM_GETDLGCODE:
-      return DLGC_WANTARROWS | (fields_ ? DLGC_WANTTAB : 0);
+      return dialogCode(reinterpret_cast<const MSG*>(lParam));
     case WM_CONTEXTMENU:
       if (reinterpret_cast<HWND>(wParam) == window_ && showMenu(lParam)) return 0;
       break;
@@ -372,7 +371,12 @@ void PanelWindow::run(const std::function<void()>& body) noexcept {
 }
 
 bool PanelWindow::translateKey(const MSG& message) {
-  if (!fields_ || window_ == nullptr || !owner_.inUse()) return false;
+  if (window_ == nullptr || !owner_.inUse()) return false;
+  if (message.hwnd == window_ && message.message == WM_KEYDOWN && events_ != nullptr &&
+      events_->keyDown(static_cast<std::int16_t>(message.wParam), shiftState()))
+    return true;
+  // What the key has led to may have closed the panel.
+  if (!fields_ || window_ == nullptr) return false;
   const bool tab = message.message == WM_KEYDOWN && message.wParam == VK_TAB && GetKeyState(VK_SHIFT) >= 0 &&
                    GetKeyState(VK_CONTROL) >= 0;
   if (tab && message.hwnd == window_) return fields_->enter(true);
@@ -380,13 +384,21 @@ bool PanelWindow::translateKey(const MSG& message) {
 }
 
 bool PanelWindow::untranslatedKey(UINT message, WPARAM key) {
-  if (!fields_ || !owner_.inUse()) return false;
-  return translateKey(MSG{window_, message, key, 0, 0, {}}) || fields_->untranslatedKey(message, key);
+  if (!owner_.inUse()) return false;
+  return translateKey(MSG{window_, message, key, 0, 0, {}}) ||
+         (fields_ && fields_->untranslatedKey(message, key));
 }
 
-void PanelWindow::keyDown(WPARAM key) {
-  if (untranslatedKey(WM_KEYDOWN, key)) return;
-  if (events_ != nullptr && owner_.inUse()) events_->keyDown(static_cast<std::int16_t>(key), shiftState());
+// A dialog asks for each key, and for the character that a letter types: that goes where its key goes.
+LRESULT PanelWindow::dialogCode(const MSG* message) {
+  const LRESULT tab = fields_ ? DLGC_WANTTAB : 0;
+  if (message == nullptr) return tab | DLGC_WANTARROWS;
+  const WPARAM letter = message->wParam & ~WPARAM{0x20};
+  const bool pressed = message->message == WM_KEYDOWN;
+  const bool typed = message->message == WM_CHAR && letter >= 'A' && letter <= 'Z';
+  if ((!pressed && !typed) || events_ == nullptr || !owner_.inUse()) return tab;
+  const auto key = static_cast<std::int16_t>(pressed ? message->wParam : letter);
+  return tab | (events_->usesKey(key, shiftState()) ? DLGC_WANTMESSAGE : 0);
 }
 
 bool PanelWindow::holds(HWND window) const noexcept {

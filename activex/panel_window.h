@@ -100,7 +100,7 @@ class PanelWindow final : public GraphView, private FieldsOwner {
   void paintInto(HDC dc);
   void print(HDC dc);
   void fillMargins(HDC dc);
-  void keyDown(WPARAM key);
+  [[nodiscard]] LRESULT dialogCode(const MSG* message);
   [[nodiscard]] bool untranslatedKey(UINT message, WPARAM key);
   void takeFocus();
   [[nodiscard]] bool holds(HWND window) const noexcept;

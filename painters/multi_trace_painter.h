@@ -15,6 +15,7 @@
 
 #include "entry/numeric_entry.h"
 #include "painters/marker_readout.h"
+#include "painters/marker_steps.h"
 #include "painters/plot_painter.h"
 #include "painters/trace_store.h"
 #include "platform/gdi.h"
@@ -165,6 +166,8 @@ class clsMultiTracePainter : public PlotPainter {
                         std::optional<std::int16_t> traceIndex = std::nullopt) override;
   // Null when no trace has a marker with the id.
   [[nodiscard]] MarkerPointer findMarker(std::string_view markerId);
+  // The other marker of a pair of normal and delta marker; null when the marker has none.
+  [[nodiscard]] MarkerPointer partnerOf(const clsMarker& marker);
   void addMarkerToTrace(MarkerPointer marker, std::int16_t traceId) override;
   // Removes the active marker, with its delta marker; the most recently chosen one left becomes active.
   void deleteActiveMarker();
@@ -175,6 +178,10 @@ class clsMultiTracePainter : public PlotPainter {
   void ResetMarkers();
   void markerToMax() override;
   void markerToMin() override;
+  // Along the values of its trace. Nothing without an active marker.
+  void activeMarkerToEnd(TraceEnd end);
+  void moveActiveMarkerATenth(Towards side);
+  void activeMarkerToPeak(PeakOrder order);
   // 39 (right arrow) moves the active marker one point right, every other key one point left. The range is
   // not checked here.
   void KeyPress(std::int16_t key) override;
@@ -225,6 +232,8 @@ class clsMultiTracePainter : public PlotPainter {
 
   enum class Readout : std::uint8_t { WithDelta, Full, LevelOnly };
   void markerToExtreme(double MinMax::*index);
+  template <class Step>
+  void stepActiveMarker(Step step);
   void drawMarkersOf(DcHandle dc, std::size_t trace);
   // False where the marker has no point to stand on: a gap, or beyond the trace.
   bool placeMarker(std::size_t trace, clsMarker& marker);
@@ -235,7 +244,6 @@ class clsMultiTracePainter : public PlotPainter {
   void writeReadout(DcHandle dc);
   [[nodiscard]] ReadoutFormat readoutFormat() const;
   void composeReadout(Readout readout);
-  [[nodiscard]] MarkerPointer partnerOf(const clsMarker& marker);
 
   TraceStore traces_;
   std::int16_t selectedTraceIndex_ = 0;

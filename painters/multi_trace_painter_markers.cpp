@@ -133,6 +133,33 @@ void clsMultiTracePainter::markerToExtreme(double MinMax::*index) {
   });
 }
 
+// Keys are rare: the values are copied rather than looked at in each type that they may have.
+template <class Step>
+void clsMultiTracePainter::stepActiveMarker(Step step) {
+  guard("stepActiveMarker() ...", [&] {
+    if (activeMarker() == nullptr) return;
+    const std::int16_t trace = traces_.findMarker(activeMarker().get());
+    if (trace == -1) return;
+    const TraceSlot& slot = traces_.slot(trace);
+    std::vector<double> values(slot.data.isArray() ? slot.valueCount() : 0);
+    for (std::size_t i = 0; i < values.size(); ++i) values[i] = slot.valueAt(i);
+    activeMarker()->point = step(values, shownPoint(slot, *activeMarker()));
+  });
+}
+
+void clsMultiTracePainter::activeMarkerToEnd(TraceEnd end) {
+  stepActiveMarker([end](const auto& values, std::int32_t from) { return endPoint(values, from, end); });
+}
+
+void clsMultiTracePainter::moveActiveMarkerATenth(Towards side) {
+  stepActiveMarker(
+      [side](const auto& values, std::int32_t from) { return pointATenthOn(values, from, side); });
+}
+
+void clsMultiTracePainter::activeMarkerToPeak(PeakOrder order) {
+  stepActiveMarker([order](const auto& values, std::int32_t from) { return nextPeak(values, from, order); });
+}
+
 // --- Where markers are and what they read
 
 void clsMultiTracePainter::drawMarkers(DcHandle dc) {
@@ -285,7 +312,6 @@ void clsMultiTracePainter::composeReadout(Readout readout) {
   }
 }
 
-// The other marker of a pair of normal and delta marker; null when the marker has none.
 MarkerPointer clsMultiTracePainter::partnerOf(const clsMarker& marker) {
   if (marker.deltaPartner.empty()) return nullptr;
   const std::int16_t trace = traces_.findMarker(&marker);

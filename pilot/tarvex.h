@@ -213,6 +213,7 @@ class Tarvex final : public FieldPanel {
   bool linkParameter(const FrontPanelLink& link) override;
   std::optional<double> linkedValue(std::int32_t parameterType) override;
   [[nodiscard]] clsNumericEntry* linkedEntry(std::int32_t parameterType);
+  [[nodiscard]] PlotCommands& plotCommands() override { return markers_; }
 
   PilotServices services_;
   PilotFields fields_;

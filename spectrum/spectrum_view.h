@@ -147,6 +147,7 @@ class SpectrumView final : public FieldPanel {
   [[nodiscard]] std::optional<double> linkedValue(std::int32_t parameterType) override;
   [[nodiscard]] std::span<const char* const> linkedByName() const override;
   [[nodiscard]] std::vector<MenuCommand> ownMenuCommands() override;
+  [[nodiscard]] PlotCommands& plotCommands() override { return markers_; }
 
   SpectrumFields fields_;
   MarkerCommands markers_;

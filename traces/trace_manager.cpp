@@ -390,13 +390,31 @@ void clsTraceManager::activateTraceAt(SurfacePoint at) {
   for (const TracePointer& traceObject : traces_) {
     const PanelArea panel{traceObject->scaleLeft(), traceObject->scaleTop(), traceObject->scaleWidth(),
                           traceObject->scaleHeight()};
-    if (!panel.contains(at.x, at.y)) continue;
-    TraceForm& form = requireForm();
-    activeTrace_ = traceObject;
-    form.changedTraceConfiguration(TraceState::Added, activeTrace_.get(), activeTrace_->resultType());
-    paintTraces(true);
-    return;
+    if (panel.contains(at.x, at.y)) return makeActive(traceObject);
   }
+}
+
+void clsTraceManager::makeActive(const TracePointer& traceObject) {
+  TraceForm& form = requireForm();
+  activeTrace_ = traceObject;
+  form.changedTraceConfiguration(TraceState::Added, activeTrace_.get(), activeTrace_->resultType());
+  paintTraces(true);
+}
+
+bool clsTraceManager::activateNeighbour(bool behind) {
+  return guarded("activateNeighbour() failed ...", false, [&] {
+    TracePointer found;
+    bool passed = false;
+    for (const TracePointer& traceObject : traces_) {
+      if (traceObject == activeTrace_) passed = true;
+      if (traceObject == activeTrace_ || !traceObject->traceIsVisible() || passed != behind) continue;
+      found = traceObject;
+      if (behind) break;
+    }
+    if (!found) return false;
+    makeActive(found);
+    return true;
+  });
 }
 
 void clsTraceManager::MouseDown(std::int16_t button, std::int16_t shift, float xTwips, float yTwips,
@@ -407,12 +425,15 @@ void clsTraceManager::MouseDown(std::int16_t button, std::int16_t shift, float x
     activateTraceAt(at);
     switch (markerOperation) {
       case kNewMarker:
-        return newMarkerAt(at);
+        newMarkerAt(at);
+        break;
       case kNewDeltaMarker:
-        return newDeltaMarkerAt(at);
+        newDeltaMarkerAt(at);
+        break;
       default:
-        errorHandler().Assert("clsTraceManager::MouseDown() ... unknown marker operation");
+        return errorHandler().Assert("clsTraceManager::MouseDown() ... unknown marker operation");
     }
+    holdMarker();
   });
 }
 
@@ -422,6 +443,27 @@ void clsTraceManager::MouseDown(std::int16_t button, std::int16_t shift, float x
     const SurfacePoint at = toSurface(xTwips, yTwips);
     activateTraceAt(at);
     selectAMarker(at);
+    holdMarker();
+  });
+}
+
+void clsTraceManager::holdMarker() {
+  held_.marker = activeTrace_ ? activeTrace_->mouseActiveMarker() : nullptr;
+  if (held_.marker) held_.point = held_.marker->point;
+}
+
+bool clsTraceManager::holdsMarker() const {
+  return held_.marker && activeTrace_ && activeTrace_->mouseActiveMarker() == held_.marker;
+}
+
+// The trace may have become shorter in the meantime.
+void clsTraceManager::takeMarkerBack() {
+  guard("takeMarkerBack() failed ...", [this] {
+    if (!holdsMarker()) return;
+    held_.marker->point = std::min(held_.point, activeTrace_->traceSize());
+    held_.marker.reset();
+    activeTrace_->mouseActiveMarker(nullptr);
+    paintTraces(true);
   });
 }
 
@@ -443,6 +485,7 @@ void clsTraceManager::MouseMove(std::int16_t button, std::int16_t shift, float x
 
 void clsTraceManager::MouseUp(std::int16_t button, std::int16_t shift, float xTwips, float yTwips) {
   guard("MouseUp() failed ...", [&] {
+    held_.marker.reset();
     if (activeTrace_) activeTrace_->mouseActiveMarker(nullptr);
     if (horizontalBar_)
       horizontalBar_->MouseUp(button, shift, xTwips / metrics_.twipsPerPixelX,

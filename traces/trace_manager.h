@@ -80,6 +80,9 @@ class clsTraceManager {
   [[nodiscard]] float numberOfTraces() const noexcept { return numberOfTraces_; }
   void numberOfTraces(float count) noexcept { numberOfTraces_ = count; }
   [[nodiscard]] const Collection<TracePointer>& Traces() const noexcept { return traces_; }
+  // Makes the visible trace object before or behind the active one the active one, as a press into its panel
+  // would. False where there is none.
+  bool activateNeighbour(bool behind);
 
   // Composes the whole graph and copies it to the screen in one transfer. Everything is composed anew each
   // time; `forcePaint` is what callers use to say that nothing has changed but the look.
@@ -95,6 +98,9 @@ class clsTraceManager {
   void MouseDown(std::int16_t button, std::int16_t shift, float xTwips, float yTwips);
   void MouseMove(std::int16_t button, std::int16_t shift, float xTwips, float yTwips);
   void MouseUp(std::int16_t button, std::int16_t shift, float xTwips, float yTwips);
+  // A pressed button holds a marker. It can be taken back to where the press found it, and is free then.
+  [[nodiscard]] bool holdsMarker() const;
+  void takeMarkerBack();
 
   // Marker commands; each ends with a repaint.
   void markerToMax();
@@ -146,7 +152,9 @@ class clsTraceManager {
   void showMarkerFrameColor();
   void copyToScreen();
   [[nodiscard]] LabelFonts fontsOf(const TraceObject& traceObject) const;
+  void makeActive(const TracePointer& traceObject);
   void activateTraceAt(SurfacePoint at);
+  void holdMarker();
   void selectAMarker(SurfacePoint at);
   void newMarkerAt(SurfacePoint at);
   void newDeltaMarkerAt(SurfacePoint at);
@@ -172,6 +180,11 @@ class clsTraceManager {
   TracePointer activeTrace_;
   float numberOfTraces_ = 0;
   bool trackMarkers_ = true;
+  struct HeldMarker {
+    MarkerPointer marker;
+    std::int32_t point = 0;  // where the press found it
+  };
+  HeldMarker held_;
 
   std::unique_ptr<clsHorzSplitterBar> horizontalBar_;
   std::vector<std::unique_ptr<clsVertSplitterBar>> verticalBars_;

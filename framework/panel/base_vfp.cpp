@@ -14,8 +14,6 @@ namespace {
 constexpr std::string_view kNetworkParametersForm = "frmNetworkParameters";
 
 constexpr std::int16_t kLeftButton = 1;
-constexpr std::int16_t kLeftArrow = 37;
-constexpr std::int16_t kRightArrow = 39;
 
 }  // namespace
 
@@ -265,11 +263,18 @@ void clsBaseVFP::MouseUp(std::int16_t button, std::int16_t shift, float xTwips, 
   guard("clsBaseVFP::MouseUp() ... ", [&] { traceManager_->MouseUp(button, shift, xTwips, yTwips); });
 }
 
-void clsBaseVFP::KeyDown(std::int16_t keyCode, std::int16_t /*shift*/) {
-  guard("clsBaseVFP::KeyDown() ... ", [&] {
-    if (keyCode == kLeftArrow) traceManager_->moveMarkerLeft();
-    if (keyCode == kRightArrow) traceManager_->moveMarkerRight();
+bool clsBaseVFP::usesKey(std::int16_t keyCode, std::int16_t shift) {
+  if (closing_) return false;
+  return guarded("clsBaseVFP::usesKey() ... ", false, [&] {
+    const auto command = plotCommandOf(keyCode, shift);
+    return command && child_.canRun(*command);
   });
+}
+
+bool clsBaseVFP::KeyDown(std::int16_t keyCode, std::int16_t shift) {
+  if (!usesKey(keyCode, shift)) return false;
+  guard("clsBaseVFP::KeyDown() ... ", [&] { child_.run(plotCommandOf(keyCode, shift).value()); });
+  return true;
 }
 
 // Keys act when they go down.

@@ -83,7 +83,10 @@ class clsBaseVFP {
   void MouseDown(std::int16_t button, std::int16_t shift, float xTwips, float yTwips);
   void MouseMove(std::int16_t button, std::int16_t shift, float xTwips, float yTwips);
   void MouseUp(std::int16_t button, std::int16_t shift, float xTwips, float yTwips);
-  void KeyDown(std::int16_t keyCode, std::int16_t shift);
+  // Keys of the graph; key codes and `shift` as in plot_keys.h. Whether the graph has a use for the key now,
+  // and the key itself, which answers the same: one that it has no use for is the container's.
+  [[nodiscard]] bool usesKey(std::int16_t keyCode, std::int16_t shift);
+  bool KeyDown(std::int16_t keyCode, std::int16_t shift);
   void KeyUp(std::int16_t keyCode, std::int16_t shift);
   void Activate();
   // A window that the user closes stays until the host has closed the panel: `cancel` is set.

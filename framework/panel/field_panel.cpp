@@ -1,6 +1,7 @@
 #include "framework/panel/field_panel.h"
 
 #include <algorithm>
+#include <iterator>
 
 #include "framework/support/error_handler.h"
 #include "framework/support/guard.h"
@@ -16,6 +17,27 @@ constexpr const char* kDisplayAreaButton = "MarkerFrameInvisibleButton";
 constexpr const char* kMeasurementAreaButton = "MeasurementFrameInvisibleButton";
 // How wide a collapse button is, across the edge that it lies along.
 constexpr float kCollapseButtonTwips = 90;
+
+// Commands of keys that are those of a button or of one half of a spin button.
+struct ButtonKeyRow {
+  PlotCommand command;
+  const char* control;
+  std::function<void()> Control::*click;
+  std::function<void()> SpinButton::*spin;
+};
+constexpr const char* kVerticalScale = "VerticalScaleSpinButton";
+constexpr ButtonKeyRow kButtonKeys[] = {
+    {PlotCommand::MarkerToMax, "MarkerToMaxButton", &Control::Click, nullptr},
+    {PlotCommand::MarkerToCenter, "MarkerToCenterButton", &Control::Click, nullptr},
+    {PlotCommand::WidenScale, kVerticalScale, nullptr, &SpinButton::SpinUp},
+    {PlotCommand::NarrowScale, kVerticalScale, nullptr, &SpinButton::SpinDown},
+};
+
+const ButtonKeyRow* findButtonKey(PlotCommand command) {
+  const auto* const row = std::find_if(std::begin(kButtonKeys), std::end(kButtonKeys),
+                                       [command](const ButtonKeyRow& key) { return key.command == command; });
+  return row == std::end(kButtonKeys) ? nullptr : row;
+}
 
 std::string upperCased(std::string_view name) {
   std::string upper(name);
@@ -90,6 +112,30 @@ void FieldPanel::evaluateEnablingMarkerToCenter() {
   guard([this] { return named("evaluateEnablingMarkerToCenter()"); },
         [this] {
           if (Control* const button = MarkerToCenterButton()) button->Enabled(mayCenterMarker());
+        });
+}
+
+// --- Keys
+
+bool FieldPanel::canRun(PlotCommand command) {
+  const ButtonKeyRow* const row = findButtonKey(command);
+  if (row == nullptr) return plotCommands().canRun(command);
+  const Control* const button = controls_.find(row->control);
+  return button != nullptr && button->reallyEnabled();
+}
+
+void FieldPanel::run(PlotCommand command) {
+  guard([this] { return named("run() ... "); },
+        [&] {
+          if (!canRun(command)) return;
+          const ButtonKeyRow* const row = findButtonKey(command);
+          if (row == nullptr) {
+            plotCommands().run(command);
+            return evaluateEnablingMarkerToCenter();  // the active marker may be another one
+          }
+          const auto& does = row->spin != nullptr ? controls_.spinButton(row->control).*(row->spin)
+                                                  : controls_.control(row->control).*(row->click);
+          if (does) does();
         });
 }
 

@@ -60,7 +60,8 @@ class FieldPanel : public HostedPanel {
   void MouseUp(std::int16_t button, std::int16_t shift, float xTwips, float yTwips) {
     base_.MouseUp(button, shift, xTwips, yTwips);
   }
-  void KeyDown(std::int16_t keyCode, std::int16_t shift) { base_.KeyDown(keyCode, shift); }
+  // False for a key that the graph has no use for.
+  bool KeyDown(std::int16_t keyCode, std::int16_t shift) { return base_.KeyDown(keyCode, shift); }
 
   // --- The panel as its base sees it
   std::string typeName() override { return typeName_; }
@@ -79,6 +80,11 @@ class FieldPanel : public HostedPanel {
   Control* MarkerToCenterButton() override { return controls_.find("MarkerToCenterButton"); }
   // There is an active marker, and neither logging nor playback holds the receiver where it is.
   void evaluateEnablingMarkerToCenter() override;
+
+  // Commands of keys. One that a button or spin button stands for does what that does, while it is enabled;
+  // it need not be in sight.
+  bool canRun(PlotCommand command) override;
+  void run(PlotCommand command) override;
 
   // The two areas, the panel's own items, properties and close; ids count from 1 in that order.
   std::vector<PanelMenuItem> contextMenu() override;
@@ -106,6 +112,9 @@ class FieldPanel : public HostedPanel {
     std::function<void()> run;
   };
   [[nodiscard]] virtual std::vector<MenuCommand> ownMenuCommands() { return {}; }
+
+  // What runs the commands that no button stands for.
+  [[nodiscard]] virtual PlotCommands& plotCommands() = 0;
 
   // False for what nothing on the panel goes by; it is reported then.
   [[nodiscard]] virtual bool linkAction(const FrontPanelLink& /*link*/) { return false; }

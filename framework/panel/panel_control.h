@@ -10,6 +10,7 @@
 #include "platform/controls.h"
 #include "platform/result_reader.h"
 #include "platform/variant.h"
+#include "traces/plot_keys.h"
 #include "traces/trace_form.h"
 
 namespace frontpanels {
@@ -42,7 +43,7 @@ struct FrontPanelLink {
 };
 
 // Its base makes requests to the host through it.
-class PanelControl : public TraceForm, public PanelHost {
+class PanelControl : public TraceForm, public PanelHost, public PlotCommands {
  public:
   // Entry points and what the base calls back. `base` is null unless the panel shows several measurements
   // through bases of their own; then it says which of them calls.

@@ -105,6 +105,9 @@ class FakePanelControl : public HostedPanel {
   std::string reportHtml() override { return "<p>"; }
   std::string linkSourceName() override { return "source"; }
 
+  bool canRun(PlotCommand) override { return false; }
+  void run(PlotCommand) override {}
+
   std::string typeName() override { return className; }
   void changedTraceConfiguration(TraceState, TraceObject*, std::int16_t) override {}
   void setMarkerFrameColor(Color) override {}

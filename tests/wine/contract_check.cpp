@@ -348,10 +348,22 @@ void sharesTheKeys(const Desk& desk) {
   put(*hosted.members.get(), L"MeasurementPanelVisible", false);
   const auto active = hosted.object.query<IOleInPlaceActiveObject>();
   MSG left{hosted.window(), WM_KEYDOWN, VK_LEFT, 0, 0, {}};
-  expect(active->TranslateAccelerator(&left) == S_FALSE && container.count("TranslateAccelerator") == 0,
-         "an arrow is the panel's, unasked");
+  expect(active->TranslateAccelerator(&left) == S_OK && container.count("TranslateAccelerator") == 1,
+         "an arrow is the container's while there is no marker");
+  publish(carrier());
+  hosted.call(L"addMarker");
+  MSG letter{hosted.window(), WM_CHAR, 'p', 0, 0, {}};
+  const auto code = [&](const MSG& message) {
+    return SendMessageW(hosted.window(), WM_GETDLGCODE, message.wParam, reinterpret_cast<LPARAM>(&message));
+  };
+  expect(active->TranslateAccelerator(&left) == S_OK && container.count("TranslateAccelerator") == 1,
+         "and the panel's, unasked, when there is one");
+  MSG percent{hosted.window(), WM_CHAR, '%', 0, 0, {}};  // its number is that of the left arrow
+  expect((code(left) & DLGC_WANTMESSAGE) != 0 && (code(letter) & DLGC_WANTMESSAGE) != 0 &&
+             (code(percent) & DLGC_WANTMESSAGE) == 0,
+         "a dialog hears the same, of a letter that is a key too");
   MSG tab{hosted.window(), WM_KEYDOWN, VK_TAB, 0, 0, {}};
-  expect(active->TranslateAccelerator(&tab) == S_OK && container.count("TranslateAccelerator") == 1,
+  expect(active->TranslateAccelerator(&tab) == S_OK && container.count("TranslateAccelerator") == 2,
          "Tab is the container's where no field is in sight");
 }
 
