@@ -134,6 +134,7 @@ class Tarvex final : public FieldPanel {
   void switchSet(PilotSet set, bool on);
   void showSet(const PilotSetRow& row, bool on);
   void setInsets(PlotPainter& painter) const;
+  void rescaled() override;
   void setUp(clsMultiTracePainter& painter, PilotSet set);
   void setUp(clsBarChartPainter& painter, PilotSet set);
   void placeXAxis(clsMultiTracePainter& painter, PilotSet set);

@@ -116,6 +116,11 @@ void Tarvex::setInsets(PlotPainter& painter) const {
   painter.gridScaleBottom(kInsets.bottom / metrics().twipsPerPixelY);
 }
 
+void Tarvex::rescaled() {
+  for (const TracePointer& trace : base().traceManager().Traces())
+    if (auto* const painter = dynamic_cast<PlotPainter*>(trace.get())) setInsets(*painter);
+}
+
 void Tarvex::setUp(clsMultiTracePainter& painter, PilotSet set) {
   setInsets(painter);
   painter.offset(0);

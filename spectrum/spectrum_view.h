@@ -133,6 +133,8 @@ class SpectrumView final : public FieldPanel {
   [[nodiscard]] clsMultiTracePainter* activePainter() const { return markers_.activePainter(); }
   [[nodiscard]] clsMultiTracePainter& findOrAddPainter();
   void setUpTrace(clsMultiTracePainter& painter);
+  void setInsets(PlotPainter& painter) const;
+  void rescaled() override;
   void formatXAxis(clsMultiTracePainter& painter);
   void updateXAxisLabels();
   void adjustResolution(clsNumericEntry& formatter);

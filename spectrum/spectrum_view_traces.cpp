@@ -107,11 +107,20 @@ void SpectrumView::setUpTrace(clsMultiTracePainter& painter) {
   painter.gridScaleTop(fields_.verticalOffset.value());
   painter.setAutoScale(fields_.controls.checkBox("AutoScaleBox").Value() != 0);
   painter.yAxisLabel("dBm");
+  setInsets(painter);
+  updateXAxisLabels();
+}
+
+void SpectrumView::setInsets(PlotPainter& painter) const {
   painter.gridScaleLeft(kInsetLeftTwips / metrics().twipsPerPixelX);
   painter.gridInsetTop(kInsetTopTwips / metrics().twipsPerPixelY);
   painter.gridScaleRight(kInsetRightTwips / metrics().twipsPerPixelX);
   painter.gridScaleBottom(kInsetBottomTwips / metrics().twipsPerPixelY);
-  updateXAxisLabels();
+}
+
+void SpectrumView::rescaled() {
+  for (const TracePointer& trace : base().traceManager().Traces())
+    if (auto* const painter = dynamic_cast<PlotPainter*>(trace.get())) setInsets(*painter);
 }
 
 // The axis reads as the centre entry does: in the same channels or units.

@@ -28,7 +28,7 @@ bool boldLabels(std::string_view commandLine) noexcept {
   return commandLine.find("NormalLabels") == std::string_view::npos;
 }
 
-LabelFontSet::LabelFontSet(Gdi& gdi, ScreenMetrics metrics, bool bold) : gdi_(gdi) {
+LabelFontSet::LabelFontSet(Gdi& gdi, ScreenMetrics metrics, bool bold) : gdi_(gdi), bold_(bold) {
   for (const FontRow& row : kFonts) {
     const std::int32_t emHeightPx =
         toInt32(row.points * kTwipsPerPoint / static_cast<double>(metrics.twipsPerPixelY));

@@ -26,9 +26,14 @@ class LabelFontSet {
   LabelFontSet& operator=(const LabelFontSet&) = delete;
 
   [[nodiscard]] const LabelFontHandles& handles() const noexcept { return handles_; }
+  // The same style at another scale.
+  [[nodiscard]] LabelFontSet scaledTo(ScreenMetrics metrics) const { return {gdi_, metrics, bold_}; }
+  // Of the same graphics interface.
+  void swap(LabelFontSet& other) noexcept { handles_.swap(other.handles_); }
 
  private:
   Gdi& gdi_;
+  bool bold_;
   LabelFontHandles handles_;
 };
 

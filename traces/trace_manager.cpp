@@ -126,6 +126,14 @@ void clsTraceManager::drawingArea(float leftTwips, float topTwips, float widthTw
            widthTwips / metrics_.twipsPerPixelX, heightTwips / metrics_.twipsPerPixelY};
 }
 
+void clsTraceManager::rescale(ScreenMetrics metrics, const LabelFontHandles& fonts) {
+  surface_.release();
+  metrics_ = metrics;
+  fonts_ = fonts;
+  if (form_ != nullptr) pixelSurface_.emplace(*form_, metrics_);
+  for (const auto& bar : verticalBars_) bar->rescale(metrics_);
+}
+
 void clsTraceManager::setShadowDC() {
   guard("clsTraceManager::setShadowDC failed ...", [this] {
     TraceForm& form = requireForm();

@@ -62,6 +62,9 @@ class clsTraceManager {
   // (Re)creates the off-screen surface for the drawing area.
   void setShadowDC();
   [[nodiscard]] DcHandle shadowDC() const noexcept { return surface_.dc(); }
+  // The form stands on a screen of another scale. The surface is given up, so that no font is in use any
+  // more: the drawing area is to be set anew.
+  void rescale(ScreenMetrics metrics, const LabelFontHandles& fonts);
 
   // Trace objects, at most one per result type.
   std::int32_t addTrace(std::int32_t result);  // reserved: does nothing, answers 0

@@ -32,6 +32,15 @@ clsBaseVFP::clsBaseVFP(const PanelEnvironment& environment, PanelControl& child)
   traceManager_->setForm(&child_);
 }
 
+void clsBaseVFP::rescale(ScreenMetrics metrics) {
+  guard("clsBaseVFP::rescale() ... ", [&] {
+    metrics_ = metrics;
+    LabelFontSet fonts = fonts_.scaledTo(metrics);
+    traceManager_->rescale(metrics, fonts.handles());
+    fonts_.swap(fonts);
+  });
+}
+
 // --- Operations
 
 struct clsBaseVFP::OperationRow {

@@ -140,6 +140,8 @@ class clsBaseVFP {
 
   // --- Identity and what belongs to the panel
   [[nodiscard]] PanelControl& child() const noexcept { return child_; }
+  // The panel stands on a screen of another scale; Resize is to follow.
+  void rescale(ScreenMetrics metrics);
   [[nodiscard]] clsTraceManager& traceManager() noexcept { return *traceManager_; }
   // Reported: nothing replaces a panel's traces by the way.
   void traceManager(std::shared_ptr<clsTraceManager> manager);

@@ -67,6 +67,13 @@ std::int32_t FieldPanel::playbackOp(std::int32_t /*hardwareId*/, std::int16_t /*
 
 // --- Window
 
+void FieldPanel::rescale(ScreenMetrics metrics) {
+  HostedPanel::rescale(metrics);
+  base_.rescale(metrics);
+  guard([this] { return named("rescale()"); }, [this] { rescaled(); });
+  Form_Resize();
+}
+
 // The collapse buttons lie along the areas' inner edges, and at the view's edge where an area is hidden.
 void FieldPanel::Form_Resize() {
   base_.Resize();
@@ -89,6 +96,7 @@ void FieldPanel::refreshTraces() {
         [this] {
           if (!view().visible()) return;
           base_.traceManager().paintTraces(true);
+          if (!view().hwnd()) view().refresh();  // what is shown elsewhere is no longer what there is
           tracesRefreshed();
         });
 }

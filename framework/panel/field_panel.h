@@ -49,6 +49,7 @@ class FieldPanel : public HostedPanel {
   void PopUp_Click(std::int32_t subjectId, std::int32_t buttonId) { base_.PopUp_Click(subjectId, buttonId); }
 
   // --- Events of the window
+  void rescale(ScreenMetrics metrics) override;
   void Form_Resize() override;     // also once after creation, when the view has its size
   void Paint() { base_.Paint(); }  // recomposes the graph and copies it to the view's device context
   void MouseDown(std::int16_t button, std::int16_t shift, float xTwips, float yTwips) {
@@ -162,6 +163,8 @@ class FieldPanel : public HostedPanel {
   // Composes the graph anew where it can be seen, then lets the panel follow it.
   void refreshTraces();
   virtual void tracesRefreshed() {}
+  // What is kept in pixels follows the new scale; the areas are laid out next.
+  virtual void rescaled() {}
 
   [[nodiscard]] bool mayCenterMarker();
 

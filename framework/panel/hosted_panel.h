@@ -104,10 +104,13 @@ class HostedPanel : public PanelControl {
     return host_.saveSetup(setUpId, resourceId, frontPanelId, settings);
   }
 
+  [[nodiscard]] const ScreenMetrics& metrics() const noexcept { return metrics_; }
+  // The view stands on a screen of another scale.
+  virtual void rescale(ScreenMetrics metrics) { metrics_ = metrics; }
+
  protected:
   [[nodiscard]] Gdi& gdi() const noexcept { return gdi_; }
   [[nodiscard]] GraphView& view() const noexcept { return view_; }
-  [[nodiscard]] const ScreenMetrics& metrics() const noexcept { return metrics_; }
   [[nodiscard]] PanelContainer& container() const noexcept { return container_; }
 
  private:

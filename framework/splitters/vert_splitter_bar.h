@@ -18,6 +18,8 @@ class clsVertSplitterBar {
   // The surface must outlive the bar. Assigning it sets the bar's width back to 2.
   void DrawingSurface(frontpanels::DrawingSurface* surface);
 
+  void rescale(ScreenMetrics metrics) noexcept { metrics_ = metrics; }
+
   // The stored width over the screen's horizontal twips per pixel.
   [[nodiscard]] float BarWidth() const noexcept { return width_ / metrics_.twipsPerPixelX; }
   [[nodiscard]] float SplitterBarLeft() const noexcept { return left_; }

@@ -29,9 +29,25 @@ ScreenMetrics readScreenMetrics() {
   const int dotsPerInchX = GetDeviceCaps(screen, LOGPIXELSX);
   const int dotsPerInchY = GetDeviceCaps(screen, LOGPIXELSY);
   ReleaseDC(nullptr, screen);
+  // A screen without a driver answers 0, by which nothing can be divided.
   if (dotsPerInchX > 0) metrics.twipsPerPixelX = kTwipsPerInch / static_cast<float>(dotsPerInchX);
   if (dotsPerInchY > 0) metrics.twipsPerPixelY = kTwipsPerInch / static_cast<float>(dotsPerInchY);
   return metrics;
+}
+
+// Windows before 10 have one scale for all screens.
+ScreenMetrics metricsOf(HWND window) {
+  using Ask = UINT(WINAPI*)(HWND);
+  static const auto kAsk = reinterpret_cast<Ask>(
+      reinterpret_cast<void*>(GetProcAddress(GetModuleHandleW(L"user32.dll"), "GetDpiForWindow")));
+  const UINT dpi = kAsk == nullptr ? 0 : kAsk(window);
+  if (dpi == 0) return readScreenMetrics();
+  const float twipsPerPixel = kTwipsPerInch / static_cast<float>(dpi);
+  return {twipsPerPixel, twipsPerPixel};
+}
+
+int dotsPerInch(const ScreenMetrics& metrics) noexcept {
+  return static_cast<int>(kTwipsPerInch / metrics.twipsPerPixelX + 0.5F);
 }
 
 }  // namespace frontpanels

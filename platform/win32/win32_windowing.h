@@ -1,6 +1,8 @@
 // Window services of the real window system.
 #pragma once
 
+#include <windows.h>
+
 #include "platform/windowing.h"
 
 namespace frontpanels {
@@ -15,5 +17,8 @@ class Win32Windowing final : public Windowing {
 
 // Asks the screen for its scale; the usual one where it does not answer.
 [[nodiscard]] ScreenMetrics readScreenMetrics();
+// That of the screen which a window is on, as far as its program tells one screen from another.
+[[nodiscard]] ScreenMetrics metricsOf(HWND window);
+[[nodiscard]] int dotsPerInch(const ScreenMetrics& metrics) noexcept;
 
 }  // namespace frontpanels
