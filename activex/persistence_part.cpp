@@ -11,18 +11,27 @@ namespace {
 
 constexpr wchar_t kStreamName[] = L"FrontPanels";
 
+constexpr const char* kReading = "UserControl_ReadProperties()";
+constexpr const char* kWriting = "UserControl_WriteProperties()";
+
 // What fails is reported as well: containers load and save forms without a word.
-template <class Body>
-HRESULT reported(const char* routine, Body body) {
-  const HRESULT result = barrier(body);
+HRESULT reported(const char* routine, HRESULT result) {
   if (FAILED(result)) errorHandler().Assert(routine);
   return result;
 }
 
-constexpr const char* kReading = "UserControl_ReadProperties()";
-constexpr const char* kWriting = "UserControl_WriteProperties()";
-
 }  // namespace
+
+template <class Body>
+HRESULT PersistencePart::loading(Body body) {
+  return reported(kReading, entry(body));
+}
+
+template <class Body>
+HRESULT PersistencePart::saving(Body body) {
+  const ControlCore::Saving quiet(core());
+  return reported(kWriting, entry(body));
+}
 
 HRESULT PersistencePart::GetClassID(CLSID* id) {
   if (id == nullptr) return E_POINTER;
@@ -45,7 +54,7 @@ StoredState PersistencePart::state() const {
 }
 
 HRESULT PersistencePart::InitNew() {
-  return barrier([&] {
+  return entry([&] {
     StoredValues values;
     for (const StoredProperty& property : core().storedProperties()) values.push_back(defaultOf(property));
     apply(values);
@@ -69,12 +78,12 @@ void PersistencePart::writeStream(IStream& stream) const {
 
 HRESULT PersistencePart::Load(IStream* stream) {
   if (stream == nullptr) return E_POINTER;
-  return reported(kReading, [&] { readStream(*stream); });
+  return loading([&] { readStream(*stream); });
 }
 
 HRESULT PersistencePart::Save(IStream* stream, BOOL clearDirty) {
   if (stream == nullptr) return E_POINTER;
-  return reported(kWriting, [&] {
+  return saving([&] {
     writeStream(*stream);
     if (clearDirty) core().dirty(false);
   });
@@ -83,17 +92,17 @@ HRESULT PersistencePart::Save(IStream* stream, BOOL clearDirty) {
 HRESULT PersistencePart::GetSizeMax(ULARGE_INTEGER* size) {
   if (size == nullptr) return E_POINTER;
   size->QuadPart = 0;
-  return barrier([&] { size->QuadPart = storedBytes(state()).size(); });
+  return entry([&] { size->QuadPart = storedBytes(state()).size(); });
 }
 
 HRESULT PersistencePart::Load(IPropertyBag* bag, IErrorLog* log) {
   if (bag == nullptr) return E_POINTER;
-  return reported(kReading, [&] { apply(readStored(*bag, log, core().storedProperties())); });
+  return loading([&] { apply(readStored(*bag, log, core().storedProperties())); });
 }
 
 HRESULT PersistencePart::Save(IPropertyBag* bag, BOOL clearDirty, BOOL saveAll) {
   if (bag == nullptr) return E_POINTER;
-  return reported(kWriting, [&] {
+  return saving([&] {
     writeStored(*bag, core().storedProperties(), state().values, saveAll != FALSE);
     if (clearDirty) core().dirty(false);
   });
@@ -103,7 +112,7 @@ HRESULT PersistencePart::InitNew(IStorage*) { return InitNew(); }
 
 HRESULT PersistencePart::Load(IStorage* storage) {
   if (storage == nullptr) return E_POINTER;
-  return reported(kReading, [&] {
+  return loading([&] {
     ComPointer<IStream> stream;
     check(storage->OpenStream(kStreamName, nullptr, STGM_READ | STGM_SHARE_EXCLUSIVE, 0, stream.receive()));
     readStream(*stream.get());
@@ -113,7 +122,7 @@ HRESULT PersistencePart::Load(IStorage* storage) {
 // Stays dirty until the container says that the save is complete.
 HRESULT PersistencePart::Save(IStorage* storage, BOOL sameAsLoad) {
   if (storage == nullptr) return E_POINTER;
-  return reported(kWriting, [&] {
+  return saving([&] {
     ComPointer<IStream> stream;
     check(storage->CreateStream(kStreamName, STGM_CREATE | STGM_WRITE | STGM_SHARE_EXCLUSIVE, 0, 0,
                                 stream.receive()));

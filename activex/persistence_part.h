@@ -36,6 +36,10 @@ class PersistencePart final : public ControlPart<IPersistStreamInit, IPersistPro
   // What a storage got since the container last said that a save is complete.
   enum class Saved { Nothing, Original, Copy };
 
+  template <class Body>
+  HRESULT loading(Body body);
+  template <class Body>
+  HRESULT saving(Body body);
   void apply(const StoredValues& values);
   [[nodiscard]] StoredState state() const;
   void readStream(IStream& stream);
