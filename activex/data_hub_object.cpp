@@ -1,5 +1,6 @@
 #include "activex/data_hub_object.h"
 
+#include "activex/late_notices.h"
 #include "activex/services.h"
 #include "activex/variants.h"
 
@@ -9,6 +10,7 @@ HRESULT DataHubObject::Publish(BSTR path, VARIANT values) {
   return barrier(IID_IDataHub, [&] {
     const std::string name = fromBstr(path);
     DataHub& hub = services().hub;
+    const LateNotices notices;
     // A sweep of singles goes through without an array of its own.
     if (!withSingles(values, [&](std::span<const float> singles) { hub.publish(name, singles); }))
       hub.publish(name, fromAutomation(values));

@@ -5,14 +5,14 @@
 #include "activex/message_boxes.h"
 #include "framework/support/utility.h"
 #include "platform/data_server.h"
-#include "platform/win32/win32_gdi.h"
+#include "platform/win32/picture_gdi.h"
 #include "platform/win32/win32_locale.h"
 #include "platform/win32/win32_windowing.h"
 
 namespace frontpanels::activex {
 
 struct Services {
-  Win32Gdi gdi;
+  PictureGdi gdi;
   Win32Windowing windowing;
   MessageBoxes dialogs;
   FileBoxes fileDialogs;

@@ -1,6 +1,6 @@
 #include "activex/view_part.h"
 
-#include "activex/barrier.h"
+#include "activex/services.h"
 
 namespace frontpanels::activex {
 
@@ -15,25 +15,8 @@ HRESULT ViewPart::Draw(DWORD aspect, LONG, void*, DVTARGETDEVICE*, HDC, HDC dc, 
                        WINBOOL(CALLBACK*)(ULONG_PTR), ULONG_PTR) {
   if (aspect != DVASPECT_CONTENT) return DV_E_DVASPECT;
   if (dc == nullptr || bounds == nullptr) return E_INVALIDARG;
-  return barrier([&]() -> HRESULT {
-    MemoryPicture picture;
-    core().window().render(picture);
-    BITMAPINFO info{};
-    info.bmiHeader.biSize = sizeof info.bmiHeader;
-    info.bmiHeader.biWidth = picture.sizePx().width;
-    info.bmiHeader.biHeight = -picture.sizePx().height;
-    info.bmiHeader.biPlanes = 1;
-    info.bmiHeader.biBitCount = 32;
-    const int saved = SaveDC(dc);
-    SetStretchBltMode(dc, COLORONCOLOR);
-    GdiFlush();
-    const int rows = StretchDIBits(
-        dc, static_cast<int>(bounds->left), static_cast<int>(bounds->top),
-        static_cast<int>(bounds->right - bounds->left), static_cast<int>(bounds->bottom - bounds->top), 0, 0,
-        picture.sizePx().width, picture.sizePx().height, picture.pixels(), &info, DIB_RGB_COLORS, SRCCOPY);
-    RestoreDC(dc, saved);
-    return rows == static_cast<int>(GDI_ERROR) ? VIEW_E_DRAW : S_OK;
-  });
+  if (bounds->left == bounds->right || bounds->top == bounds->bottom) return S_OK;  // nothing to be seen
+  return entry([&] { core().window().draw(services().gdi, dc, *bounds); });
 }
 
 HRESULT ViewPart::GetColorSet(DWORD, LONG, void*, DVTARGETDEVICE*, HDC, LOGPALETTE** palette) {

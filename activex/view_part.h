@@ -12,8 +12,8 @@ class ViewPart final : public ControlPart<IViewObject2> {
   // Tells whoever draws the picture that it has changed.
   void changed();
 
-  // Content only. The picture is made at the view's own size and stretched into the bounds, in the context's
-  // logical coordinates: this also records into a metafile.
+  // Content only. Drawn at the resolution of the context, in its logical coordinates and with nothing that a
+  // metafile would not record.
   HRESULT STDMETHODCALLTYPE Draw(DWORD aspect, LONG, void*, DVTARGETDEVICE*, HDC, HDC dc, LPCRECTL bounds,
                                  LPCRECTL, WINBOOL(CALLBACK*)(ULONG_PTR), ULONG_PTR) override;
   HRESULT STDMETHODCALLTYPE GetColorSet(DWORD, LONG, void*, DVTARGETDEVICE*, HDC,

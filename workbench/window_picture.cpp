@@ -73,22 +73,25 @@ RECT menuAndClientArea(HWND window) {
   return area;
 }
 
+Picture copyOf(HDC source, const RECT& area) {
+  Picture picture = makePicture(area.right - area.left, area.bottom - area.top);
+  const MemoryDc target(CreateCompatibleDC(source));
+  const HGDIOBJ previous = SelectObject(target.get(), picture.bitmap.get());
+  const bool copied = BitBlt(target.get(), 0, 0, static_cast<int>(picture.width),
+                             static_cast<int>(picture.height), source, area.left, area.top, SRCCOPY);
+  SelectObject(target.get(), previous);
+  GdiFlush();
+  if (!copied) raiseLastError("Copying the picture");
+  return picture;
+}
+
 Picture captureWindow(HWND window) {
   RedrawWindow(window, nullptr, nullptr, RDW_UPDATENOW | RDW_ALLCHILDREN);
   RECT whole{};
   GetWindowRect(window, &whole);
-  const RECT rect = menuAndClientArea(window);
-  Picture picture = makePicture(rect.right - rect.left, rect.bottom - rect.top);
-  const WindowDc source(window);
-  const MemoryDc target(CreateCompatibleDC(source.get()));
-  const HGDIOBJ previous = SelectObject(target.get(), picture.bitmap.get());
-  const bool copied =
-      BitBlt(target.get(), 0, 0, static_cast<int>(picture.width), static_cast<int>(picture.height),
-             source.get(), rect.left - whole.left, rect.top - whole.top, SRCCOPY);
-  SelectObject(target.get(), previous);
-  GdiFlush();
-  if (!copied) raiseLastError("Copying the window");
-  return picture;
+  RECT area = menuAndClientArea(window);
+  OffsetRect(&area, -whole.left, -whole.top);
+  return copyOf(WindowDc(window).get(), area);
 }
 
 void writePng(const Picture& picture, const std::string& path) {
@@ -120,5 +123,9 @@ void writePng(const Picture& picture, const std::string& path) {
 }  // namespace
 
 void saveWindowPicture(HWND window, const std::string& path) { writePng(captureWindow(window), path); }
+
+void saveContextPicture(HDC dc, SIZE sizePx, const std::string& path) {
+  writePng(copyOf(dc, {0, 0, sizePx.cx, sizePx.cy}), path);
+}
 
 }  // namespace frontpanels::workbench

@@ -3,16 +3,15 @@
 #include <commctrl.h>
 
 #include <algorithm>
-#include <array>
-#include <cwchar>
 #include <iterator>
 #include <map>
-#include <type_traits>
 #include <utility>
 #include <vector>
 
 #include "platform/runtime_error.h"
+#include "platform/win32/field_fonts.h"
 #include "platform/win32/field_window.h"
+#include "platform/win32/win32_windowing.h"
 
 namespace frontpanels {
 namespace {
@@ -20,66 +19,7 @@ namespace {
 constexpr int kTwipsPerInch = 1440;
 constexpr int kUsualDpi = 96;
 
-struct DeleteFont {
-  void operator()(HFONT font) const noexcept { DeleteObject(font); }
-};
-using OwnFont = std::unique_ptr<std::remove_pointer_t<HFONT>, DeleteFont>;
-
-int screenDpi() {
-  const HDC screen = GetDC(nullptr);
-  const int dpi = screen == nullptr ? 0 : GetDeviceCaps(screen, LOGPIXELSX);
-  if (screen != nullptr) ReleaseDC(nullptr, screen);
-  return dpi > 0 ? dpi : kUsualDpi;
-}
-
-// Windows before 10 have one scale for all screens.
-int dpiOf(HWND window) {
-  using Ask = UINT(WINAPI*)(HWND);
-  static const auto kAsk = reinterpret_cast<Ask>(
-      reinterpret_cast<void*>(GetProcAddress(GetModuleHandleW(L"user32.dll"), "GetDpiForWindow")));
-  const int dpi = kAsk == nullptr ? 0 : static_cast<int>(kAsk(window));
-  return dpi > 0 ? dpi : screenDpi();
-}
-
 int pixels(float twips, int dpi) { return MulDiv(static_cast<int>(twips), dpi, kTwipsPerInch); }
-
-// The font that dialogs are laid out for, as panels are: the one of message boxes is wider on some systems
-// and would not find room in places that are fixed.
-LOGFONTW dialogFont(int dpi) {
-  constexpr int kPoints = 8;
-  constexpr int kPointsPerInch = 72;
-  LOGFONTW font{};
-  font.lfHeight = -MulDiv(kPoints, dpi, kPointsPerInch);
-  font.lfWeight = FW_NORMAL;
-  font.lfCharSet = DEFAULT_CHARSET;
-  std::wcscpy(font.lfFaceName, L"MS Shell Dlg 2");
-  return font;
-}
-
-// The font's variants, by bold + 2 x italic. The first is the given one itself, if there is one.
-class FieldFonts {
- public:
-  FieldFonts() = default;
-  FieldFonts(HFONT given, int dpi) : given_(given) {
-    LOGFONTW plain{};
-    if (given == nullptr || GetObjectW(given, sizeof plain, &plain) == 0) plain = dialogFont(dpi);
-    for (std::size_t variant = given == nullptr ? 0 : 1; variant < made_.size(); ++variant) {
-      LOGFONTW font = plain;
-      if ((variant & 1U) != 0) font.lfWeight = FW_BOLD;
-      if ((variant & 2U) != 0) font.lfItalic = TRUE;
-      made_[variant].reset(CreateFontIndirectW(&font));
-    }
-  }
-
-  [[nodiscard]] HFONT of(const Control& control) const {
-    const std::size_t variant = (control.Bold() ? 1U : 0U) + (control.Italic() ? 2U : 0U);
-    return variant == 0 && given_ != nullptr ? given_ : made_[variant].get();
-  }
-
- private:
-  HFONT given_ = nullptr;
-  std::array<OwnFont, 4> made_;
-};
 
 // Windows stand in the nearest picture; frames are drawn round their controls and hold no windows.
 const Control* areaOf(const Control& control) {
@@ -148,7 +88,7 @@ class FieldWindows final : public FieldSite {
 void FieldWindows::create(HWND parent, HFONT font, int dpi) {
   destroy();
   parent_ = parent;
-  dpi_ = dpi > 0 ? dpi : dpiOf(parent);
+  dpi_ = dpi > 0 ? dpi : dotsPerInch(metricsOf(parent));
   fonts_ = FieldFonts(font, dpi_);
   try {
     makeWindows();
@@ -206,7 +146,7 @@ void FieldWindows::destroy() noexcept {
 
 void FieldWindows::rescale(HFONT font, int dpi) {
   if (parent_ == nullptr) return;
-  dpi_ = dpi > 0 ? dpi : dpiOf(parent_);
+  dpi_ = dpi > 0 ? dpi : dotsPerInch(metricsOf(parent_));
   const FieldFonts before = std::exchange(fonts_, FieldFonts(font, dpi_));
   for (const auto& field : fields_) field->showFont();
   arrange();

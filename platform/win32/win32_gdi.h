@@ -5,7 +5,7 @@
 
 namespace frontpanels {
 
-class Win32Gdi final : public Gdi {
+class Win32Gdi : public Gdi {
  public:
   [[nodiscard]] DcHandle createCompatibleDC(DcHandle dc) override;
   bool deleteDC(DcHandle dc) override;

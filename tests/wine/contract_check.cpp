@@ -406,24 +406,6 @@ void paintsAllOfItself(const Desk& desk) {
   ReleaseDC(view, dc);
 }
 
-void drawsIntoMetafiles(const Desk&) {
-  Hosted hosted;
-  publish(carrier());
-  const auto view = hosted.object.query<IViewObject2>();
-  const HDC recording = CreateEnhMetaFileW(nullptr, nullptr, nullptr, nullptr);
-  const RECTL bounds{100, 50, 740, 530};
-  expect(view->Draw(DVASPECT_CONTENT, -1, nullptr, nullptr, nullptr, recording, &bounds, nullptr, nullptr,
-                    0) == S_OK,
-         "takes the drawing");
-  const HENHMETAFILE file = CloseEnhMetaFile(recording);
-  ENHMETAHEADER header{};
-  GetEnhMetaFileHeader(file, sizeof header, &header);
-  expect(header.nRecords > 2 && header.rclBounds.left >= 99 && header.rclBounds.top >= 49 &&
-             header.rclBounds.right <= 740 && header.rclBounds.bottom <= 530,
-         "inside its bounds");
-  DeleteEnhMetaFile(file);
-}
-
 // --- Storage
 
 using Bag = std::map<std::wstring, std::wstring>;
@@ -640,7 +622,6 @@ constexpr struct {
                  {"keys", sharesTheKeys},
                  {"mouse", capturesTheMouse},
                  {"window", paintsAllOfItself},
-                 {"metafile", drawsIntoMetafiles},
                  {"property bag", keepsPropertiesInABag},
                  {"storage", keepsStateInAStorage},
                  {"texts", keepsTexts},

@@ -68,7 +68,7 @@ unit_tests() {
 fields() {
   local dpi key='HKCU\Control Panel\Desktop' pictures=$root/build/screenshots
   mkdir -p "$pictures"
-  rm -f "$pictures"/controls_*.png "$pictures"/panel_*.png "$pictures"/pilots_*.png
+  rm -f "$pictures"/controls_*.png "$pictures"/panel_*.png "$pictures"/pilots_*.png "$pictures"/drawn_*.png
   for dpi in 144 96; do
     wine reg add "$key" /v LogPixels /t REG_DWORD /d "$dpi" /f >/dev/null 2>&1
     wineserver -k
@@ -76,6 +76,7 @@ fields() {
     program "controls_$dpi" controls_test "$(windows_path "$pictures")"
     program "fields_$dpi" fields_test "$(windows_path "$pictures")"
     program "pilots_$dpi" pilots_test "$(windows_path "$pictures")"
+    program "picture_$dpi" picture_test "$(windows_path "$pictures")"
     [ -s "$pictures/controls_$dpi.png" ] && [ -s "$pictures/panel_whole_$dpi.png" ] && [ -s "$pictures/pilots_four_1200_$dpi.png" ]
     judge $? "the fields are pictured at $dpi dots an inch"
   done
