@@ -5,7 +5,9 @@
 #include "activex/barrier.h"
 #include "activex/class_info_part.h"
 #include "activex/connections_part.h"
+#include "activex/data_part.h"
 #include "activex/in_place_part.h"
+#include "activex/late_notices.h"
 #include "activex/ole_object_part.h"
 #include "activex/persistence_part.h"
 #include "activex/variants.h"
@@ -49,7 +51,8 @@ ControlCore::ControlCore(IUnknown* outer, const ControlClass& controlClass)
       view_(std::make_unique<ViewPart>(*this)),
       persistence_(std::make_unique<PersistencePart>(*this)),
       connections_(std::make_unique<ConnectionsPart>(*this)),
-      classInfo_(std::make_unique<ClassInfoPart>(*this)) {}
+      classInfo_(std::make_unique<ClassInfoPart>(*this)),
+      dataObject_(std::make_unique<DataPart>(*this)) {}
 
 ControlCore::~ControlCore() = default;
 
@@ -81,6 +84,7 @@ void* ControlCore::findPart(REFIID id) noexcept {
       {IID_IProvideClassInfo, static_cast<IProvideClassInfo*>(classInfo_.get())},
       {IID_IProvideClassInfo2, static_cast<IProvideClassInfo2*>(classInfo_.get())},
       {IID_ISupportErrorInfo, static_cast<ISupportErrorInfo*>(classInfo_.get())},
+      {IID_IDataObject, static_cast<IDataObject*>(dataObject_.get())},
   };
   for (const Row& row : rows)
     if (row.id == id) return row.part;
@@ -148,10 +152,30 @@ bool ControlCore::putExtended(const wchar_t* name, const Variant& value) noexcep
 }
 
 void ControlCore::extent(SIZEL himetric) {
+  if (himetric.cx == extent_.cx && himetric.cy == extent_.cy) return;
   extent_ = himetric;
   dirty_ = true;
   window_.resizeMemory(pixelsOf(himetric));
+  viewChanged();
+}
+
+void ControlCore::requestPlace(const RECT& place) {
+  if (inPlace_->active()) return inPlace_->requestPlace(place);
+  const Size sizePx{place.right - place.left, place.bottom - place.top};
+  placePx_ = place;
+  if (sizePx.width <= 0 || sizePx.height <= 0) return;
+  extent(himetricOf(sizePx));
+  if (const ComPointer<IOleClientSite> site = site_) site->RequestNewObjectLayout();
+}
+
+// A window shows by itself what it has got.
+void ControlCore::viewChanged() {
+  if (savings_ == 0 && !inPlace_->active()) LateNotices::tell(*this);
+}
+
+void ControlCore::tellOnlookers() {
   view_->changed();
+  dataObject_->changed();
 }
 
 void ControlCore::adoptSize(Size sizePx) {

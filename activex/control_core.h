@@ -10,6 +10,7 @@
 #include <string>
 
 #include "activex/aggregable.h"
+#include "activex/barrier.h"
 #include "activex/panel_window.h"
 #include "activex/stored_values.h"
 #include "platform/variant.h"
@@ -36,6 +37,7 @@ class ViewPart;
 class PersistencePart;
 class ConnectionsPart;
 class ClassInfoPart;
+class DataPart;
 
 class ControlCore : public Aggregable, public WindowOwner {
  public:
@@ -46,7 +48,7 @@ class ControlCore : public Aggregable, public WindowOwner {
   [[nodiscard]] PanelWindow& window() noexcept { return window_; }
   [[nodiscard]] OleObjectPart& oleObject() noexcept { return *oleObject_; }
   [[nodiscard]] InPlacePart& inPlace() noexcept { return *inPlace_; }
-  [[nodiscard]] ViewPart& view() noexcept { return *view_; }
+  [[nodiscard]] DataPart& dataObject() noexcept { return *dataObject_; }
   [[nodiscard]] ConnectionsPart& connections() noexcept { return *connections_; }
   [[nodiscard]] const ComPointer<IOleClientSite>& site() const noexcept { return site_; }
   // Reads the ambient properties anew; leaving a site ends the activity in it.
@@ -64,6 +66,24 @@ class ControlCore : public Aggregable, public WindowOwner {
 
   [[nodiscard]] bool dirty() const noexcept { return dirty_; }
   void dirty(bool dirty) noexcept { dirty_ = dirty; }
+  // The control's place as the container last gave it, pixels of the container's window.
+  [[nodiscard]] const RECT& placePx() const noexcept { return placePx_; }
+  void placePx(const RECT& place) noexcept { placePx_ = place; }
+  // Asks the container for another place. Without a window only the size changes, as far as the container
+  // lets it. A container that refuses keeps the control where it is.
+  void requestPlace(const RECT& place);
+  // Nobody hears that the picture has changed while one lives: some containers lay the control out anew in
+  // the middle of their saving.
+  class Saving {
+   public:
+    explicit Saving(ControlCore& core) noexcept : core_(core) { ++core_.savings_; }
+    ~Saving() { --core_.savings_; }
+    Saving(const Saving&) = delete;
+    Saving& operator=(const Saving&) = delete;
+
+   private:
+    ControlCore& core_;
+  };
   // A count: containers nest their freezes.
   void freezeEvents(bool freeze) noexcept { freezes_ += freeze ? 1 : freezes_ > 0 ? -1 : 0; }
   // Neither while the container holds events back nor in a designer.
@@ -82,6 +102,10 @@ class ControlCore : public Aggregable, public WindowOwner {
   void focusChanged(bool focused) override;
   void windowDestroyed() noexcept override;
   bool inUse() const override { return userMode_; }
+  // Tells who looks on, unless the window shows it by itself.
+  void viewChanged() override;
+  // The same at once.
+  void tellOnlookers();
 
  protected:
   // The interfaces that all controls have.
@@ -100,6 +124,8 @@ class ControlCore : public Aggregable, public WindowOwner {
   bool userMode_ = true;
   bool dirty_ = false;
   int freezes_ = 0;
+  int savings_ = 0;
+  RECT placePx_{};
 
   std::unique_ptr<OleObjectPart> oleObject_;
   std::unique_ptr<InPlacePart> inPlace_;
@@ -107,6 +133,7 @@ class ControlCore : public Aggregable, public WindowOwner {
   std::unique_ptr<PersistencePart> persistence_;
   std::unique_ptr<ConnectionsPart> connections_;
   std::unique_ptr<ClassInfoPart> classInfo_;
+  std::unique_ptr<DataPart> dataObject_;
 };
 
 // An OLE duty of a control: interfaces whose identity and life are the control's.
@@ -126,6 +153,12 @@ class ControlPart : public Interfaces... {
 
  protected:
   [[nodiscard]] ControlCore& core() const noexcept { return core_; }
+  // A call that runs panel's or container's code: nothing thrown leaves it, and the control outlives it.
+  template <class Body>
+  HRESULT entry(Body body) const {
+    const ComPointer<IUnknown> alive(core_.outer());
+    return barrier(body);
+  }
 
  private:
   ControlCore& core_;

@@ -392,12 +392,14 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
     const std::int32_t top = toInt32(area.top);
     return {left, top, left + toInt32(area.width), top + toInt32(area.height)};
   }
+  DcHandle surface() override { return base().traceManager().shadowDC(); }
   Size graphSizePx() override {
     const Size view = this->window().clientSizePx();
     return {graphLengthPx(panel().InvisibleWidthMarkX1(), panel().ViewScaleWidth(), view.width),
             graphLengthPx(panel().InvisibleHeightMarkY1(), panel().ViewScaleHeight(), view.height)};
   }
   void resized() override { panel().Form_Resize(); }
+  void rescaled(ScreenMetrics metrics) override { panel().rescale(metrics); }
   void mouseDown(const MouseEvent& e) override { base().MouseDown(e.button, e.shift, e.xTwips, e.yTwips); }
   void mouseMove(const MouseEvent& e) override { base().MouseMove(e.button, e.shift, e.xTwips, e.yTwips); }
   void mouseUp(const MouseEvent& e) override { base().MouseUp(e.button, e.shift, e.xTwips, e.yTwips); }
@@ -411,14 +413,30 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
     if (focused) base().Activate();
   }
 
-  // --- PanelContainer: a container that keeps no such property goes without.
-  void caption(std::string_view text) override { this->putExtended(L"Caption", std::string(text)); }
+  // --- PanelContainer: a container that keeps no such property is asked for another place; of what no
+  // container keeps, the panel's own state remains.
+  void caption(std::string_view text) override {
+    this->window().caption(toUtf16(text));
+    this->putExtended(L"Caption", std::string(text));
+  }
   void visible(bool visible) override { this->putExtended(L"Visible", visible); }
   void viewState(std::int16_t state) override { this->putExtended(L"ViewState", state); }
-  void left(float position) override { this->putExtended(L"Left", position); }
-  void top(float position) override { this->putExtended(L"Top", position); }
-  void width(float length) override { this->putExtended(L"Width", length); }
-  void height(float length) override { this->putExtended(L"Height", length); }
+  void left(float twips) override {
+    const LONG px = lengthPx(twips, panel().metrics().twipsPerPixelX);
+    place(L"Left", twips, [px](RECT& place) { OffsetRect(&place, px - place.left, 0); });
+  }
+  void top(float twips) override {
+    const LONG px = lengthPx(twips, panel().metrics().twipsPerPixelY);
+    place(L"Top", twips, [px](RECT& place) { OffsetRect(&place, 0, px - place.top); });
+  }
+  void width(float twips) override {
+    const LONG px = lengthPx(twips, panel().metrics().twipsPerPixelX);
+    place(L"Width", twips, [px](RECT& place) { place.right = place.left + px; });
+  }
+  void height(float twips) override {
+    const LONG px = lengthPx(twips, panel().metrics().twipsPerPixelY);
+    place(L"Height", twips, [px](RECT& place) { place.bottom = place.top + px; });
+  }
   std::vector<std::uint8_t> picturePng() override {
     MemoryPicture picture;
     this->window().renderGraph(picture);
@@ -462,7 +480,6 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
   // A stored property has another value: the form is to be saved, and whoever watches the property is told.
   void propertyChanged(DISPID id) {
     this->dirty(true);
-    this->view().changed();
     this->connections().notifyChanged(id);
   }
 
@@ -494,6 +511,20 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
   static std::int32_t graphLengthPx(float mark, float scaleLength, std::int32_t viewPx) {
     const float share = scaleLength > 0 ? mark / scaleLength : 1.0F;
     return std::clamp(toInt32(share * static_cast<float>(viewPx)), 1, viewPx);
+  }
+
+  static LONG lengthPx(float twips, float twipsPerPixel) { return toInt32(twips / twipsPerPixel); }
+
+  // Where the container has no such property of the control's place, it may take a wish for the whole place.
+  template <class Change>
+  void place(const wchar_t* name, float twips, Change change) {
+    if (this->putExtended(name, twips)) return;
+    RECT wanted = this->placePx();
+    const Size size = this->window().clientSizePx();
+    wanted.right = wanted.left + size.width;
+    wanted.bottom = wanted.top + size.height;
+    change(wanted);
+    this->requestPlace(wanted);
   }
 
   // With the sign bit set, the low bits name a colour of the system.

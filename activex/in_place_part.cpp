@@ -48,9 +48,9 @@ void InPlacePart::enterSite(HWND parent, const RECT* place) {
   RECT clip{};
   OLEINPLACEFRAMEINFO info{};
   info.cb = sizeof info;
-  if (FAILED(site->GetWindowContext(frame_.receive(), document_.receive(), &area, &clip, &info)) &&
-      place != nullptr)
-    area = *place;
+  const bool told =
+      SUCCEEDED(site->GetWindowContext(frame_.receive(), document_.receive(), &area, &clip, &info));
+  if (!told && place != nullptr) area = *place;
   try {
     core().window().create(container, area);
   } catch (...) {
@@ -60,8 +60,18 @@ void InPlacePart::enterSite(HWND parent, const RECT* place) {
   }
   active_ = true;
   addBoxOwner(*this);
-  core().adoptSize({area.right - area.left, area.bottom - area.top});
-  if (core().site()) core().site()->ShowObject();
+  takePlace(area, told ? &clip : nullptr);
+  if (const ComPointer<IOleClientSite> client = core().site()) client->ShowObject();
+}
+
+void InPlacePart::takePlace(const RECT& place, const RECT* clip) {
+  core().placePx(place);
+  core().window().place(place, clip);
+  core().adoptSize({place.right - place.left, place.bottom - place.top});
+}
+
+void InPlacePart::requestPlace(const RECT& place) {
+  if (const ComPointer<IOleInPlaceSite> site = inPlaceSite_) site->OnPosRectChange(&place);
 }
 
 void InPlacePart::activateUi() {
@@ -129,25 +139,21 @@ HRESULT InPlacePart::GetWindow(HWND* window) {
 }
 
 HRESULT InPlacePart::InPlaceDeactivate() {
-  return barrier([&] { deactivate(); });
+  return entry([&] { deactivate(); });
 }
 
 HRESULT InPlacePart::UIDeactivate() {
-  return barrier([&] { deactivateUi(); });
+  return entry([&] { deactivateUi(); });
 }
 
 HRESULT InPlacePart::SetObjectRects(LPCRECT place, LPCRECT clip) {
   if (place == nullptr) return E_POINTER;
-  return barrier([&] {
-    core().window().place(*place, clip);
-    core().adoptSize({place->right - place->left, place->bottom - place->top});
-  });
+  return entry([&] { takePlace(*place, clip); });
 }
 
 HRESULT InPlacePart::TranslateAccelerator(LPMSG message) {
   if (message == nullptr) return E_POINTER;
-  return barrier([&]() -> HRESULT {
-    const ComPointer<IUnknown> alive(core().outer());
+  return entry([&]() -> HRESULT {
     if (core().window().translateKey(*message)) return S_OK;
     const bool pressed = message->message == WM_KEYDOWN;
     if ((pressed || message->message == WM_CHAR) && core().window().hasFocus()) {

@@ -22,6 +22,8 @@ class InPlacePart final : public ControlPart<IOleInPlaceObject, IOleInPlaceActiv
   // The window went away by itself, with the container's.
   void windowLost() noexcept;
   [[nodiscard]] bool active() const noexcept { return active_; }
+  // The container is asked; it answers with SetObjectRects, or not at all.
+  void requestPlace(const RECT& place);
 
   // IOleWindow
   HRESULT STDMETHODCALLTYPE GetWindow(HWND* window) override;
@@ -40,6 +42,7 @@ class InPlacePart final : public ControlPart<IOleInPlaceObject, IOleInPlaceActiv
 
  private:
   void enterSite(HWND parent, const RECT* place);
+  void takePlace(const RECT& place, const RECT* clip);
   void deactivateUi();
   void nameActiveObject(IOleInPlaceActiveObject* object);
   void enableHost(bool enable) noexcept override;

@@ -4,14 +4,13 @@
 
 #include <cwchar>
 
-#include "activex/barrier.h"
+#include "activex/data_part.h"
 #include "activex/in_place_part.h"
 
 namespace frontpanels::activex {
 
 HRESULT OleObjectPart::SetClientSite(IOleClientSite* site) {
-  const ComPointer<IUnknown> alive(core().outer());
-  return barrier([&] { core().site(site); });
+  return entry([&] { core().site(site); });
 }
 
 HRESULT OleObjectPart::GetClientSite(IOleClientSite** site) {
@@ -22,11 +21,11 @@ HRESULT OleObjectPart::GetClientSite(IOleClientSite** site) {
 }
 
 HRESULT OleObjectPart::Close(DWORD saveOption) {
-  const ComPointer<IUnknown> alive(core().outer());
-  return barrier([&] {
+  return entry([&] {
     const ComPointer<IOleClientSite> site = core().site();
     if (saveOption != OLECLOSE_NOSAVE && core().dirty() && site) site->SaveObject();
     core().inPlace().deactivate();
+    core().dataObject().closed();
     const ComPointer<IOleAdviseHolder> advises = advises_;
     if (advises) advises->SendOnClose();
   });
@@ -38,6 +37,7 @@ HRESULT OleObjectPart::GetMoniker(DWORD, DWORD, IMoniker** moniker) {
   return E_NOTIMPL;
 }
 
+// That one would be a picture of this moment; the control itself gives the picture that it has now.
 HRESULT OleObjectPart::GetClipboardData(DWORD, IDataObject** data) {
   if (data == nullptr) return E_POINTER;
   *data = nullptr;
@@ -45,8 +45,7 @@ HRESULT OleObjectPart::GetClipboardData(DWORD, IDataObject** data) {
 }
 
 HRESULT OleObjectPart::DoVerb(LONG verb, LPMSG, IOleClientSite*, LONG, HWND parent, LPCRECT place) {
-  const ComPointer<IUnknown> alive(core().outer());
-  return barrier([&]() -> HRESULT {
+  return entry([&]() -> HRESULT {
     // Some hosts hand a verb over as a 16-bit number.
     switch (static_cast<std::int16_t>(verb & 0xFFFF)) {
       case OLEIVERB_PRIMARY:
@@ -99,7 +98,7 @@ HRESULT OleObjectPart::SetExtent(DWORD aspect, SIZEL* himetric) {
   if (himetric == nullptr) return E_POINTER;
   if (aspect != DVASPECT_CONTENT) return DV_E_DVASPECT;
   if (himetric->cx < 0 || himetric->cy < 0) return E_INVALIDARG;
-  return barrier([&] { core().extent(*himetric); });
+  return entry([&] { core().extent(*himetric); });
 }
 
 HRESULT OleObjectPart::GetExtent(DWORD aspect, SIZEL* himetric) {
@@ -144,7 +143,7 @@ HRESULT OleObjectPart::GetControlInfo(CONTROLINFO* info) {
 }
 
 HRESULT OleObjectPart::OnAmbientPropertyChange(DISPID property) {
-  return barrier([&] {
+  return entry([&] {
     if (property == DISPID_UNKNOWN || property == DISPID_AMBIENT_USERMODE || property == DISPID_AMBIENT_FONT)
       core().readAmbients();
   });

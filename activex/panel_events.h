@@ -6,6 +6,7 @@
 
 #include "framework/panel/pop_up_menu.h"
 #include "platform/geometry.h"
+#include "platform/windowing.h"
 
 namespace frontpanels::activex {
 
@@ -25,9 +26,13 @@ class PanelEvents {
   virtual void paint() = 0;
   // What paint covers, in pixels of the view; the rest is background.
   [[nodiscard]] virtual Rect paintedAreaPx() = 0;
+  // The off-screen surface whose picture lies there.
+  [[nodiscard]] virtual DcHandle surface() = 0;
   // The part of the view that the areas with the fields leave to the graph, from its left upper corner on.
   [[nodiscard]] virtual Size graphSizePx() = 0;
   virtual void resized() = 0;
+  // The view is on a screen of another scale; its size may be another as well.
+  virtual void rescaled(ScreenMetrics metrics) = 0;
   virtual void mouseDown(const MouseEvent& event) = 0;
   virtual void mouseMove(const MouseEvent& event) = 0;
   virtual void mouseUp(const MouseEvent& event) = 0;

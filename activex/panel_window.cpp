@@ -12,6 +12,9 @@
 #include "activex/context_menu.h"
 #include "activex/module.h"
 #include "activex/printed_window.h"
+#include "framework/panel/fields_picture.h"
+#include "platform/win32/field_fonts.h"
+#include "platform/win32/win32_windowing.h"
 
 namespace frontpanels::activex {
 namespace {
@@ -27,6 +30,9 @@ constexpr ButtonRow kButtons[] = {
     {WM_RBUTTONDOWN, WM_RBUTTONDBLCLK, WM_RBUTTONUP, 2},
     {WM_MBUTTONDOWN, WM_MBUTTONDBLCLK, WM_MBUTTONUP, 4},
 };
+
+// Named by the headers of later systems only.
+constexpr UINT kDpiChangedAfterParent = 0x02E3;
 
 std::int16_t shiftState() {
   const auto down = [](int key) { return GetKeyState(key) < 0; };
@@ -116,39 +122,47 @@ PanelWindow::~PanelWindow() { destroy(); }
 
 void PanelWindow::fields(ControlSet* fields) {
   fields_.reset();
+  controls_ = fields;
   FieldsOwner& owner = *this;
   if (fields != nullptr) fields_.emplace(*fields, owner);
 }
 
 void PanelWindow::font(HFONT font) {
   font_ = font;
-  if (window_ != nullptr && fields_) fields_->rescale(font_, dpi());
+  if (window_ != nullptr && fields_) fields_->rescale(font_, dotsPerInch(metrics_));
 }
 
-// The fields keep to the scale that the panel lays itself out in, also on a screen with another one.
-int PanelWindow::dpi() const noexcept {
-  constexpr float kTwipsPerInch = 1440;
-  return static_cast<int>(kTwipsPerInch / metrics_.twipsPerPixelX + 0.5F);
+void PanelWindow::followScale() {
+  const ScreenMetrics now = metricsOf(window_);
+  if (dotsPerInch(now) == dotsPerInch(metrics_)) return;
+  metrics_ = now;
+  if (events_ != nullptr) events_->rescaled(metrics_);
+  if (window_ != nullptr && fields_) fields_->rescale(font_, dotsPerInch(metrics_));
 }
 
 void PanelWindow::create(HWND parent, const RECT& place) {
   const wchar_t* const className = windowClass(windowProcedure);
-  window_ = CreateWindowExW(0, className, L"", WS_CHILD | WS_CLIPSIBLINGS | WS_CLIPCHILDREN | WS_TABSTOP,
-                            place.left, place.top, place.right - place.left, place.bottom - place.top, parent,
-                            nullptr, moduleHandle(), this);
+  window_ = CreateWindowExW(
+      0, className, caption_.c_str(), WS_CHILD | WS_CLIPSIBLINGS | WS_CLIPCHILDREN | WS_TABSTOP, place.left,
+      place.top, place.right - place.left, place.bottom - place.top, parent, nullptr, moduleHandle(), this);
   if (window_ == nullptr) throw ComFailure(HRESULT_FROM_WIN32(GetLastError()));
   windowDC_ = GetDC(window_);
   memory_.release();
+  followScale();
   if (fields_) {
     try {
-      fields_->create(window_, font_, dpi());
+      fields_->create(window_, font_, dotsPerInch(metrics_));
     } catch (...) {
       destroy();
       throw;
     }
   }
   if (events_ != nullptr) events_->resized();
-  if (visible_) ShowWindow(window_, SW_SHOWNA);
+}
+
+void PanelWindow::caption(const std::wstring& text) {
+  caption_ = text;
+  if (window_ != nullptr) SetWindowTextW(window_, caption_.c_str());
 }
 
 void PanelWindow::destroy() noexcept {
@@ -159,9 +173,10 @@ void PanelWindow::place(const RECT& rect, const RECT* clip) {
   if (window_ == nullptr) return;
   SetWindowPos(window_, nullptr, rect.left, rect.top, rect.right - rect.left, rect.bottom - rect.top,
                SWP_NOZORDER | SWP_NOACTIVATE);
-  RECT shown{};
-  const bool clipped = clip != nullptr && IntersectRect(&shown, clip, &rect) && !EqualRect(&shown, &rect);
-  if (!clipped) {  // some pages hand over an empty clip for "no clip"
+  RECT shown = rect;
+  // Some pages hand over an empty clip for "no clip"; one beside the place leaves nothing to be seen.
+  if (clip != nullptr && !IsRectEmpty(clip)) IntersectRect(&shown, clip, &rect);
+  if (EqualRect(&shown, &rect)) {
     SetWindowRgn(window_, nullptr, TRUE);
     return;
   }
@@ -175,13 +190,19 @@ void PanelWindow::resizeMemory(Size sizePx) {
   if (window_ == nullptr && events_ != nullptr) events_->resized();
 }
 
-void PanelWindow::render(MemoryPicture& picture) {
-  picture.create(clientSizePx());
+void PanelWindow::draw(PictureGdi& gdi, HDC dc, const RECTL& bounds) {
   if (events_ == nullptr) return;
-  const HDC before = std::exchange(rendering_, picture.dc());
+  const DcHandle view = hdc();
+  const Size size = clientSizePx();
+  const Rect graph = events_->paintedAreaPx();
+  const PictureGdi::Picture picture(gdi, {dc, bounds, size, events_->surface(), {graph.left, graph.top}});
+  gdi.fillRect(view, {0, 0, size.width, size.height}, gdi.sysColorBrush(SystemColor::ButtonFace));
   events_->paint();
-  rendering_ = before;
-  if (window_ != nullptr) printChildren(window_, picture.dc());
+  if (controls_ == nullptr) return;
+  const FieldFonts fonts(font_, dotsPerInch(metrics_));
+  paintFields(gdi, view, *controls_, size, metrics_, [&fonts](const Control& control) {
+    return FontHandle{reinterpret_cast<std::uintptr_t>(fonts.of(control))};
+  });
 }
 
 void PanelWindow::renderGraph(MemoryPicture& picture) {
@@ -227,7 +248,8 @@ void PanelWindow::visible(bool visible) {
 }
 
 void PanelWindow::refresh() {
-  if (window_ != nullptr) InvalidateRect(window_, nullptr, FALSE);
+  if (window_ == nullptr) return owner_.viewChanged();
+  InvalidateRect(window_, nullptr, FALSE);
 }
 
 // --- Messages
@@ -267,8 +289,12 @@ LRESULT PanelWindow::handle(UINT message, WPARAM wParam, LPARAM lParam) {
     case WM_PRINTCLIENT:
       return print(reinterpret_cast<HDC>(wParam)), 0;
     case WM_SIZE:
-      if (events_ != nullptr && windowDC_ != nullptr) events_->resized();
+      if (windowDC_ == nullptr) return 0;
+      followScale();  // a program need not be told of another screen before its size
+      if (events_ != nullptr) events_->resized();
       return 0;
+    case kDpiChangedAfterParent:
+      return followScale(), 0;
     case WM_SETFOCUS:
       return takeFocus(), 0;
     case WM_KILLFOCUS:

@@ -6,8 +6,10 @@
 #include <windows.h>
 
 #include <optional>
+#include <string>
 
 #include "activex/panel_events.h"
+#include "platform/win32/picture_gdi.h"
 #include "platform/win32/win32_controls.h"
 #include "platform/windowing.h"
 
@@ -27,6 +29,8 @@ class WindowOwner {
   virtual void windowDestroyed() noexcept = 0;
   // False while a form is being designed: the panel is a picture then, without input.
   [[nodiscard]] virtual bool inUse() const = 0;
+  // What it shows while there is no window is another picture now.
+  virtual void viewChanged() = 0;
 };
 
 // A device context in memory with a bitmap of 32-bit pixels, rows from the top.
@@ -61,24 +65,27 @@ class PanelWindow final : public GraphView, private FieldsOwner {
   // What is shown as child windows, null for nothing. Not while there is a window.
   void fields(ControlSet* fields);
   [[nodiscard]] bool hasFields() const noexcept { return fields_.has_value(); }
-  // Of the fields, at the screen's scale; it stays the caller's. Null for that of dialogs.
+  // Of the fields, at the scale of the window; it stays the caller's. Null for that of dialogs.
   void font(HFONT font);
 
-  // Makes the child window, hidden when the view is. Raises ComFailure.
+  // Makes the child window, not shown yet. Raises ComFailure.
   void create(HWND parent, const RECT& place);
   void destroy() noexcept;
   [[nodiscard]] HWND window() const noexcept { return window_; }
   // Moves the window and clips it where the container shows only a part.
   void place(const RECT& rect, const RECT* clip);
+  // What those read who look at windows rather than into them.
+  void caption(const std::wstring& text);
   // The size of the view while it has no window.
   void resizeMemory(Size sizePx);
   // Whether the graph or a field has the keyboard focus.
   [[nodiscard]] bool hasFocus() const noexcept { return holds(GetFocus()); }
   // For the container's message loop: the keys that move the focus among the fields. False for others.
   bool translateKey(const MSG& message);
-  // Composes the picture of the whole panel anew, with its fields where they have windows.
-  void render(MemoryPicture& picture);
-  // That of the graph alone.
+  // Draws the whole panel, with its fields whether they have windows or not, into the bounds, which are
+  // logical coordinates of the context: as lines, areas and texts at its own resolution.
+  void draw(PictureGdi& gdi, HDC dc, const RECTL& bounds);
+  // Composes the picture of the graph anew.
   void renderGraph(MemoryPicture& picture);
 
   // GraphView
@@ -109,7 +116,8 @@ class PanelWindow final : public GraphView, private FieldsOwner {
   void release(std::int16_t button, WPARAM keys, LPARAM position);
   [[nodiscard]] MouseEvent mouseEvent(std::int16_t button, LPARAM position) const;
   void showPointer() const;
-  [[nodiscard]] int dpi() const noexcept;
+  // Takes over the scale of the screen that the window is on.
+  void followScale();
 
   // FieldsOwner
   void run(const std::function<void()>& body) noexcept override;
@@ -119,8 +127,10 @@ class PanelWindow final : public GraphView, private FieldsOwner {
   WindowOwner& owner_;
   ScreenMetrics metrics_;
   PanelEvents* events_ = nullptr;
-  std::optional<Win32Controls> fields_;
+  ControlSet* controls_ = nullptr;
+  std::optional<Win32Controls> fields_;  // the windows of the controls
   HFONT font_ = nullptr;
+  std::wstring caption_;
   bool focused_ = false;
   HWND window_ = nullptr;
   HDC windowDC_ = nullptr;

@@ -138,6 +138,7 @@ class FullContainer
   IDispatch* font = nullptr;  // ambient
   IDispatch* extender = nullptr;
   RECT place{10, 20, 410, 320};
+  RECT wanted{};  // the place that the control last asked for
   [[nodiscard]] int count(const std::string& what) const;
 
   // IOleClientSite
@@ -162,7 +163,9 @@ class FullContainer
   HRESULT STDMETHODCALLTYPE OnInPlaceDeactivate() override { return hear("OnInPlaceDeactivate"); }
   HRESULT STDMETHODCALLTYPE DiscardUndoState() override { return E_NOTIMPL; }
   HRESULT STDMETHODCALLTYPE DeactivateAndUndo() override { return E_NOTIMPL; }
-  HRESULT STDMETHODCALLTYPE OnPosRectChange(LPCRECT) override { return hear("OnPosRectChange"); }
+  HRESULT STDMETHODCALLTYPE OnPosRectChange(LPCRECT rect) override {
+    return wanted = *rect, hear("OnPosRectChange");
+  }
   // IOleControlSite
   HRESULT STDMETHODCALLTYPE OnControlInfoChanged() override { return S_OK; }
   HRESULT STDMETHODCALLTYPE LockInPlaceActive(BOOL) override { return E_NOTIMPL; }
