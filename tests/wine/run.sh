@@ -82,6 +82,21 @@ fields() {
   done
 }
 
+# As their first lines say.
+examples() {
+  local picture=$out/example_sweep.png peak
+  timeout 120 wine cscript //nologo "$(windows_path "$root/examples/sweep.vbs")" "$(windows_path "$picture")" 2>/dev/null |
+    tr -d '\r' | tail -n 1 | grep -q '^picture written: '
+  judge $? "the example script comes to its end"
+  peak=$(python3 "$here/peak_place.py" "$picture" "$picture")
+  [ "${peak:-0}" -ge 388 ] && [ "$peak" -le 394 ]  # point 200 of 512
+  judge $? "its picture has the carrier in its place: $peak thousandths"
+  timeout 120 wine "$root/build/win64/tests/wine/example_container.exe" 5 2>/dev/null | tr -d '\r' | grep -qx '5 sweeps shown'
+  judge $? "the example container shows five sweeps and ends"
+  ! timeout 60 wine cscript //nologo "$(windows_path "$root/examples/sweep.vbs")" 2>/dev/null | grep -q 'picture written'
+  judge $? "the example script wants the name of its picture"
+}
+
 # Everything that the machine knows about classes, as text.
 export_classes() {
   wine reg export 'HKLM\Software\Classes' "$(windows_path "$out/$1.reg")" /y >/dev/null 2>&1
@@ -148,6 +163,7 @@ for name in SpectrumView SpectrumView.1 DataHub DataHub.1 Diagnostics Diagnostic
 done
 script late_bound.vbs
 script pilots.vbs
+examples
 program container container_test "$(windows_path "$out")"
 program contract contract_test
 program hosts hosts_test
