@@ -1,8 +1,9 @@
 ' What stands before every script: a stranger's, who calls everything by name and knows nothing beforehand.
 Option Explicit
 
-Dim folder, diagnostics, hub
+Dim folder, draws, diagnostics, hub
 folder = WScript.Arguments(0)
+draws = WScript.Arguments.Count = 1
 Set diagnostics = CreateObject("FrontPanels.Diagnostics")
 diagnostics.ShowMessages = False
 diagnostics.Clear
@@ -14,6 +15,11 @@ Sub Check(what, actual, expected)
   Else
     WScript.Echo "not ok script: " & what & ": [" & actual & "], not [" & expected & "]"
   End If
+End Sub
+
+' What only a machine that draws can show.
+Sub CheckDrawn(what, actual, expected)
+  If draws Then Check what, actual, expected
 End Sub
 
 Function LastMessage()

@@ -1,7 +1,8 @@
 #!/usr/bin/env bash
 # Everything that only Windows shows, in one session under Wine: the unit tests against its run-time library, the drawing
 # seam pixel by pixel, the registered control driven by a script and by a container, the workbench, the undoing of the
-# registration, and what both libraries import and export. Needs the presets native-release, win64 and win32 built.
+# registration, the library side by side and unregistered, and what the finished files import and export. Needs the
+# presets native-release, win64 and win32 built.
 # Ends with "N passed, N failed".
 set -uo pipefail
 root=$(cd "$(dirname "$0")/../.." && pwd)
@@ -48,11 +49,12 @@ script() {
   judge $? "$1 ran to its end"
 }
 
+programs=$root/build/win64/tests/wine
 # program NAME EXECUTABLE ARGUMENTS...: a program that prints its checks and counts them.
 program() {
   local name=$1 file=$2
   shift 2
-  timeout 600 wine "$root/build/win64/tests/wine/$file.exe" "$@" 2>&1 </dev/null | tr -d '\r' >"$out/$name.log"
+  timeout 600 wine "$programs/$file.exe" "$@" 2>&1 </dev/null | tr -d '\r' >"$out/$name.log"
   grep -E '^(ok|not ok) ' "$out/$name.log"
   count "$out/$name.log" "$name"
 }
@@ -103,18 +105,64 @@ export_classes() {
   iconv -f UTF-16 -t UTF-8 "$out/$1.reg" | tr -d '\r' >"$out/$1.txt"
 }
 
-imports_and_exports() {
-  local width file strange names
-  for width in 64:x86_64 32:i686; do
-    file=$root/build/win${width%%:*}/frontpanels.ocx
-    strange=$("${width##*:}"-w64-mingw32-objdump -p "$file" | sed -n 's/.*DLL Name: //p' |
-      grep -vixE '(advapi32|comdlg32|gdi32|kernel32|msvcrt|ole32|oleaut32|user32|windowscodecs)\.dll')
-    [ -f "$file" ] && [ -z "$strange" ]
-    judge $? "the ${width%%:*}-bit library imports system libraries only${strange:+: $strange}"
-    names=$("${width##*:}"-w64-mingw32-objdump -p "$file" | sed -n '/\[Ordinal\/Name Pointer\]/,/^$/s/.*\] *//p' | tail -n +2 | sort | tr '\n' ' ')
+# The library beside a program whose manifest names its assembly, while nothing is registered.
+side_by_side() {
+  local programs=$out/side_by_side
+  mkdir -p "$programs"
+  cp "$library" "$root/build/win64/FrontPanels.Controls.manifest" \
+    "$root/build/win64/tests/wine/side_by_side_test.exe"{,.manifest} "$programs"
+  program side_by_side side_by_side_test
+}
+
+# same_names WHAT KEY ATTRIBUTE MANIFEST: what the registration added under a key is what the manifest has after an
+# attribute or an element.
+same_names() {
+  diff <(comm -13 <(sort "$out/before.txt") <(sort "$out/registered.txt") |
+    sed -n "s/.*\\\\Software\\\\Classes\\\\$2\\]\$/\\1/p" | tr '[:lower:]' '[:upper:]' | sort) \
+    <(grep -oE "[ <]($3)[^\"<]+" "$4" | sed 's/.*[">]//' | tr '[:lower:]' '[:upper:]' | sort)
+  judge $? "$1"
+}
+
+assemblies() {
+  local width architecture manifest version
+  version=$(sed -n 's/^project(frontpanels VERSION \([0-9.]*\).*/\1.0/p' "$root/CMakeLists.txt")
+  while read -r width architecture; do
+    manifest=$root/build/win$width/FrontPanels.Controls.manifest
+    same_names "the $width-bit assembly has the classes that are registered" \
+      'CLSID\\\({[^}]*}\)\\InprocServer32' 'clsid="' "$manifest"
+    same_names "under their names, of their version or of any" \
+      '\(FrontPanels\.[^\\]*\)\\CLSID' 'progid="|progid>' "$manifest"
+    same_names "and their interfaces" 'Interface\\\({[^}]*}\)\\ProxyStubClsid32' 'iid="' "$manifest"
+    grep -qF "name=\"FrontPanels.Controls\" version=\"$version\" processorArchitecture=\"$architecture\"" "$manifest"
+    judge $? "it is of version $version for $architecture"
+  done <<<$'64 amd64\n32 x86'
+}
+
+# How a finished file is protected against faults of its own.
+hardening() {
+  "$1"-w64-mingw32-objdump -x "$2" | grep -oE 'HIGH_ENTROPY_VA|DYNAMIC_BASE|NX_COMPAT|large address aware|\.reloc' |
+    LC_ALL=C sort -u | xargs
+}
+
+finished_files() {
+  local tool file wanted strange names
+  while read -r tool file wanted; do
+    strange=$("$tool"-w64-mingw32-objdump -p "$root/build/$file" | sed -n 's/.*DLL Name: //p' | grep -vixE \
+      '(advapi32|comctl32|comdlg32|gdi32|kernel32|msvcrt|ole32|oleacc|oleaut32|shell32|user32|windowscodecs)\.dll')
+    [ -s "$root/build/$file" ] && [ -z "$strange" ]
+    judge $? "$file imports system libraries only${strange:+: $strange}"
+    [ "$(hardening "$tool" "$root/build/$file")" = "$wanted" ]
+    judge $? "$file is hardened: $(hardening "$tool" "$root/build/$file")"
+    [[ $file == *.ocx ]] || continue
+    names=$("$tool"-w64-mingw32-objdump -p "$root/build/$file" | sed -n '/\[Ordinal\/Name Pointer\]/,/^$/s/.*\] *//p' | tail -n +2 | sort | tr '\n' ' ')
     [ "$names" = "DllCanUnloadNow DllGetClassObject DllInstall DllRegisterServer DllUnregisterServer " ]
-    judge $? "the ${width%%:*}-bit library exports its five functions undecorated: $names"
-  done
+    judge $? "$file exports its five functions undecorated: $names"
+  done <<'TABLE'
+x86_64 win64/frontpanels.ocx         .reloc DYNAMIC_BASE HIGH_ENTROPY_VA NX_COMPAT large address aware
+x86_64 win64/workbench/workbench.exe .reloc DYNAMIC_BASE HIGH_ENTROPY_VA NX_COMPAT large address aware
+i686   win32/frontpanels.ocx         .reloc DYNAMIC_BASE NX_COMPAT large address aware
+i686   win32/workbench/workbench.exe .reloc DYNAMIC_BASE NX_COMPAT large address aware
+TABLE
 }
 
 # For the current user alone; Wine keeps such classes but does not create them, so the keys are looked at.
@@ -140,7 +188,7 @@ type_libraries() {
   done
 }
 
-imports_and_exports
+finished_files
 timeout 180 wine wineboot -i >/dev/null 2>&1
 unit_tests
 type_libraries
@@ -161,6 +209,7 @@ for name in SpectrumView SpectrumView.1 DataHub DataHub.1 Diagnostics Diagnostic
   grep -qF "Classes\\FrontPanels.$name\\CLSID]" "$out/registered.txt"
   judge $? "FrontPanels.$name is in the registry"
 done
+assemblies
 script late_bound.vbs
 script pilots.vbs
 examples
@@ -182,7 +231,13 @@ export_classes undone
 cmp -s "$out/before.txt" "$out/undone.txt"
 judge $? "the registry is as it was before, key by key"
 for_one_user
+side_by_side
+# Wine registers the type library of an interface that it has marshalled.
+timeout 60 wine regsvr32 /s /u "$(windows_path "$library")"
 wineserver -k >/dev/null 2>&1
+timeout 900 bash "$here/win32_smoke.sh" >"$out/win32_smoke.txt" 2>&1
+grep -E '^(ok|not ok|skipped)' "$out/win32_smoke.txt"
+count "$out/win32_smoke.txt" "the 32-bit control"
 
 printf '%d passed, %d failed\n' "$passed" "$failed"
 [ "$failed" -eq 0 ]
