@@ -38,22 +38,29 @@ same_files() {
   judge $? "$1"
 }
 
+# trial NAME PLACE OPTIONS...: a stranger's project is built with the package at a place.
+trial() {
+  local name=$1 place=$2
+  shift 2
+  cmake -S "$here" -B "$out/trial-$name" -G Ninja -Dfrontpanels_ROOT="$place" -DWANTED_VERSION="$version" "$@" \
+    >"$out/trial-$name.log" 2>&1 && cmake --build "$out/trial-$name" >>"$out/trial-$name.log" 2>&1
+}
+
 installed_library() {
-  local place=$out/moved program=$out/trial/package_trial
+  local place=$out/moved
   cmake --install build/native-release --prefix "$out/first" >"$out/install.log" 2>&1
   mv "$out/first" "$place"
   same_files "the installed library has its files" "$(expected linux win32 share/frontpanels)" \
     "$(cd "$place" && find . -type f | sed 's|^\./||')"
   [ "$("$place/bin/fp-render" --version)" = "fp-render $version" ]
   judge $? "the installed fp-render is of version $version"
-  cmake -S "$here" -B "$out/trial" -G Ninja -DCMAKE_PREFIX_PATH="$place" -DWANTED_VERSION="$version" >"$out/trial.log" 2>&1 &&
-    cmake --build "$out/trial" >>"$out/trial.log" 2>&1 && "$program" >>"$out/trial.log" 2>&1
-  judge $? "a stranger's project builds with it and draws: $(tail -n 1 "$out/trial.log")"
-  ! cmake -S "$here" -B "$out/other" -G Ninja -DCMAKE_PREFIX_PATH="$place" -DWANTED_VERSION="9.$version" \
-    >"$out/other.log" 2>&1 && grep -q "version: $version\$" "$out/other.log"
+  trial native "$place" && "$out/trial-native/package_trial" >>"$out/trial-native.log" 2>&1
+  judge $? "a stranger's project builds with it and draws: $(tail -n 1 "$out/trial-native.log")"
+  ! trial other "$place" -DWANTED_VERSION="9.$version" && grep -q "version: $version\$" "$out/trial-other.log"
   judge $? "a project that wants another version is told the one that is there"
 }
 
+# archive WIDTH PROCESSOR
 archive() {
   local width=$1 name=frontpanels-$version-win$1
   cpack --config "build/win$width/CPackConfig.cmake" -B "$out" >"$out/cpack$width.log" 2>&1
@@ -64,11 +71,14 @@ archive() {
   judge $? "it says its version and width"
   python3 "$here/file_version.py" "$version" "$out/$name"/bin/{frontpanels.ocx,workbench.exe}
   judge $? "and so do the control and the workbench"
+  trial "$width" "$out/$name" -DCMAKE_TOOLCHAIN_FILE="$root/cmake/mingw-$2.cmake" \
+    -Dfrontpanels_DIR="$out/$name/lib/cmake/frontpanels"
+  judge $? "a stranger's project is cross-built with it"
 }
 
 installed_library
-archive 64
-archive 32
+archive 64 x86_64
+archive 32 i686
 
 printf '%d passed, %d failed\n' "$passed" "$failed"
 [ "$failed" -eq 0 ]
