@@ -295,6 +295,12 @@ LRESULT PanelWindow::handle(UINT message, WPARAM wParam, LPARAM lParam) {
       return 0;
     case kDpiChangedAfterParent:
       return followScale(), 0;
+    case WM_SYSCOLORCHANGE:
+    case WM_SETTINGCHANGE:
+    case WM_THEMECHANGED:
+      if (events_ != nullptr && windowDC_ != nullptr) events_->resized();  // makes the picture anew
+      RedrawWindow(window_, nullptr, nullptr, RDW_INVALIDATE | RDW_ALLCHILDREN);
+      return DefWindowProcW(window_, message, wParam, lParam);
     case WM_SETFOCUS:
       return takeFocus(), 0;
     case WM_KILLFOCUS:

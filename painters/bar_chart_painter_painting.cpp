@@ -7,6 +7,7 @@
 #include "framework/support/numeric.h"
 #include "painters/bar_chart_painter.h"
 #include "platform/gdi_scope.h"
+#include "traces/plot_colors.h"
 
 namespace frontpanels {
 namespace {
@@ -42,7 +43,7 @@ std::string_view unitOfOther(std::int16_t otherIs) {
 // A brush a colour, made when it is first asked for and deleted with the others.
 class BarBrushes {
  public:
-  BarBrushes(Gdi& gdi, std::int16_t fillStyle) : gdi_(gdi), fillStyle_(fillStyle) {}
+  BarBrushes(Gdi& gdi, std::int16_t fillStyle) : gdi_(gdi), colors_(gdi), fillStyle_(fillStyle) {}
   ~BarBrushes() {
     for (const BrushHandle brush : brushes_) {
       if (brush) gdi_.deleteObject(brush);
@@ -53,7 +54,7 @@ class BarBrushes {
 
   // Null when it could not be made.
   [[nodiscard]] BrushHandle of(std::size_t color) {
-    if (!brushes_[color]) brushes_[color] = create(kBarColors[color]);
+    if (!brushes_[color]) brushes_[color] = create(colors_.line(kBarColors[color]));
     return brushes_[color];
   }
 
@@ -64,6 +65,7 @@ class BarBrushes {
   }
 
   Gdi& gdi_;
+  PlotColors colors_;
   std::int16_t fillStyle_;
   std::array<BrushHandle, kBarColors.size()> brushes_{};
 };
@@ -138,7 +140,8 @@ void clsBarChartPainter::chooseAxis() {
 
 void clsBarChartPainter::paintBars(DcHandle dc, const BarFrame& frame) {
   const std::span<const HeldBar> painted = barsToPaint();
-  if (!painted.empty()) activeTraceColor(kBarColors[colorOf(painted.front())]);
+  const PlotColors colors(gdi());
+  if (!painted.empty()) activeTraceColor(colors.line(kBarColors[colorOf(painted.front())]));
   if (fillStyle_ != kNoFill) {
     const TextStyleScope hatchesLetThrough(gdi(), dc, kTextOnBar, BackgroundMode::Transparent);
     BarBrushes brushes(gdi(), fillStyle_);
@@ -149,7 +152,7 @@ void clsBarChartPainter::paintBars(DcHandle dc, const BarFrame& frame) {
     }
   }
   if (drawBorders_() || fillStyle_ == kNoFill) {
-    const SelectedPen pen(gdi(), dc, PenStyle::Solid, 1, gdi().sysColor(SystemColor::ButtonText));
+    const SelectedPen pen(gdi(), dc, PenStyle::Solid, 1, colors.text());
     for (std::size_t i = 0; i < painted.size(); ++i) {
       const Rect bar = frame.bar(i, static_cast<double>(painted[i].value));
       if (!bar.empty()) drawBorder(gdi(), dc, bar);
@@ -163,12 +166,13 @@ void clsBarChartPainter::paintThreshold(DcHandle dc, const BarFrame& frame) {
   if (!threshold()) return;
   const auto line = frame.line(*threshold());
   if (!line) return;
+  const PlotColors colors(gdi());
   {
-    const SelectedPen pen(gdi(), dc, PenStyle::Solid, 1, gdi().sysColor(SystemColor::ButtonFace));
+    const SelectedPen pen(gdi(), dc, PenStyle::Solid, 1, colors.background());
     gdi().polyline(dc, *line);
   }
-  const TextStyleScope gaps(gdi(), dc, gdi().sysColor(SystemColor::ButtonText), BackgroundMode::Transparent);
-  const SelectedPen pen(gdi(), dc, PenStyle::Dash, 1, gdi().sysColor(SystemColor::ButtonText));
+  const TextStyleScope gaps(gdi(), dc, colors.text(), BackgroundMode::Transparent);
+  const SelectedPen pen(gdi(), dc, PenStyle::Dash, 1, colors.text());
   gdi().polyline(dc, *line);
 }
 
@@ -200,7 +204,7 @@ void clsBarChartPainter::labelBars(DcHandle dc, const LabelFonts& fonts) {
   const PlotRect plot = plotRect();
   if (barLabeling_ == 0 || !plot.drawable()) return;
   composeTexts();
-  const TextStyleScope style(gdi(), dc, gdi().sysColor(SystemColor::ButtonText), BackgroundMode::Transparent);
+  const TextStyleScope style(gdi(), dc, PlotColors(gdi()).text(), BackgroundMode::Transparent);
   {
     const SelectedFont font(gdi(), dc, fonts.axis);
     layOutTexts(dc, frameOf(plot));
@@ -272,13 +276,16 @@ void clsBarChartPainter::layOutTexts(DcHandle dc, const BarFrame& frame) {
 // Grid and threshold give way to texts that lie on them.
 void clsBarChartPainter::writeTexts(DcHandle dc) {
   const std::int32_t airPx = airOverLetters(direction_);
-  const BrushHandle background = gdi().sysColorBrush(SystemColor::ButtonFace);
+  const PlotColors colors(gdi());
+  const BrushHandle background = colors.backgroundBrush();
+  const std::span<const HeldBar> painted = barsToPaint();
   for (const bool inside : {false, true}) {
-    const TextStyleScope style(gdi(), dc, inside ? kTextOnBar : gdi().sysColor(SystemColor::ButtonText),
-                               BackgroundMode::Transparent);
+    const TextStyleScope style(gdi(), dc, inside ? kTextOnBar : colors.text(), BackgroundMode::Transparent);
     for (const BarTextLayout::Placed& text : layout_.placed()) {
       if (text.inside != inside) continue;
       if (background && !inside && text.part > 0) gdi().fillRect(dc, text.cell, background);
+      const Color bar = kBarColors[colorOf(painted[text.bar])];
+      if (inside) gdi().setTextColor(dc, colors.textOn(colors.line(bar), kTextOnBar));
       gdi().textOut(dc, {text.cell.left, text.cell.top - airPx}, texts_[text.bar].parts[text.part]);
     }
   }

@@ -226,7 +226,7 @@ class clsMultiTracePainter : public PlotPainter {
   void paintPanel(DcHandle dc, const PlotRect& panel);
   void drawTraces(DcHandle dc, const PlotRect& plot);
   void placePoints(TraceSlot& slot, const PlotRect& plot, const ValueAxis& y);
-  void drawTrace(DcHandle dc, const TracePoints& points, Color color);
+  void drawTrace(DcHandle dc, const TracePoints& points, GridPen look);
   void forgetPoints() noexcept;
   void chooseRange();
 

@@ -9,6 +9,7 @@
 #include "painters/multi_trace_painter.h"
 #include "platform/gdi_scope.h"
 #include "platform/runtime_error.h"
+#include "traces/plot_colors.h"
 
 namespace frontpanels {
 namespace {
@@ -164,8 +165,7 @@ void clsMultiTracePainter::activeMarkerToPeak(PeakOrder order) {
 
 void clsMultiTracePainter::drawMarkers(DcHandle dc) {
   guard("drawMarkers() ...", [&] {
-    const TextStyleScope style(gdi(), dc, gdi().sysColor(SystemColor::ButtonText),
-                               BackgroundMode::Transparent);
+    const TextStyleScope style(gdi(), dc, PlotColors(gdi()).text(), BackgroundMode::Transparent);
     for (std::size_t t = 0; t < traces_.traces().size(); ++t) drawMarkersOf(dc, t);
   });
 }
@@ -173,7 +173,7 @@ void clsMultiTracePainter::drawMarkers(DcHandle dc) {
 void clsMultiTracePainter::drawMarkersOf(DcHandle dc, std::size_t trace) {
   const TraceSlot& slot = traces_.traces()[trace];
   if (slot.markers.empty()) return;
-  const SelectedPen pen(gdi(), dc, PenStyle::Solid, 1, traceColor(trace));
+  const SelectedPen pen(gdi(), dc, PenStyle::Solid, 1, PlotColors(gdi()).line(traceColor(trace)));
   for (const MarkerPointer& marker : slot.markers) {
     if (!placeMarker(trace, *marker)) continue;
     marker->draw(gdi(), dc);
@@ -258,8 +258,7 @@ void clsMultiTracePainter::updateMarkerDisplay(DcHandle dc, const LabelFonts& fo
     }
     if (activeMarker() == nullptr) return;
     const SelectedFont font(gdi(), dc, fonts.corner);
-    const TextStyleScope style(gdi(), dc, gdi().sysColor(SystemColor::ButtonText),
-                               BackgroundMode::Transparent);
+    const TextStyleScope style(gdi(), dc, PlotColors(gdi()).text(), BackgroundMode::Transparent);
     writeReadout(dc);
   });
 }

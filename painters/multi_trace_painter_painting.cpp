@@ -8,6 +8,7 @@
 #include "painters/trace_values.h"
 #include "platform/gdi_scope.h"
 #include "platform/runtime_error.h"
+#include "traces/plot_colors.h"
 
 namespace frontpanels {
 namespace {
@@ -84,12 +85,15 @@ void clsMultiTracePainter::drawTraces(DcHandle dc, const PlotRect& plot) {
   if (numberOfMeasurements() != 2) xStepPx_ = plot.width / (numberOfMeasurements() - 2.0);
   const ValueAxis y(plot, range());
   const PlotClip clip(gdi(), dc, plot, panelClip());
+  const PlotColors colors(gdi());
+  // What lies between the dashes of a line shows through.
+  const TextStyleScope gaps(gdi(), dc, colors.text(), BackgroundMode::Transparent);
   const auto traces = traces_.traces();
   for (std::size_t t = 0; t < traces.size(); ++t) {
     if (!traces[t].data.isArray()) continue;
     placePoints(traces[t], plot, y);
-    const Color color = traceColor(t);
-    drawTrace(dc, traces[t].points, color);
+    const Color color = colors.line(traceColor(t));
+    drawTrace(dc, traces[t].points, {colors.traceStyle(t), color});
     dataChanged(false);
     if (t == static_cast<std::size_t>(selectedTraceIndex_)) activeTraceColor(color);
   }
@@ -105,8 +109,8 @@ void clsMultiTracePainter::placePoints(TraceSlot& slot, const PlotRect& plot, co
              [&](auto values) { slot.points.place(values, x, y); });
 }
 
-void clsMultiTracePainter::drawTrace(DcHandle dc, const TracePoints& points, Color color) {
-  const SelectedPen pen(gdi(), dc, PenStyle::Solid, 1, color);
+void clsMultiTracePainter::drawTrace(DcHandle dc, const TracePoints& points, GridPen look) {
+  const SelectedPen pen(gdi(), dc, look.style, 1, look.color);
   for (const TracePoints::Stretch& stretch : points.stretches()) {
     const auto line = points.points(stretch);
     if (line.size() > 1) {

@@ -4,6 +4,7 @@
 
 #include "painters/axis.h"
 #include "platform/gdi_scope.h"
+#include "traces/plot_colors.h"
 
 namespace frontpanels {
 namespace {
@@ -113,7 +114,7 @@ void PlotLabels::draw(Gdi& gdi, DcHandle dc, const LabelFonts& fonts, const Rect
   if (stale_ || inputs_ != Inputs{panel, plot, fonts.axis, fonts.corner}) {
     layOut(gdi, dc, fonts, panel, plot);
   }
-  const TextStyleScope style(gdi, dc, gdi.sysColor(SystemColor::ButtonText), BackgroundMode::Transparent);
+  const TextStyleScope style(gdi, dc, PlotColors(gdi).text(), BackgroundMode::Transparent);
   const auto firstCorner = std::find_if(placed_.begin(), placed_.end(),
                                         [](const Placed& label) { return !inAxisFont(label.place); });
   const auto write = [&](auto first, auto last, FontHandle font) {

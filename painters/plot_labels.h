@@ -72,7 +72,7 @@ class PlotLabels {
   // Keeps the first row under the plot, of this height, for whoever writes there.
   void keepRowUnderPlot(std::int32_t heightPx);
 
-  // Writes the labels round the plot in the colour of button texts on whatever lies there. Texts are measured
+  // Writes the labels round the plot in the colour of texts on whatever lies there. Texts are measured
   // anew only when something has changed.
   void draw(Gdi& gdi, DcHandle dc, const LabelFonts& fonts, const Rect& panel, const Rect& plot);
   // Whether a cell lies within the panel and clear of the labels that were drawn last.

@@ -7,6 +7,7 @@
 #include "framework/support/numeric.h"
 #include "painters/auto_scale.h"
 #include "platform/runtime_error.h"
+#include "traces/plot_colors.h"
 
 namespace frontpanels {
 namespace {
@@ -156,7 +157,8 @@ void PlotPainter::drawGridOver(DcHandle dc, const PlotRect& plot, const GridDivi
       surface_->ViewDrawStyle(*gridDrawStyle_);
     }
     layOutGrid(plot, divisions, gridLines_);
-    drawGrid(gdi_, dc, gridLines_, gridPen_);
+    const PlotColors colors(gdi_);
+    drawGrid(gdi_, dc, gridLines_, {colors.gridStyle(gridPen_.style), colors.grid(gridPen_.color)});
   });
 }
 
@@ -170,7 +172,7 @@ void PlotPainter::clearArea(DcHandle dc) {
 }
 
 void PlotPainter::fillWithBackground(DcHandle dc, const PlotRect& area) {
-  const BrushHandle background = gdi_.sysColorBrush(SystemColor::ButtonFace);
+  const BrushHandle background = PlotColors(gdi_).backgroundBrush();
   if (background) gdi_.fillRect(dc, area.toPixels(), background);
 }
 

@@ -102,6 +102,8 @@ class Gdi {
   [[nodiscard]] virtual BrushHandle stockBrush(StockBrush brush) = 0;
   [[nodiscard]] virtual Color sysColor(SystemColor color) = 0;
   [[nodiscard]] virtual BrushHandle sysColorBrush(SystemColor color) = 0;
+  // Whether the user has asked the system for a scheme of few colours that stand out against each other.
+  [[nodiscard]] virtual bool highContrast() { return false; }
 
   // Selecting answers the object that was selected before, null on failure.
   virtual BitmapHandle selectObject(DcHandle dc, BitmapHandle bitmap) = 0;

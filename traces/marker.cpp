@@ -4,6 +4,7 @@
 
 #include "framework/support/numeric.h"
 #include "platform/gdi_scope.h"
+#include "traces/plot_colors.h"
 
 namespace frontpanels {
 namespace {
@@ -51,7 +52,8 @@ void clsMarker::draw(Gdi& gdi, DcHandle dc) const {
     }
   };
   if (!active) return drawShape();
-  const SelectedPen pen(gdi, dc, PenStyle::Solid, toInt32(kActivePenWidthPx), kActiveColor);
+  const SelectedPen pen(gdi, dc, PenStyle::Solid, toInt32(kActivePenWidthPx),
+                        PlotColors(gdi).selected(kActiveColor));
   drawShape();
 }
 

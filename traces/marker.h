@@ -27,7 +27,8 @@ class clsMarker {
   bool stripChartMarker = false;
   std::int16_t traceId = 0;
 
-  // Raises "Overflow" when a corner leaves the 32-bit range.
+  // Drawn with the pen that is selected, or, when it is the active one, with a wider one of its own. Raises
+  // "Overflow" when a corner leaves the 32-bit range.
   void draw(Gdi& gdi, DcHandle dc) const;
   // Writes the id beside the glyph with the font, colour and background mode that are set in `dc`.
   void drawId(Gdi& gdi, DcHandle dc) const;

@@ -7,6 +7,7 @@
 #include "framework/support/guard.h"
 #include "framework/support/numeric.h"
 #include "platform/gdi_scope.h"
+#include "traces/plot_colors.h"
 #include "traces/result_types.h"
 
 namespace frontpanels {
@@ -150,10 +151,10 @@ void clsTraceManager::setShadowDC() {
     // paint makes the surface anew.
     if (!surface_.dc()) errorHandler().Assert("clsTraceManager::setShadowDC CreateCompatibleBitmap failed");
     gdi_.setBkMode(surface_.dc(), BackgroundMode::Opaque);
-    gdi_.setBkColor(surface_.dc(), gdi_.sysColor(SystemColor::ButtonFace));
+    const PlotColors colors(gdi_);
+    gdi_.setBkColor(surface_.dc(), colors.background());
     surface_.selectOwn(fonts_[static_cast<std::size_t>(LabelFont::SmallAxis)]);
-    gdi_.fillRect(surface_.dc(), {0, 0, sizePx.width, sizePx.height},
-                  gdi_.sysColorBrush(SystemColor::ButtonFace));
+    gdi_.fillRect(surface_.dc(), {0, 0, sizePx.width, sizePx.height}, colors.backgroundBrush());
     measureLabelFonts();
   });
 }
@@ -278,7 +279,7 @@ void clsTraceManager::paintTraces(bool /*forcePaint*/) {
   guard("paintTraces() failed ...", [this] {
     if (!surface_.complete()) setShadowDC();
     gdi_.fillRect(surface_.dc(), {0, 0, toInt32(area_.width), toInt32(area_.height)},
-                  gdi_.sysColorBrush(SystemColor::ButtonFace));
+                  PlotColors(gdi_).backgroundBrush());
     paintPanels();
     showMarkerFrameColor();
     paintSplitters();

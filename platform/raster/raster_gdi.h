@@ -28,6 +28,8 @@ class RasterGdi final : public Gdi {
   [[nodiscard]] PixelView pixels(DcHandle dc);
   // Windows' defaults until they are set. The colour's brush takes it on.
   void setSysColor(SystemColor color, Color value);
+  // Off until it is set.
+  void setHighContrast(bool on) { highContrast_ = on; }
 
   // Objects that were created and not yet deleted; screens and stock objects are not counted.
   [[nodiscard]] std::size_t liveObjects() const;
@@ -50,6 +52,7 @@ class RasterGdi final : public Gdi {
   [[nodiscard]] BrushHandle stockBrush(StockBrush brush) override;
   [[nodiscard]] Color sysColor(SystemColor color) override;
   [[nodiscard]] BrushHandle sysColorBrush(SystemColor color) override;
+  [[nodiscard]] bool highContrast() override { return highContrast_; }
   BitmapHandle selectObject(DcHandle dc, BitmapHandle bitmap) override;
   PenHandle selectObject(DcHandle dc, PenHandle pen) override;
   BrushHandle selectObject(DcHandle dc, BrushHandle brush) override;
@@ -137,6 +140,7 @@ class RasterGdi final : public Gdi {
   std::size_t stockObjects_ = 0;
   std::size_t screens_ = 0;
   std::vector<PixelSpan> wideSpans_;  // reused
+  bool highContrast_ = false;
 };
 
 }  // namespace frontpanels

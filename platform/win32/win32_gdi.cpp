@@ -107,6 +107,11 @@ BrushHandle Win32Gdi::stockBrush(StockBrush brush) {
 Color Win32Gdi::sysColor(SystemColor color) {
   return Color{static_cast<std::uint32_t>(GetSysColor(static_cast<int>(color)))};
 }
+bool Win32Gdi::highContrast() {
+  HIGHCONTRASTW mode{sizeof mode, 0, nullptr};
+  return SystemParametersInfoW(SPI_GETHIGHCONTRAST, sizeof mode, &mode, 0) != 0 &&
+         (mode.dwFlags & HCF_HIGHCONTRASTON) != 0;
+}
 BrushHandle Win32Gdi::sysColorBrush(SystemColor color) {
   return wrapped<BrushHandle>(GetSysColorBrush(static_cast<int>(color)));
 }

@@ -24,6 +24,7 @@ class Win32Gdi : public Gdi {
   [[nodiscard]] BrushHandle stockBrush(StockBrush brush) override;
   [[nodiscard]] Color sysColor(SystemColor color) override;
   [[nodiscard]] BrushHandle sysColorBrush(SystemColor color) override;
+  [[nodiscard]] bool highContrast() override;
   BitmapHandle selectObject(DcHandle dc, BitmapHandle bitmap) override;
   PenHandle selectObject(DcHandle dc, PenHandle pen) override;
   BrushHandle selectObject(DcHandle dc, BrushHandle brush) override;
