@@ -12,6 +12,7 @@
 #include "activex/context_menu.h"
 #include "activex/module.h"
 #include "activex/printed_window.h"
+#include "activex/services.h"
 #include "framework/panel/fields_picture.h"
 #include "platform/win32/field_fonts.h"
 #include "platform/win32/win32_windowing.h"
@@ -298,6 +299,7 @@ LRESULT PanelWindow::handle(UINT message, WPARAM wParam, LPARAM lParam) {
     case WM_SYSCOLORCHANGE:
     case WM_SETTINGCHANGE:
     case WM_THEMECHANGED:
+      services().gdi.settingsChanged();
       if (events_ != nullptr && windowDC_ != nullptr) events_->resized();  // makes the picture anew
       RedrawWindow(window_, nullptr, nullptr, RDW_INVALIDATE | RDW_ALLCHILDREN);
       return DefWindowProcW(window_, message, wParam, lParam);
@@ -346,6 +348,7 @@ LRESULT PanelWindow::handleInput(UINT message, WPARAM wParam, LPARAM lParam) {
 void PanelWindow::paint() {
   PAINTSTRUCT description;
   const HWND painted = window_;
+  services().gdi.settingsChanged();  // a child may hear of new colours by having to paint only
   const HDC dc = BeginPaint(painted, &description);
   // Also when the panel fails: a window that is not validated asks to be painted for ever.
   barrier([&] {

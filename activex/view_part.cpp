@@ -16,7 +16,10 @@ HRESULT ViewPart::Draw(DWORD aspect, LONG, void*, DVTARGETDEVICE*, HDC, HDC dc, 
   if (aspect != DVASPECT_CONTENT) return DV_E_DVASPECT;
   if (dc == nullptr || bounds == nullptr) return E_INVALIDARG;
   if (bounds->left == bounds->right || bounds->top == bounds->bottom) return S_OK;  // nothing to be seen
-  return entry([&] { core().window().draw(services().gdi, dc, *bounds); });
+  return entry([&] {
+    services().gdi.settingsChanged();  // of which only windows are told
+    core().window().draw(services().gdi, dc, *bounds);
+  });
 }
 
 HRESULT ViewPart::GetColorSet(DWORD, LONG, void*, DVTARGETDEVICE*, HDC, LOGPALETTE** palette) {

@@ -108,9 +108,12 @@ Color Win32Gdi::sysColor(SystemColor color) {
   return Color{static_cast<std::uint32_t>(GetSysColor(static_cast<int>(color)))};
 }
 bool Win32Gdi::highContrast() {
-  HIGHCONTRASTW mode{sizeof mode, 0, nullptr};
-  return SystemParametersInfoW(SPI_GETHIGHCONTRAST, sizeof mode, &mode, 0) != 0 &&
-         (mode.dwFlags & HCF_HIGHCONTRASTON) != 0;
+  if (!highContrast_) {
+    HIGHCONTRASTW mode{sizeof mode, 0, nullptr};
+    highContrast_ = SystemParametersInfoW(SPI_GETHIGHCONTRAST, sizeof mode, &mode, 0) != 0 &&
+                    (mode.dwFlags & HCF_HIGHCONTRASTON) != 0;
+  }
+  return *highContrast_;
 }
 BrushHandle Win32Gdi::sysColorBrush(SystemColor color) {
   return wrapped<BrushHandle>(GetSysColorBrush(static_cast<int>(color)));

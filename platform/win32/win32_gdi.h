@@ -1,6 +1,8 @@
 // The drawing seam on the real graphics interface: one call forwarded a method.
 #pragma once
 
+#include <optional>
+
 #include "platform/gdi.h"
 
 namespace frontpanels {
@@ -24,7 +26,9 @@ class Win32Gdi : public Gdi {
   [[nodiscard]] BrushHandle stockBrush(StockBrush brush) override;
   [[nodiscard]] Color sysColor(SystemColor color) override;
   [[nodiscard]] BrushHandle sysColorBrush(SystemColor color) override;
+  // Asked of the system once, and again after it has said that colours or settings have changed.
   [[nodiscard]] bool highContrast() override;
+  void settingsChanged() noexcept { highContrast_.reset(); }
   BitmapHandle selectObject(DcHandle dc, BitmapHandle bitmap) override;
   PenHandle selectObject(DcHandle dc, PenHandle pen) override;
   BrushHandle selectObject(DcHandle dc, BrushHandle brush) override;
@@ -42,6 +46,9 @@ class Win32Gdi : public Gdi {
   bool textOut(DcHandle dc, Point topLeft, std::string_view text) override;
   [[nodiscard]] Size textExtent(DcHandle dc, std::string_view text) override;
   bool bitBlt(DcHandle to, Rect destination, DcHandle from, Point source, RasterOp operation) override;
+
+ private:
+  std::optional<bool> highContrast_;
 };
 
 }  // namespace frontpanels

@@ -137,6 +137,12 @@ TEST_F(SpectrumKeysTest, TabGoesThroughTheMarkersByNumberAndLeavesBehindTheLast)
   EXPECT_EQ(after(kTab, kCtrl), "unused");
 }
 
+TEST_F(SpectrumKeysTest, TheTenthMarkerComesAfterTheNinth) {
+  for (int count = 0; count < 10; ++count) panel->addMarker(), press(kHome);
+  EXPECT_EQ(after(kTab), "unused");
+  for (const char* next : {"9@0", "8@0"}) EXPECT_EQ(after(kTab, kShift), next);
+}
+
 TEST_F(SpectrumKeysTest, EscapeTakesADraggedMarkerBackWhileTheButtonIsDown) {
   panel->addMarker();
   press('P');
