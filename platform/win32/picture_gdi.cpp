@@ -54,7 +54,7 @@ bool alike(const LOGFONTW& a, const LOGFONTW& b) {
 }  // namespace
 
 PictureGdi::Picture::Picture(PictureGdi& gdi, const PictureTarget& target)
-    : gdi_(gdi), target_(target), saved_(SaveDC(target.dc)) {
+    : gdi_(gdi), outer_(gdi.picture_), target_(target), saved_(SaveDC(target.dc)) {
   SetTextAlign(target_.dc, TA_LEFT | TA_TOP | TA_NOUPDATECP);
   const RECTL& bounds = target_.bounds;
   IntersectClipRect(target_.dc, static_cast<int>(bounds.left), static_cast<int>(bounds.top),
@@ -63,7 +63,7 @@ PictureGdi::Picture::Picture(PictureGdi& gdi, const PictureTarget& target)
 }
 
 PictureGdi::Picture::~Picture() {
-  gdi_.picture_ = nullptr;
+  gdi_.picture_ = outer_;
   if (clipped_) RestoreDC(target_.dc, -1);
   if (saved_ != 0) RestoreDC(target_.dc, -1);
   if (pen_ != nullptr) DeleteObject(pen_);

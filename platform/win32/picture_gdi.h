@@ -23,8 +23,8 @@ struct PictureTarget {
 
 class PictureGdi final : public Win32Gdi {
  public:
-  // Calls of the panel go to the picture for as long as it lives. One at a time; the target's state is put
-  // back at the end.
+  // Calls of the panel go to the picture for as long as it lives, to the one opened last. The target's state
+  // is put back at the end.
   class Picture {
    public:
     Picture(PictureGdi& gdi, const PictureTarget& target);
@@ -57,6 +57,7 @@ class PictureGdi final : public Win32Gdi {
     bool textOut(DcHandle dc, Point topLeft, std::string_view text);
 
     PictureGdi& gdi_;
+    Picture* outer_;  // open when this one was opened
     PictureTarget target_;
     int saved_;
     bool clipped_ = false;
