@@ -87,6 +87,7 @@ class FieldWindows final : public FieldSite {
 
 void FieldWindows::create(HWND parent, HFONT font, int dpi) {
   destroy();
+  retired_.reserve(retired_.size() + set_.controls().size());  // letting go of them must not need memory
   parent_ = parent;
   dpi_ = dpi > 0 ? dpi : dotsPerInch(metricsOf(parent));
   fonts_ = FieldFonts(font, dpi_);
