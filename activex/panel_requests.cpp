@@ -11,7 +11,9 @@ enum Event : DISPID { kFrontPanelOp = 1, kFrontPanelSet = 2, kSaveDisplaySetting
 // Arguments of a call, cleared after it.
 class Arguments {
  public:
-  explicit Arguments(std::span<const Variant> values) {
+  Arguments() = default;
+  // By way of the empty list, which clears what it has got when a value is too much for the memory.
+  explicit Arguments(std::span<const Variant> values) : Arguments() {
     list_.reserve(values.size());
     for (const Variant& value : values) list_.push_back(toAutomation(value));
   }

@@ -210,8 +210,9 @@ void PanelWindow::renderGraph(MemoryPicture& picture) {
   picture.create(events_ == nullptr ? clientSizePx() : events_->graphSizePx());
   if (events_ == nullptr) return;
   const HDC before = std::exchange(rendering_, picture.dc());
-  barrier([&] { events_->paint(); });
+  const HRESULT painted = barrier([&] { events_->paint(); });
   rendering_ = before;
+  check(painted);
 }
 
 DcHandle PanelWindow::hdc() {

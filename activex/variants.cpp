@@ -2,7 +2,10 @@
 
 #include <oleauto.h>
 
+#include <algorithm>
 #include <new>
+#include <utility>
+#include <vector>
 
 #include "activex/barrier.h"
 #include "platform/runtime_error.h"
@@ -99,10 +102,8 @@ Variant fromOtherNumber(const VARIANT& value) {
 template <class Element>
 VARIANT arrayOf(VARTYPE type, const std::vector<Element>& values) {
   SAFEARRAY* const array = SafeArrayCreateVector(type, 0, static_cast<ULONG>(values.size()));
-  void* data = nullptr;
-  if (array == nullptr || FAILED(SafeArrayAccessData(array, &data))) throw std::bad_alloc();
-  std::copy(values.begin(), values.end(), static_cast<Element*>(data));
-  SafeArrayUnaccessData(array);
+  if (array == nullptr) throw std::bad_alloc();
+  std::copy(values.begin(), values.end(), static_cast<Element*>(array->pvData));
   VARIANT result;
   VariantInit(&result);
   V_VT(&result) = static_cast<VARTYPE>(VT_ARRAY | type);
@@ -111,7 +112,8 @@ VARIANT arrayOf(VARTYPE type, const std::vector<Element>& values) {
 }
 
 struct ToAutomation {
-  VARIANT result{};
+  OwnedVariant owned;  // until all of it is made
+  VARIANT& result = owned.value;
 
   void operator()(Variant::Empty) {}
   void operator()(Variant::Null) { V_VT(&result) = VT_NULL; }
@@ -141,9 +143,9 @@ struct ToAutomation {
   void operator()(const Variant::Singles& values) { result = arrayOf(VT_R4, values); }
   void operator()(const Variant::Doubles& values) { result = arrayOf(VT_R8, values); }
   void operator()(const Variant::Variants& values) {
-    std::vector<VARIANT> elements;
-    for (const Variant& value : values) elements.push_back(toAutomation(value));
-    result = arrayOf(VT_VARIANT, elements);
+    result = arrayOf(VT_VARIANT, std::vector<VARIANT>(values.size()));
+    auto* element = static_cast<VARIANT*>(V_ARRAY(&result)->pvData);
+    for (const Variant& value : values) *element++ = toAutomation(value);
   }
 };
 
@@ -239,7 +241,7 @@ void replaceVariable(VARIANT& variable, const Variant& value) {
 VARIANT toAutomation(const Variant& value) {
   ToAutomation conversion;
   std::visit(conversion, value.value());
-  return conversion.result;
+  return std::exchange(conversion.result, VARIANT{});
 }
 
 std::string fromBstr(BSTR text) { return toUtf8(std::wstring_view(text, SysStringLen(text))); }
