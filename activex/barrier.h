@@ -26,6 +26,11 @@ inline void check(HRESULT result) {
   if (FAILED(result)) throw ComFailure(result);
 }
 
+// A build for tests defines it before all else and makes any body fail; otherwise there is nothing of it.
+#ifndef FRONTPANELS_FAULT_POINT
+#define FRONTPANELS_FAULT_POINT() static_cast<void>(0)
+#endif
+
 // For a catch block: the code of the exception that is being handled; its text becomes the thread's error
 // information.
 [[nodiscard]] HRESULT currentFailure(const IID& source) noexcept;
@@ -34,6 +39,7 @@ template <class Body>
 HRESULT barrier(const IID& source, Body&& body) noexcept {
   const MaskedFloatingPoint masked;
   try {
+    FRONTPANELS_FAULT_POINT();
     if constexpr (std::is_void_v<decltype(body())>) {
       body();
       return S_OK;

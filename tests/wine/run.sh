@@ -217,6 +217,7 @@ program container container_test "$(windows_path "$out")"
 program contract contract_test
 program hosts hosts_test
 program lives lives_test
+program faults faults_test "$(windows_path "$root/build/win64/tests/wine/frontpanels_faults.ocx")"
 program foreign_container contract_test atl atl.dll
 program closed_loop closed_loop_test
 fields
