@@ -200,6 +200,12 @@ class clsBarChartPainter : public PlotPainter {
   void Label(DcHandle dc, const LabelFonts& fonts) override;
   void updateMarkerDisplay(DcHandle /*dc*/, const LabelFonts& /*fonts*/) override {}
 
+  // --- In words: the chart, then each painted bar. What its key is called goes before it, where no label
+  // does: "PN 12".
+  Property<std::string> spokenKey;
+  void describe(GraphItems& items) override;
+  [[nodiscard]] std::size_t itemCount() const override { return 1 + countToPaint(); }
+
   // --- Sub-traces: a bar chart draws none. It keeps the PN offsets that it was given, and while it has any
   // an update without items is ignored.
   std::int16_t addATrace(std::int16_t mode, std::int16_t pn, double value, std::int32_t size,
@@ -257,6 +263,10 @@ class clsBarChartPainter : public PlotPainter {
   void labelBars(DcHandle dc, const LabelFonts& fonts);
   void composeTexts();
   void composeText(HeldBar& bar, Texts& texts);
+  void appendKey(std::string& text, const Bar& bar) const;
+  [[nodiscard]] std::string_view cellNameOf(const Bar& bar) const;  // empty where none is shown
+  [[nodiscard]] std::string spokenNameOf(const Bar& bar) const;
+  [[nodiscard]] std::string spokenValueOf(const HeldBar& bar) const;
   void layOutTexts(DcHandle dc, const BarFrame& frame);
   void writeTexts(DcHandle dc);
   void writeKeysWithoutRoom(DcHandle dc);

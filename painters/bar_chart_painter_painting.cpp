@@ -1,4 +1,5 @@
 // Painting and labelling of the bar chart painter.
+#include <algorithm>
 #include <array>
 #include <cmath>
 
@@ -38,6 +39,14 @@ std::size_t colorOf(const Bar& bar) {
 std::string_view unitOfOther(std::int16_t otherIs) {
   const auto index = static_cast<std::size_t>(otherIs);
   return otherIs > 0 && index < kOtherUnits.size() ? kOtherUnits[index] : std::string_view();
+}
+
+// False, and nothing appended, for what is no number.
+bool appendQuantity(std::string& text, std::string_view before, float number, std::string_view unit) {
+  if (!std::isfinite(number)) return false;
+  appendNumber(text.append(before), static_cast<double>(number), kQuantityFormat);
+  if (!unit.empty()) text.append(" ").append(unit);
+  return true;
 }
 
 // A brush a colour, made when it is first asked for and deleted with the others.
@@ -223,6 +232,16 @@ void clsBarChartPainter::composeTexts() {
   for (std::size_t i = 0; i < texts_.size(); ++i) composeText(bars_.bars()[i], texts_[i]);
 }
 
+void clsBarChartPainter::appendKey(std::string& text, const Bar& bar) const {
+  xAxisFormatter_.append(text, static_cast<double>(bar.key), xAxisFormatter_.formatString(),
+                         !xAxisFormatter_.suppressSuffix());
+}
+
+std::string_view clsBarChartPainter::cellNameOf(const Bar& bar) const {
+  if (!showCellName_ || cellNames_ == nullptr) return {};
+  return cellNames_->GetCellName(static_cast<double>(bar.key), bar.cellNameId2);
+}
+
 // Into the bar's label, one text behind the other.
 void clsBarChartPainter::composeText(HeldBar& bar, Texts& texts) {
   std::array<std::size_t, BarTextSizes::kQuantities + 1> ends{};
@@ -230,23 +249,16 @@ void clsBarChartPainter::composeText(HeldBar& bar, Texts& texts) {
   bar.label.clear();
   const auto end = [&] { ends[texts.count++] = bar.label.size(); };
   const auto quantity = [&](float number, std::string_view unit) {
-    if (!std::isfinite(number)) return;
-    appendNumber(bar.label.append(kBetweenTexts), static_cast<double>(number), kQuantityFormat);
-    if (!unit.empty()) bar.label.append(" ").append(unit);
-    end();
+    if (appendQuantity(bar.label, kBetweenTexts, number, unit)) end();
   };
   bar.label.append(barLabel_).append(barLabel_.empty() ? "" : " ");
-  xAxisFormatter_.append(bar.label, static_cast<double>(bar.key), xAxisFormatter_.formatString(),
-                         !xAxisFormatter_.suppressSuffix());
+  appendKey(bar.label, bar);
   end();
   if (barLabeling_ == 2 && valueIs_ == 1) quantity(bar.value, valueUnit());
   if (barLabeling_ == 2 && bar.hasOther) quantity(bar.other, unitOfOther(rules_.otherIs));
-  if (showCellName_ && cellNames_ != nullptr) {
-    const std::string_view name = cellNames_->GetCellName(static_cast<double>(bar.key), bar.cellNameId2);
-    if (!name.empty()) {
-      bar.label.append(kBetweenTexts).append(name);
-      end();
-    }
+  if (const std::string_view name = cellNameOf(bar); !name.empty()) {
+    bar.label.append(kBetweenTexts).append(name);
+    end();
   }
   std::size_t from = 0;
   for (std::size_t part = 0; part < texts.count; ++part) {
@@ -305,6 +317,47 @@ void clsBarChartPainter::writeKeysWithoutRoom(DcHandle dc) {
   }
   if (place)
     gdi().textOut(dc, {place->left, place->top}, std::string_view(keysWithoutRoom_).substr(0, fitting));
+}
+
+// --- In words
+
+void clsBarChartPainter::describe(GraphItems& items) {
+  guard("clsBarChartPainter::describe()...", [&] {
+    const std::span<const HeldBar> painted = barsToPaint();
+    std::string summary = countOf(painted.size(), "bar");
+    const auto largest = std::max_element(painted.begin(), painted.end(), [](const Bar& a, const Bar& b) {
+      return a.value < b.value || (!std::isfinite(a.value) && std::isfinite(b.value));
+    });
+    if (largest != painted.end())
+      summary.append(", largest ").append(spokenNameOf(*largest)).append(", ") += spokenValueOf(*largest);
+    items.add(chartItem("Bars", std::move(summary)));
+    const PlotRect plot = plotRect();
+    const bool seen = plot.drawable();
+    for (std::size_t i = 0; i < painted.size(); ++i) {
+      GraphItem item{
+          GraphItemKind::Bar, spokenNameOf(painted[i]), spokenValueOf(painted[i]), {}, false, seen};
+      // A bar that has no length still has its place, where its key stands.
+      if (const BarFrame frame = frameOf(plot); seen)
+        item.placePx = frame.rect(frame.along(i),
+                                  {0, std::max(1, frame.lengthPx(static_cast<double>(painted[i].value)))});
+      items.add(std::move(item));
+    }
+  });
+}
+
+std::string clsBarChartPainter::spokenNameOf(const Bar& bar) const {
+  std::string name = barLabel_.empty() ? spokenKey() : barLabel_;
+  if (!name.empty()) name += ' ';
+  appendKey(name, bar);
+  if (const std::string_view cell = cellNameOf(bar); !cell.empty()) name.append(", ").append(cell);
+  return name;
+}
+
+std::string clsBarChartPainter::spokenValueOf(const HeldBar& bar) const {
+  std::string value;
+  if (!appendQuantity(value, "", bar.value, valueUnit())) value = "no value";
+  if (bar.hasOther) appendQuantity(value, ", ", bar.other, unitOfOther(rules_.otherIs));
+  return value;
 }
 
 }  // namespace frontpanels

@@ -31,12 +31,32 @@ void appendY(std::string& text, double level, const ReadoutFormat& format) {
 // A difference is shown with its sign, in the unit that its size calls for.
 char signOf(double difference) { return difference < 0 ? '-' : '+'; }
 
+void appendXDifference(std::string& text, double x, const ReadoutFormat& format) {
+  text += signOf(x);
+  format.x.appendDifference(text, std::fabs(x), xFormat(std::fabs(x) + format.x.formatOffset(), format),
+                            true);
+}
+
+void appendYDifference(std::string& text, double y, const ReadoutFormat& format) {
+  if (std::isfinite(y)) text += signOf(y);
+  appendY(text, std::fabs(y) + format.y.formatOffset(), format);
+  // The difference of two levels in dBm is a ratio.
+  if (text.ends_with(" dBm")) text.pop_back();
+}
+
 }  // namespace
 
 MarkerReading markerReading(const clsMarker& marker, const ReadoutFormat& format) {
   MarkerReading reading{marker.id, {}, {}};
   appendX(reading.x, marker.valueX, format);
   appendY(reading.y, marker.valueY, format);
+  return reading;
+}
+
+MarkerReading deltaReading(const clsMarker& delta, const clsMarker& partner, const ReadoutFormat& format) {
+  MarkerReading reading{delta.id, {}, {}};
+  appendXDifference(reading.x, delta.valueX - partner.valueX, format);
+  appendYDifference(reading.y, delta.valueY - partner.valueY, format);
   return reading;
 }
 
@@ -54,16 +74,10 @@ void appendLevelReadout(std::string& text, const clsMarker& marker, const Readou
 
 void appendDeltaReadout(std::string& text, const clsMarker& delta, const clsMarker& partner,
                         const ReadoutFormat& format) {
-  const double x = delta.valueX - partner.valueX;
-  const double y = delta.valueY - partner.valueY;
-  ((text += delta.id) += kGap) += signOf(x);
-  format.x.appendDifference(text, std::fabs(x), xFormat(std::fabs(x) + format.x.formatOffset(), format),
-                            true);
+  (text += delta.id) += kGap;
+  appendXDifference(text, delta.valueX - partner.valueX, format);
   text += kGap;
-  if (std::isfinite(y)) text += signOf(y);
-  appendY(text, std::fabs(y) + format.y.formatOffset(), format);
-  // The difference of two levels in dBm is a ratio.
-  if (text.ends_with(" dBm")) text.pop_back();
+  appendYDifference(text, delta.valueY - partner.valueY, format);
 }
 
 }  // namespace frontpanels

@@ -26,6 +26,10 @@ struct MarkerReading {
 };
 [[nodiscard]] MarkerReading markerReading(const clsMarker& marker, const ReadoutFormat& format);
 
+// Of a delta marker: "+200 kHz" and "-3.4 dB", its values less its partner's.
+[[nodiscard]] MarkerReading deltaReading(const clsMarker& delta, const clsMarker& partner,
+                                         const ReadoutFormat& format);
+
 // "1  98.1 MHz  -43.2 dBm"
 void appendReadout(std::string& text, const clsMarker& marker, const ReadoutFormat& format);
 // "1  -43.2 dBm"

@@ -186,6 +186,11 @@ class clsMultiTracePainter : public PlotPainter {
   // not checked here.
   void KeyPress(std::int16_t key) override;
 
+  // --- In words: the painter, then each trace with its markers in the order of their numbers. A marker reads
+  // what the read-out would show of it.
+  void describe(GraphItems& items) override;
+  [[nodiscard]] std::size_t itemCount() const override;
+
   // --- Kept and given back: the interface that both painters share
   Property<std::int16_t> maxTraces{5};
   Property<std::int16_t> maxPNs{40};
@@ -244,6 +249,10 @@ class clsMultiTracePainter : public PlotPainter {
   void writeReadout(DcHandle dc);
   [[nodiscard]] ReadoutFormat readoutFormat() const;
   void composeReadout(Readout readout);
+
+  [[nodiscard]] GraphItem traceItem(std::int16_t trace);
+  [[nodiscard]] GraphItem markerItem(std::int16_t trace, clsMarker& marker);
+  [[nodiscard]] std::size_t markersOfAll() const noexcept;
 
   TraceStore traces_;
   std::int16_t selectedTraceIndex_ = 0;

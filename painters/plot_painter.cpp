@@ -119,6 +119,12 @@ void PlotPainter::updateYAxisLabels() {
   });
 }
 
+GraphItem PlotPainter::chartItem(std::string name, std::string value) const {
+  if (!topLabel().empty()) name = topLabel();
+  if (!spokenName().empty()) name = spokenName();
+  return {GraphItemKind::Chart, std::move(name), std::move(value), panel_.toPixels(), false, true};
+}
+
 // --- Painting
 
 PlotRect PlotPainter::surfaceRect() const {

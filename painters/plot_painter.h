@@ -90,6 +90,9 @@ class PlotPainter : public TraceObject {
     return std::as_const(labels_).yAxisTexts();
   }
 
+  // What it is called where it is read aloud; the top label while this is empty.
+  Property<std::string> spokenName;
+
   // --- Plot insets: pixels between the panel's rectangle and the plot. gridScaleTop is the level at the top
   // of the axis, so the top inset has a name of its own.
   [[nodiscard]] float gridScaleLeft() const { return insets_.left; }
@@ -161,6 +164,8 @@ class PlotPainter : public TraceObject {
   [[nodiscard]] virtual std::int32_t shownDivisions() const { return numberOfVerticalDivisions_; }
   // The value axis's labels are out of date.
   void forgetYAxisLabels() noexcept { labelledRange_.reset(); }
+  // The painter itself, with all its panel.
+  [[nodiscard]] GraphItem chartItem(std::string name, std::string value) const;
   void fillWithBackground(DcHandle dc, const PlotRect& area);
   void drawGridOver(DcHandle dc, const PlotRect& plot, const GridDivisions& divisions);
   void drawLabels(DcHandle dc, const LabelFonts& fonts);

@@ -145,6 +145,7 @@ void Tarvex::setUp(clsBarChartPainter& painter, PilotSet set) {
   painter.setBarsToPaint(set == PilotSet::TopN ? toInt16(fields_.topN.value())
                                                : clsBarChartPainter::kAllBars);
   painter.topLabel(pilotSet(set).title);
+  painter.spokenKey("PN");
   painter.gridScaleTop(0);
   painter.verticalResolution(kBarsDbPerDivision);
   painter.CellNameInfo(base().CellNamingEnabled ? cellNames_ : nullptr);

@@ -46,6 +46,8 @@ class GraphView {
   virtual void visible(bool visible) = 0;
   // Asks for a paint of the whole view; it may come later, from the window system.
   virtual void refresh() = 0;
+  // The graph has been composed anew and copied here.
+  virtual void painted() {}
 };
 
 }  // namespace frontpanels

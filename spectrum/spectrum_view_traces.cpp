@@ -107,6 +107,7 @@ void SpectrumView::setUpTrace(clsMultiTracePainter& painter) {
   painter.gridScaleTop(fields_.verticalOffset.value());
   painter.setAutoScale(fields_.controls.checkBox("AutoScaleBox").Value() != 0);
   painter.yAxisLabel("dBm");
+  painter.spokenName("Spectrum");
   setInsets(painter);
   updateXAxisLabels();
 }

@@ -66,6 +66,15 @@ void clsMarker::drawId(Gdi& gdi, DcHandle dc) const {
   gdi.textOut(dc, {toInt32(positionX - text.width / 2.0), toInt32(glyphTop - kIdGapPx - text.height)}, id);
 }
 
+Rect clsMarker::boundsPx() const {
+  const bool twoEnded = multiMarker || stripChartMarker;
+  const double half = static_cast<double>(width) / 2.0;
+  const double far = twoEnded ? positionY2 : positionY;
+  const double upper = std::min<double>(static_cast<double>(positionY) - height, far);
+  const double lower = std::max<double>(positionY, twoEnded ? far + height : far);
+  return {toInt32(positionX - half), toInt32(upper), toInt32(positionX + half + 1), toInt32(lower + 1)};
+}
+
 std::string deltaMarkerId(const std::string& id) { return id + "d"; }
 
 }  // namespace frontpanels

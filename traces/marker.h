@@ -32,6 +32,8 @@ class clsMarker {
   void draw(Gdi& gdi, DcHandle dc) const;
   // Writes the id beside the glyph with the font, colour and background mode that are set in `dc`.
   void drawId(Gdi& gdi, DcHandle dc) const;
+  // What draw() covers, its lines' far ends included. Raises "Overflow" as draw() does.
+  [[nodiscard]] Rect boundsPx() const;
 };
 
 // The id of a marker's delta partner: "3" gives "3d".

@@ -23,6 +23,8 @@ class TraceForm : public DrawingSurface {
                                          std::int16_t resultType) = 0;
   virtual void setMarkerFrameColor(Color color) = 0;
   virtual void deltaMarkerButtonEnabled(bool enable) = 0;
+  // The graph has been composed anew and is on the screen.
+  virtual void tracesPainted() {}
 };
 
 }  // namespace frontpanels

@@ -284,6 +284,7 @@ void clsTraceManager::paintTraces(bool /*forcePaint*/) {
     showMarkerFrameColor();
     paintSplitters();
     copyToScreen();
+    form_->tracesPainted();
   });
 }
 
@@ -371,6 +372,48 @@ void clsTraceManager::labelTraces() {
       if (traceObject->traceIsVisible()) traceObject->Label(surface_.dc(), fontsOf(*traceObject));
     copyToScreen();
   });
+}
+
+// --- In words
+
+GraphItems clsTraceManager::graphItems() {
+  GraphItems items;
+  guard("graphItems() failed ...", [&] {
+    for (const TracePointer& traceObject : traces_) {
+      const std::size_t first = items.all().size();
+      traceObject->describe(items);
+      nameAfterChart(std::span(items.all()).subspan(first), *traceObject);
+    }
+    const std::int32_t left = toInt32(area_.left);
+    const std::int32_t top = toInt32(area_.top);
+    for (GraphItem& item : items.all())
+      if (Rect& at = item.placePx; !at.empty())
+        at = {at.left + left, at.top + top, at.right + left, at.bottom + top};
+  });
+  return items;
+}
+
+// The trace object is the first one.
+void clsTraceManager::nameAfterChart(std::span<GraphItem> ofOne, const TraceObject& traceObject) const {
+  const bool active = &traceObject == activeTrace_.get();
+  for (GraphItem& item : ofOne) {
+    if (&item != &ofOne.front() && traces_.count() > 1) (item.name += ", ") += ofOne.front().name;
+    item.selected = active && (item.selected || item.kind == GraphItemKind::Chart);
+    item.visible = item.visible && traceObject.traceIsVisible();
+    if (!item.visible) item.placePx = {};
+  }
+}
+
+GraphState clsTraceManager::graphState() const noexcept {
+  GraphState state;
+  for (const TracePointer& traceObject : traces_) state.items += traceObject->itemCount();
+  state.items = std::min(state.items, GraphItems::kMost);
+  state.activeTrace = activeTrace_.get();
+  if (activeTrace_ == nullptr) return state;
+  const MarkerPointer marker = activeTrace_->activeMarker();
+  state.activeMarker = marker.get();
+  if (marker != nullptr) state.point = marker->point;
+  return state;
 }
 
 // --- Input

@@ -129,6 +129,12 @@ class clsTraceManager {
   void maxFontWidth(float px) noexcept { maxFontWidth_ = px; }
   [[nodiscard]] bool boldLabelStyle() const noexcept { return boldLabels_; }
 
+  // --- In words
+  // Trace object by trace object; places are pixels of the panel's view. Where there are several trace
+  // objects, names end in that of theirs. Only what belongs to the active trace is selected.
+  [[nodiscard]] GraphItems graphItems();
+  [[nodiscard]] GraphState graphState() const noexcept;
+
   // Layout values kept for the panel.
   float offset = 0;
   float bottomPanel = 0;
@@ -154,6 +160,7 @@ class clsTraceManager {
   void paintSplitters();
   void showMarkerFrameColor();
   void copyToScreen();
+  void nameAfterChart(std::span<GraphItem> ofOne, const TraceObject& traceObject) const;
   [[nodiscard]] LabelFonts fontsOf(const TraceObject& traceObject) const;
   void makeActive(const TracePointer& traceObject);
   void activateTraceAt(SurfacePoint at);

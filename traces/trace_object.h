@@ -9,6 +9,7 @@
 
 #include "framework/support/collection.h"
 #include "framework/support/drawing_surface.h"
+#include "traces/graph_items.h"
 #include "traces/marker.h"
 
 namespace frontpanels {
@@ -102,6 +103,11 @@ class TraceObject {
   virtual void markerToMax() = 0;
   virtual void markerToMin() = 0;
   virtual void KeyPress(std::int16_t key) = 0;
+
+  // In words, as last painted: adds itself and then what it shows. `itemCount` is how many that are. What has
+  // no words adds nothing.
+  virtual void describe(GraphItems& /*items*/) {}
+  [[nodiscard]] virtual std::size_t itemCount() const { return 0; }
 };
 
 }  // namespace frontpanels

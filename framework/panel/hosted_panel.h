@@ -40,6 +40,7 @@ class HostedPanel : public PanelControl {
   void ViewMousePointer(MousePointer pointer) override { view_.mousePointer(pointer); }
   void Refresh() override { view_.refresh(); }
   void ViewRefresh() override { view_.refresh(); }
+  void tracesPainted() override { view_.painted(); }
 
   // How the surface is drawn on; what the graphics interface knows is set in the view's device context.
   DrawMode ViewDrawMode() override { return drawMode_; }

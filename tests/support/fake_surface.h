@@ -102,6 +102,7 @@ class FakeGraphView : public GraphView {
   MousePointer pointer = MousePointer::Default;
   bool shown = true;
   int refreshes = 0;
+  int paintings = 0;
 
   DcHandle hdc() override { return dc; }
   WindowHandle hwnd() override { return window; }
@@ -111,6 +112,7 @@ class FakeGraphView : public GraphView {
   bool visible() override { return shown; }
   void visible(bool value) override { shown = value; }
   void refresh() override { ++refreshes; }
+  void painted() override { ++paintings; }
 };
 
 }  // namespace frontpanels::testing
