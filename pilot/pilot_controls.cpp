@@ -9,14 +9,14 @@ namespace {
 using enum ControlKind;
 
 constexpr ControlRow kRows[] = {
-    {"controlPanel", Picture, "", "", {0, 0, 12000, 1755}},
-    {"displayPanel", Picture, "", "", {0, 0, 2730, 9000}},
+    spoken({"controlPanel", Picture, "", "", {0, 0, 12000, 1755}}, "Measurement Controls"),
+    spoken({"displayPanel", Picture, "", "", {0, 0, 2730, 9000}}, "Display Controls"),
 
     {"pilotSetsFrame", Frame, "controlPanel", "Pilots", {60, 45, 1995, 1650}},
     {"allPilotsCheckBox", CheckBox, "pilotSetsFrame", "&All Pilots", {105, 240, 1800, 270}, 0},
     {"zoomedPilotsCheckBox", CheckBox, "pilotSetsFrame", "&Zoomed", {105, 570, 1800, 270}, 1},
     {"topNPilotsCheckBox", CheckBox, "pilotSetsFrame", "&Top N", {105, 900, 960, 270}, 2},
-    {"TopNTextBox", TextBox, "pilotSetsFrame", "", {1095, 885, 525, 285}, 3},
+    spoken({"TopNTextBox", TextBox, "pilotSetsFrame", "", {1095, 885, 525, 285}, 3}, "Top N, Count"),
     {"TopNSpinButton", SpinButton, "pilotSetsFrame", "", {1620, 885, 240, 285}},
     {"userListCheckBox", CheckBox, "pilotSetsFrame", "&User List", {105, 1230, 1800, 270}, 4},
 
@@ -42,7 +42,8 @@ constexpr ControlRow kRows[] = {
     {"PNIncrementSpinButton", SpinButton, "CodeFrame", "", {1860, 1275, 240, 285}},
 
     {"userPNListFrame", Frame, "controlPanel", "User PN List", {6570, 45, 2895, 1650}},
-    {"userPNListTextBox", TextBox, "userPNListFrame", "", {105, 270, 1140, 285}, 19},
+    spoken({"userPNListTextBox", TextBox, "userPNListFrame", "", {105, 270, 1140, 285}, 19},
+           "PN, User PN List"),
     {"userPNListSpinButton", SpinButton, "userPNListFrame", "", {1245, 270, 240, 285}},
     {"userPNListAddButton", PushButton, "userPNListFrame", "A&dd", {105, 690, 660, 330}, 20},
     {"userPNListDeleteButton", PushButton, "userPNListFrame", "D&elete", {795, 690, 690, 330}, 21},
@@ -50,9 +51,11 @@ constexpr ControlRow kRows[] = {
     {"userPNListListBox", ListBox, "userPNListFrame", "", {1605, 225, 1185, 1335}, 23},
 
     {"CarrierFrame", Frame, "controlPanel", "Carrier", {9510, 45, 2385, 1650}},
-    {"carrierFrequencyTextBox", TextBox, "CarrierFrame", "", {105, 225, 1935, 285}, 24},
+    spoken({"carrierFrequencyTextBox", TextBox, "CarrierFrame", "", {105, 225, 1935, 285}, 24},
+           "Carrier, Frequency"),
     {"carrierFrequencySpinButton", SpinButton, "CarrierFrame", "", {2040, 225, 240, 285}},
-    {"ChannelizationCombo", ComboBox, "CarrierFrame", "", {105, 555, 2175, 315}, 25},
+    spoken({"ChannelizationCombo", ComboBox, "CarrierFrame", "", {105, 555, 2175, 315}, 25},
+           "Channelization"),
     {"CarrierErrorLabel", Label, "CarrierFrame", "", {105, 930, 2220, 210}},
     {"CarrierStateLabel", Label, "CarrierFrame", "", {105, 1155, 2220, 210}},
     {"onePpsLabel", Label, "CarrierFrame", "", {105, 1380, 2220, 210}},
@@ -77,7 +80,8 @@ constexpr ControlRow kRows[] = {
     {"I0TextBox", TextBox, "I0Frame", "", {105, 255, 2400, 285}},
 
     {"VerticalScaleFrame", Frame, "displayPanel", "Vertical Scale", {60, 3600, 2610, 1290}},
-    {"VerticalScaleTextBox", TextBox, "VerticalScaleFrame", "", {105, 255, 1050, 285}, 39},
+    spoken({"VerticalScaleTextBox", TextBox, "VerticalScaleFrame", "", {105, 255, 1050, 285}, 39},
+           "Vertical Scale, dB/div"),
     {"VerticalScaleSpinButton", SpinButton, "VerticalScaleFrame", "", {1155, 255, 240, 285}},
     {"VerticalScaleLabel", Label, "VerticalScaleFrame", "dB/div", {1455, 300, 1050, 225}},
     {"VerticalOffsetTextBox", TextBox, "VerticalScaleFrame", "", {105, 600, 1050, 285}, 41},
@@ -92,8 +96,10 @@ constexpr ControlRow kRows[] = {
     {"MarkerDeltaButton", PushButton, "MarkerFrame", "Delta", {1320, 630, 1185, 330}, 47},
 
     {"CloseButton", PushButton, "displayPanel", "Close", {60, 6045, 2610, 345}, 48},
-    {"MeasurementFrameInvisibleButton", PushButton, "", "", {0, 7155, 9270, 90}},
-    {"MarkerFrameInvisibleButton", PushButton, "", "", {9180, 0, 90, 7245}},
+    spoken({"MeasurementFrameInvisibleButton", PushButton, "", "", {0, 7155, 9270, 90}},
+           "Show or Hide Measurement Controls"),
+    spoken({"MarkerFrameInvisibleButton", PushButton, "", "", {9180, 0, 90, 7245}},
+           "Show or Hide Display Controls"),
 };
 
 }  // namespace

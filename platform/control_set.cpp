@@ -86,6 +86,7 @@ void ControlSet::add(const ControlRow& row) {
   made->Caption(row.caption);
   made->Move(row.place);
   made->Visible(row.visible);
+  made->spokenName(row.spokenName);
   made->belongTo(this, parent);
   controls_.push_back(std::move(made));
 }
@@ -211,6 +212,15 @@ bool ControlSet::accessKey(char32_t key) {
   else
     match.target->SetFocus();
   return true;
+}
+
+std::u32string ControlSet::accessKeys() const {
+  std::u32string keys;
+  for (Control* const control : tabOrder_) {
+    const char32_t key = accessKeyOf(control->Caption());
+    if (key != 0 && keys.find(key) == std::u32string::npos && keyTarget(*control) != nullptr) keys += key;
+  }
+  return keys;
 }
 
 void ControlSet::click(Control& control) {

@@ -26,7 +26,13 @@ struct ControlRow {
   std::int16_t tabIndex = kNoTabIndex;
   bool visible = true;
   ListStyle listStyle = ListStyle::DropDownList;
+  const char* spokenName = "";  // where nothing that stands at the control names it
 };
+// The row with a name to be read aloud.
+[[nodiscard]] constexpr ControlRow spoken(ControlRow row, const char* name) {
+  row.spokenName = name;
+  return row;
+}
 
 class ControlSet final : private ControlScope {
  public:
@@ -69,6 +75,8 @@ class ControlSet final : private ControlScope {
   // The key of a button clicks it, that of a label or frame goes on to what comes next. One that several
   // controls share walks through them and clicks nothing.
   bool accessKey(char32_t key);
+  // Those that lead somewhere now, in lower case, each once.
+  [[nodiscard]] std::u32string accessKeys() const;
   // A click of the mouse: the focus first, so that a field left behind commits its text before.
   static void click(Control& control);
 

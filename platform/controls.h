@@ -101,6 +101,9 @@ class Control {
 
   [[nodiscard]] ControlKind kind() const noexcept { return kind_; }
   [[nodiscard]] const std::string& name() const noexcept { return name_; }
+  // What it is called where it is read aloud, if its captions do not say it (see platform/control_names.h).
+  [[nodiscard]] const std::string& spokenName() const noexcept { return spokenName_; }
+  void spokenName(std::string name) { spokenName_ = std::move(name); }
   // "&" marks the access key.
   [[nodiscard]] const std::string& Caption() const noexcept { return caption_; }
   void Caption(std::string caption) { set(caption_, std::move(caption), ControlChange::Caption); }
@@ -188,6 +191,7 @@ class Control {
   ControlKind kind_;
   std::string name_;
   std::string caption_;
+  std::string spokenName_;
   bool enabled_ = true;
   bool visible_ = true;
   bool bold_ = false;

@@ -9,8 +9,8 @@ namespace {
 using enum ControlKind;
 
 constexpr ControlRow kRows[] = {
-    {"controlPanel", Picture, "", "", {0, 0, 12000, 1530}},
-    {"displayPanel", Picture, "", "", {0, 0, 2730, 9000}},
+    spoken({"controlPanel", Picture, "", "", {0, 0, 12000, 1530}}, "Measurement Controls"),
+    spoken({"displayPanel", Picture, "", "", {0, 0, 2730, 9000}}, "Display Controls"),
     {"CloseButton", PushButton, "displayPanel", "<Close>", {60, 5280, 2610, 345}, 42},
     {"FrequencyFrame", Frame, "controlPanel", "<Frequency>", {60, 45, 5730, 1425}},
     {"CenterFrequencyTextBox", TextBox, "FrequencyFrame", "", {825, 270, 1830, 285}, 1},
@@ -32,7 +32,8 @@ constexpr ControlRow kRows[] = {
     {"SingleSweepButton", PushButton, "SweepFrame", "<Single>", {105, 255, 1170, 330}, 10},
     {"ContinuousSweepButton", PushButton, "SweepFrame", "<Cont.>", {105, 630, 1170, 330}, 11},
     {"StopSweepButton", PushButton, "SweepFrame", "<Stop>", {105, 1005, 1170, 330}, 12},
-    {"MeasurementFrameInvisibleButton", PushButton, "", "", {0, 7380, 9270, 90}},
+    spoken({"MeasurementFrameInvisibleButton", PushButton, "", "", {0, 7380, 9270, 90}},
+           "Show or Hide Measurement Controls"),
     {"TraceFrame", Frame, "displayPanel", "<Trace>", {60, 45, 2610, 1395}},
     {"AverageCountTextBox", TextBox, "TraceFrame", "", {1335, 270, 900, 285}, 24},
     {"AverageCountSpinButton", SpinButton, "TraceFrame", "", {2235, 270, 240, 285}},
@@ -48,7 +49,7 @@ constexpr ControlRow kRows[] = {
     {"UnitsFrame", Frame, "controlPanel", "<Units>", {7260, 45, 1470, 1425}},
     {"FrequencyOption", OptionButton, "UnitsFrame", "<Frequency>", {105, 255, 1320, 270}, 13},
     {"ChannelOption", OptionButton, "UnitsFrame", "<Channel>", {105, 555, 1320, 270}, 14},
-    {"ChannelizationCombo", ComboBox, "UnitsFrame", "", {105, 960, 1260, 315}, 15},
+    spoken({"ChannelizationCombo", ComboBox, "UnitsFrame", "", {105, 960, 1260, 315}, 15}, "Channelization"),
     {"BandFrame", Frame, "controlPanel", "<Band>", {10365, 45, 1530, 690}},
     {"DownlinkOption", OptionButton, "BandFrame", "<Downlink>", {105, 195, 1380, 225}, 19},
     {"UplinkOption", OptionButton, "BandFrame", "<Uplink>", {105, 420, 1380, 225}, 20},
@@ -62,7 +63,8 @@ constexpr ControlRow kRows[] = {
     {"NarrowbandOption", OptionButton, "IFBandwidthFrame", "<Narrwbd>", {105, 420, 1380, 225}, 22},
     {"IfLabelFormatterNC", TextBox, "controlPanel", "", {0, 0, 0, 0}, kNoTabIndex, false},
     {"VerticalScaleFrame", Frame, "displayPanel", "<Vertical Scale>", {60, 2115, 2610, 945}},
-    {"VerticalScaleTextBox", TextBox, "VerticalScaleFrame", "", {105, 270, 1050, 285}, 32},
+    spoken({"VerticalScaleTextBox", TextBox, "VerticalScaleFrame", "", {105, 270, 1050, 285}, 32},
+           "Vertical Scale, dB/div"),
     {"VerticalScaleSpinButton", SpinButton, "VerticalScaleFrame", "", {1155, 270, 240, 285}},
     {"VerticalScaleLabel", Label, "VerticalScaleFrame", "db&/div", {1455, 315, 960, 225}, 31},
     {"AutoScaleBox", CheckBox, "VerticalScaleFrame", "A&utoScale", {105, 615, 2400, 270}, 33},
@@ -76,7 +78,8 @@ constexpr ControlRow kRows[] = {
     {"MarkerToMaxButton", PushButton, "MarkerFrame", "To Max", {105, 630, 1185, 330}, 39},
     {"MarkerDeltaButton", PushButton, "MarkerFrame", "Delta", {1320, 630, 1185, 330}, 40},
     {"MarkerToCenterButton", PushButton, "MarkerFrame", "To Center", {105, 1005, 1185, 330}, 41},
-    {"MarkerFrameInvisibleButton", PushButton, "", "", {9180, 0, 90, 7470}},
+    spoken({"MarkerFrameInvisibleButton", PushButton, "", "", {9180, 0, 90, 7470}},
+           "Show or Hide Display Controls"),
 };
 
 }  // namespace
