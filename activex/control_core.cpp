@@ -194,6 +194,11 @@ void ControlCore::focusChanged(bool focused) {
   if (focused) inPlace_->activateUi();
 }
 
+void ControlCore::accessKeysChanged() {
+  const auto controlSite = site_.query<IOleControlSite>();
+  if (controlSite && oleObject_->accessKeysOutdated()) controlSite->OnControlInfoChanged();
+}
+
 void ControlCore::windowDestroyed() noexcept { inPlace_->windowLost(); }
 
 }  // namespace frontpanels::activex

@@ -101,6 +101,7 @@ class ControlCore : public Aggregable, public WindowOwner {
   void pressed() override;
   void focusChanged(bool focused) override;
   void windowDestroyed() noexcept override;
+  void accessKeysChanged() override;
   bool inUse() const override { return userMode_; }
   // Tells who looks on, unless the window shows it by itself.
   void viewChanged() override;

@@ -408,6 +408,12 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
   std::vector<PanelMenuItem> contextMenu() override { return panel().contextMenu(); }
   void contextMenuClick(std::int16_t id) override { panel().contextMenuClick(id); }
 
+  GraphItems graphItems() override { return base().traceManager().graphItems(); }
+  GraphState graphState() override { return base().traceManager().graphState(); }
+  std::string title() override {
+    return base().Caption().empty() ? toUtf8(this->controlClass().userTypeName) : base().Caption();
+  }
+
   void focusChanged(bool focused) override {
     Dispatching<DualControl<Dual>, Dual>::focusChanged(focused);
     if (focused) base().Activate();
@@ -418,6 +424,7 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
   void caption(std::string_view text) override {
     this->window().caption(toUtf16(text));
     this->putExtended(L"Caption", std::string(text));
+    this->window().voice().captioned();
   }
   void visible(bool visible) override { this->putExtended(L"Visible", visible); }
   void viewState(std::int16_t state) override { this->putExtended(L"ViewState", state); }

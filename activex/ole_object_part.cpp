@@ -139,7 +139,16 @@ HRESULT OleObjectPart::GetControlInfo(CONTROLINFO* info) {
   info->hAccel = nullptr;
   info->cAccel = 0;
   info->dwFlags = core().window().hasFields() ? CTRLINFO_EATS_RETURN : 0;
-  return S_OK;
+  return barrier([&] { accessKeys_.give(core().window().accessKeys(), *info); });
+}
+
+bool OleObjectPart::accessKeysOutdated() { return accessKeys_.outdated(core().window().accessKeys()); }
+
+// As the key in the panel: the focus goes to the labelled field, a button is clicked.
+HRESULT OleObjectPart::OnMnemonic(MSG* message) {
+  if (message == nullptr) return E_POINTER;
+  const ComPointer<IUnknown> alive(core().outer());
+  return barrier([&] { core().window().accessKey(message->wParam); });
 }
 
 HRESULT OleObjectPart::OnAmbientPropertyChange(DISPID property) {

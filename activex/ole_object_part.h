@@ -1,6 +1,7 @@
 // IOleObject and IOleControl: the container's hold on the control.
 #pragma once
 
+#include "activex/access_keys.h"
 #include "activex/control_core.h"
 
 namespace frontpanels::activex {
@@ -35,12 +36,16 @@ class OleObjectPart final : public ControlPart<IOleObject, IOleControl> {
 
   // IOleControl
   HRESULT STDMETHODCALLTYPE GetControlInfo(CONTROLINFO* info) override;
-  HRESULT STDMETHODCALLTYPE OnMnemonic(MSG*) override { return E_NOTIMPL; }
+  HRESULT STDMETHODCALLTYPE OnMnemonic(MSG* message) override;
   HRESULT STDMETHODCALLTYPE OnAmbientPropertyChange(DISPID property) override;
   HRESULT STDMETHODCALLTYPE FreezeEvents(BOOL freeze) override;
 
+  // Whether the container has a table of access keys that is no longer right.
+  [[nodiscard]] bool accessKeysOutdated();
+
  private:
   ComPointer<IOleAdviseHolder> advises_;
+  AccessKeys accessKeys_;
 };
 
 }  // namespace frontpanels::activex

@@ -2,11 +2,13 @@
 #pragma once
 
 #include <cstdint>
+#include <string>
 #include <vector>
 
 #include "framework/panel/pop_up_menu.h"
 #include "platform/geometry.h"
 #include "platform/windowing.h"
+#include "traces/graph_items.h"
 
 namespace frontpanels::activex {
 
@@ -42,6 +44,11 @@ class PanelEvents {
   // The graph's own menu, empty for none.
   [[nodiscard]] virtual std::vector<PanelMenuItem> contextMenu() = 0;
   virtual void contextMenuClick(std::int16_t id) = 0;
+  // What the graph shows, in words, with places in pixels of the view; and what is told of it as it happens.
+  [[nodiscard]] virtual GraphItems graphItems() = 0;
+  [[nodiscard]] virtual GraphState graphState() = 0;
+  // What the panel is called: its caption, else what its class is.
+  [[nodiscard]] virtual std::string title() = 0;
 };
 
 }  // namespace frontpanels::activex

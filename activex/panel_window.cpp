@@ -8,12 +8,14 @@
 #include <new>
 #include <utility>
 
+#include "activex/accessible_field.h"
 #include "activex/barrier.h"
 #include "activex/context_menu.h"
 #include "activex/module.h"
 #include "activex/printed_window.h"
 #include "activex/services.h"
 #include "framework/panel/fields_picture.h"
+#include "platform/control_names.h"
 #include "platform/win32/field_fonts.h"
 #include "platform/win32/win32_windowing.h"
 
@@ -117,7 +119,7 @@ void MemoryPicture::release() noexcept {
 // --- The window
 
 PanelWindow::PanelWindow(WindowOwner& owner, ScreenMetrics metrics, Size initialSizePx)
-    : owner_(owner), metrics_(metrics), memorySizePx_(initialSizePx) {}
+    : owner_(owner), voice_(*this, owner), metrics_(metrics), memorySizePx_(initialSizePx) {}
 
 PanelWindow::~PanelWindow() { destroy(); }
 
@@ -273,6 +275,7 @@ LRESULT CALLBACK PanelWindow::windowProcedure(HWND window, UINT message, WPARAM 
     self->window_ = nullptr;
     self->windowDC_ = nullptr;
     self->focused_ = false;
+    self->voice_.windowGone();
     if (self->fields_) self->fields_->destroy();
     self->owner_.windowDestroyed();
   }
@@ -329,8 +332,12 @@ LRESULT PanelWindow::handleInput(UINT message, WPARAM wParam, LPARAM lParam) {
       if (events_ != nullptr && owner_.inUse()) events_->mouseMove(mouseEvent(buttonsHeld(wParam), lParam));
       return 0;
     case WM_KEYDOWN:
+    case WM_SYSKEYDOWN:
     case WM_SYSCHAR:
       if (untranslatedKey(message, wParam)) return 0;
+      break;
+    case WM_GETOBJECT:
+      if (asksForClient(lParam)) return voice_.answer(wParam);
       break;
     case WM_GETDLGCODE:
       return dialogCode(reinterpret_cast<const MSG*>(lParam));
@@ -454,6 +461,21 @@ void PanelWindow::takeFocus() {
   focusMoved(window_);
   if (entered && fields_ && GetFocus() == window_ && GetKeyState(VK_TAB) < 0 && owner_.inUse())
     fields_->enter(GetKeyState(VK_SHIFT) >= 0);
+}
+
+std::u32string PanelWindow::accessKeys() const {
+  return controls_ == nullptr || window_ == nullptr ? std::u32string() : controls_->accessKeys();
+}
+
+bool PanelWindow::accessKey(WPARAM key) {
+  return window_ != nullptr && translateKey(MSG{window_, WM_SYSCHAR, key, 0, 0, {}});
+}
+
+bool PanelWindow::readAloud(const Control& control, HWND window, WPARAM flags, LRESULT& result) {
+  if (controls_ == nullptr || control.kind() == ControlKind::Label) return false;
+  result =
+      accessibleField(window, flags, {spokenName(*controls_, control), spokenShortcut(*controls_, control)});
+  return result != 0;
 }
 
 // --- Mouse and menu

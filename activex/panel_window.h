@@ -9,6 +9,7 @@
 #include <string>
 
 #include "activex/panel_events.h"
+#include "activex/panel_voice.h"
 #include "platform/win32/picture_gdi.h"
 #include "platform/win32/win32_controls.h"
 #include "platform/windowing.h"
@@ -27,6 +28,8 @@ class WindowOwner {
   // The keyboard focus has come to the graph or a field, or has left both.
   virtual void focusChanged(bool focused) = 0;
   virtual void windowDestroyed() noexcept = 0;
+  // Fields have come into reach of their access keys, or out of it.
+  virtual void accessKeysChanged() = 0;
   // False while a form is being designed: the panel is a picture then, without input.
   [[nodiscard]] virtual bool inUse() const = 0;
   // What it shows while there is no window is another picture now.
@@ -62,6 +65,7 @@ class PanelWindow final : public GraphView, private FieldsOwner {
   ~PanelWindow() override;
   // What is told about paints and input from now on; null for nobody.
   void events(PanelEvents* events) noexcept { events_ = events; }
+  [[nodiscard]] PanelEvents* events() const noexcept { return events_; }
   // What is shown as child windows, null for nothing. Not while there is a window.
   void fields(ControlSet* fields);
   [[nodiscard]] bool hasFields() const noexcept { return fields_.has_value(); }
@@ -82,6 +86,10 @@ class PanelWindow final : public GraphView, private FieldsOwner {
   [[nodiscard]] bool hasFocus() const noexcept { return holds(GetFocus()); }
   // For the container's message loop: the keys that move the focus among the fields. False for others.
   bool translateKey(const MSG& message);
+  // The access keys that lead to a field now, and the effect of one, wherever the focus is; false for others.
+  [[nodiscard]] std::u32string accessKeys() const;
+  bool accessKey(WPARAM key);
+  [[nodiscard]] PanelVoice& voice() noexcept { return voice_; }
   // Draws the whole panel, with its fields whether they have windows or not, into the bounds, which are
   // logical coordinates of the context: as lines, areas and texts at its own resolution.
   void draw(PictureGdi& gdi, HDC dc, const RECTL& bounds);
@@ -97,6 +105,7 @@ class PanelWindow final : public GraphView, private FieldsOwner {
   bool visible() override { return visible_; }
   void visible(bool visible) override;
   void refresh() override;
+  void painted() override { voice_.painted(); }
 
  private:
   static LRESULT CALLBACK windowProcedure(HWND window, UINT message, WPARAM wParam, LPARAM lParam) noexcept;
@@ -123,8 +132,11 @@ class PanelWindow final : public GraphView, private FieldsOwner {
   void run(const std::function<void()>& body) noexcept override;
   void focusMoved(HWND to) override;
   bool inUse() const override { return owner_.inUse(); }
+  bool readAloud(const Control& control, HWND window, WPARAM flags, LRESULT& result) override;
+  void accessKeysChanged() override { owner_.accessKeysChanged(); }
 
   WindowOwner& owner_;
+  PanelVoice voice_;
   ScreenMetrics metrics_;
   PanelEvents* events_ = nullptr;
   ControlSet* controls_ = nullptr;

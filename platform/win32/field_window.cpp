@@ -524,7 +524,7 @@ void FieldWindow::changed(ControlChange what) {
   switch (what) {
     case ControlChange::Caption:
       if (facetsOf(control_.kind()).hasCaption) SetWindowTextW(window_, toUtf16(control_.Caption()).c_str());
-      return;
+      return site_.captionsChanged();
     case ControlChange::Enabled:
     case ControlChange::Visible:
       return site_.showUsability();
@@ -599,6 +599,14 @@ LRESULT FieldWindow::handle(UINT message, WPARAM wide, LPARAM extra) {
     case WM_CTLCOLORSTATIC:
     case WM_DRAWITEM:
       if (site_.childMessage(message, wide, extra, result)) return result;
+      break;
+    case WM_GETOBJECT:
+      if (static_cast<DWORD>(extra) == static_cast<DWORD>(OBJID_CLIENT) &&
+          site_.readAloud(control_, wide, result))
+        return result;
+      break;
+    case WM_SYSKEYDOWN:
+      site_.untranslatedKey(message, wide);
       break;
     case kDeferred:
       return deferred(wide), 0;

@@ -31,6 +31,10 @@ class FieldSite : public std::enable_shared_from_this<FieldSite> {
   virtual bool untranslatedKey(UINT message, WPARAM key) = 0;
   virtual void focusMoved(HWND to) = 0;
   [[nodiscard]] virtual bool inUse() const = 0;
+  // The answer to who reads a field's window aloud; false for the system's.
+  virtual bool readAloud(const Control& control, WPARAM flags, LRESULT& result) = 0;
+  // What access keys lead to may have changed.
+  virtual void captionsChanged() = 0;
 
   // Keeps the fields, also those that are let go of, until the message at hand is through.
   class Visit {

@@ -55,6 +55,12 @@ class FieldWindows final : public FieldSite {
     if (owner_ != nullptr) owner_->focusMoved(to);
   }
   [[nodiscard]] bool inUse() const override { return owner_ == nullptr || owner_->inUse(); }
+  bool readAloud(const Control& control, WPARAM flags, LRESULT& result) override {
+    return owner_ != nullptr && owner_->readAloud(control, fieldOf(control)->window(), flags, result);
+  }
+  void captionsChanged() override {
+    if (owner_ != nullptr) owner_->accessKeysChanged();
+  }
 
  protected:
   void allLeft() noexcept override { retired_.clear(); }
@@ -182,6 +188,7 @@ void FieldWindows::arrange(const Control& moved) {
 void FieldWindows::showUsability() {
   for (std::size_t index = 0; index < fields_.size(); ++index)
     if (fields_[index]->window() != nullptr) fields_[index]->showUsability();
+  captionsChanged();
 }
 
 // --- Looking up
@@ -257,7 +264,8 @@ bool FieldWindows::translateKey(const MSG& message) {
 }
 
 bool FieldWindows::pressed(UINT message, WPARAM key) {
-  if (message == WM_SYSKEYDOWN && key == VK_MENU) showCues(UISF_HIDEACCEL | UISF_HIDEFOCUS);
+  if (message == WM_SYSKEYDOWN && (key == VK_MENU || key == VK_F10))
+    showCues(UISF_HIDEACCEL | UISF_HIDEFOCUS);
   bool moved = false;
   if (message == WM_SYSCHAR) {
     moved = set_.accessKey(static_cast<char32_t>(key));

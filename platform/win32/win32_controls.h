@@ -25,6 +25,13 @@ class FieldsOwner {
   virtual void focusMoved(HWND /*to*/) {}
   // While not in use, as in a designer, the mouse passes through the fields.
   [[nodiscard]] virtual bool inUse() const { return true; }
+  // A field's window is asked for what to read aloud of it (WM_GETOBJECT for its client); false leaves the
+  // answer to the system.
+  virtual bool readAloud(const Control& /*control*/, HWND /*window*/, WPARAM /*flags*/, LRESULT& /*result*/) {
+    return false;
+  }
+  // A field was shown, hidden, enabled, disabled or renamed: access keys may lead elsewhere.
+  virtual void accessKeysChanged() {}
 };
 
 class Win32Controls {

@@ -167,7 +167,7 @@ class FullContainer
     return wanted = *rect, hear("OnPosRectChange");
   }
   // IOleControlSite
-  HRESULT STDMETHODCALLTYPE OnControlInfoChanged() override { return S_OK; }
+  HRESULT STDMETHODCALLTYPE OnControlInfoChanged() override { return hear("OnControlInfoChanged"); }
   HRESULT STDMETHODCALLTYPE LockInPlaceActive(BOOL) override { return E_NOTIMPL; }
   HRESULT STDMETHODCALLTYPE GetExtendedControl(IDispatch** extended) override;
   HRESULT STDMETHODCALLTYPE TransformCoords(POINTL*, POINTF*, DWORD) override { return E_NOTIMPL; }

@@ -220,6 +220,7 @@ program lives lives_test
 program faults faults_test "$(windows_path "$root/build/win64/tests/wine/frontpanels_faults.ocx")"
 program foreign_container contract_test atl atl.dll
 program closed_loop closed_loop_test
+program access access_test
 fields
 if [ -f "$here/workbench.sh" ]; then
   bash "$here/workbench.sh" >"$out/workbench.txt" 2>&1
