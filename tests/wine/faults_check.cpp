@@ -692,9 +692,12 @@ const Method kPanelMethods[] = {
      kTells},
     {"IOleObject::SetColorScheme", [](Subject& s) { return ask(s, &IOleObject::SetColorScheme, nullptr); },
      kDeclines},
-    {"IOleControl::GetControlInfo", tells<&IOleControl::GetControlInfo, CONTROLINFO>, kTells},
-    {"IOleControl::OnMnemonic", [](Subject& s) { return ask(s, &IOleControl::OnMnemonic, nullptr); },
-     kDeclines},
+    {"IOleControl::GetControlInfo", tells<&IOleControl::GetControlInfo, CONTROLINFO>},
+    {"IOleControl::OnMnemonic",
+     [](Subject& s) {
+       MSG key{nullptr, WM_SYSCHAR, 'x', 0, 0, {}};
+       return ask(s, &IOleControl::OnMnemonic, &key);
+     }},
     {"IOleControl::OnAmbientPropertyChange",
      [](Subject& s) { return ask(s, &IOleControl::OnAmbientPropertyChange, DISPID_UNKNOWN); }},
     {"IOleControl::FreezeEvents", [](Subject& s) { return ask(s, &IOleControl::FreezeEvents, FALSE); },
