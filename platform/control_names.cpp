@@ -32,7 +32,7 @@ std::string frameOf(const Control& control) {
   return parent == nullptr || parent->kind() != ControlKind::Frame ? "" : spokenCaption(parent->Caption());
 }
 
-std::string inFrame(std::string name, const Control& control) {
+std::string inFrame(const std::string& name, const Control& control) {
   const std::string frame = frameOf(control);
   return frame.empty() || frame == name ? name : name + ", " + frame;
 }
