@@ -161,16 +161,17 @@ void ControlCore::extent(SIZEL himetric) {
 
 void ControlCore::requestPlace(const RECT& place) {
   if (inPlace_->active()) return inPlace_->requestPlace(place);
-  const Size sizePx{place.right - place.left, place.bottom - place.top};
   placePx_ = place;
-  if (sizePx.width <= 0 || sizePx.height <= 0) return;
-  extent(himetricOf(sizePx));
+  if (!adoptSize({place.right - place.left, place.bottom - place.top})) return;
+  viewChanged();
   if (const ComPointer<IOleClientSite> site = site_) site->RequestNewObjectLayout();
 }
 
 // A window shows by itself what it has got.
 void ControlCore::viewChanged() {
-  if (savings_ == 0 && !inPlace_->active()) LateNotices::tell(*this);
+  if (inPlace_->active()) return;
+  if (savings_ == 0) return LateNotices::tell(*this);
+  changedMeanwhile_ = true;
 }
 
 void ControlCore::tellOnlookers() {
@@ -178,11 +179,12 @@ void ControlCore::tellOnlookers() {
   dataObject_->changed();
 }
 
-void ControlCore::adoptSize(Size sizePx) {
+bool ControlCore::adoptSize(Size sizePx) {
   window_.resizeMemory(sizePx);  // for the time after the window
-  if (sizePx.width <= 0 || sizePx.height <= 0 || pixelsOf(extent_) == sizePx) return;
+  if (sizePx.width <= 0 || sizePx.height <= 0 || pixelsOf(extent_) == sizePx) return false;
   extent_ = himetricOf(sizePx);
   dirty_ = true;
+  return true;
 }
 
 void ControlCore::pressed() { inPlace_->activateUi(); }

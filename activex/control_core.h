@@ -8,6 +8,7 @@
 #include <memory>
 #include <span>
 #include <string>
+#include <utility>
 
 #include "activex/aggregable.h"
 #include "activex/barrier.h"
@@ -61,8 +62,8 @@ class ControlCore : public Aggregable, public WindowOwner {
   // Himetric; what the container set is kept as it is.
   [[nodiscard]] SIZEL extent() const noexcept { return extent_; }
   void extent(SIZEL himetric);
-  // Takes over a size in pixels when the kept extent means another one.
-  void adoptSize(Size sizePx);
+  // Takes over a size in pixels when the kept extent means another one; answers whether it did.
+  bool adoptSize(Size sizePx);
 
   [[nodiscard]] bool dirty() const noexcept { return dirty_; }
   void dirty(bool dirty) noexcept { dirty_ = dirty; }
@@ -77,7 +78,9 @@ class ControlCore : public Aggregable, public WindowOwner {
   class Saving {
    public:
     explicit Saving(ControlCore& core) noexcept : core_(core) { ++core_.savings_; }
-    ~Saving() { --core_.savings_; }
+    ~Saving() {
+      if (--core_.savings_ == 0 && std::exchange(core_.changedMeanwhile_, false)) core_.viewChanged();
+    }
     Saving(const Saving&) = delete;
     Saving& operator=(const Saving&) = delete;
 
@@ -126,6 +129,7 @@ class ControlCore : public Aggregable, public WindowOwner {
   bool dirty_ = false;
   int freezes_ = 0;
   int savings_ = 0;
+  bool changedMeanwhile_ = false;
   RECT placePx_{};
 
   std::unique_ptr<OleObjectPart> oleObject_;

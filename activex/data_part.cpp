@@ -1,5 +1,7 @@
 #include "activex/data_part.h"
 
+#include <algorithm>
+
 #include "activex/enumerators.h"
 #include "activex/services.h"
 
@@ -25,16 +27,19 @@ struct FormatTraits {
 };
 using FormatEnumerator = Enumerator<IEnumFORMATETC, FormatTraits>;
 
-// The handle of what was drawn. Himetric, as both kinds of metafile count.
+// The kinds of metafile have the size in himetric. What is drawn into an enhanced one is counted in pixels of
+// the screen by its size in millimetres, which need not be those of its dots an inch.
 HENHMETAFILE recordEnhanced(ControlCore& control) {
   const SIZEL extent = control.extent();
   const RECT frame{0, 0, static_cast<LONG>(extent.cx), static_cast<LONG>(extent.cy)};
   const HDC dc = CreateEnhMetaFileW(nullptr, nullptr, &frame, nullptr);
   if (dc == nullptr) throw ComFailure(E_OUTOFMEMORY);
-  const Size px = pixelsOf(extent);
-  const HRESULT drawn = barrier([&] {
-    control.window().draw(services().gdi, dc, RECTL{0, 0, px.width, px.height});
-  });
+  const auto lengthPx = [dc](LONG himetric, int resolution, int millimetres) {
+    return MulDiv(static_cast<int>(himetric), GetDeviceCaps(dc, resolution),
+                  100 * GetDeviceCaps(dc, millimetres));
+  };
+  const RECTL bounds{0, 0, lengthPx(extent.cx, HORZRES, HORZSIZE), lengthPx(extent.cy, VERTRES, VERTSIZE)};
+  const HRESULT drawn = barrier([&] { control.window().draw(services().gdi, dc, bounds); });
   const HENHMETAFILE recorded = CloseEnhMetaFile(dc);
   if (SUCCEEDED(drawn) && recorded != nullptr) return recorded;
   DeleteEnhMetaFile(recorded);
@@ -45,12 +50,14 @@ HMETAFILE recordPlain(ControlCore& control) {
   const HDC dc = CreateMetaFileW(nullptr);
   if (dc == nullptr) throw ComFailure(E_OUTOFMEMORY);
   const SIZEL extent = control.extent();
+  // Its coordinates have 16 bits.
+  constexpr LONG kLargest = 16000;
+  const LONG unit = std::max(extent.cx, extent.cy) / kLargest + 1;
+  const RECTL bounds{0, 0, extent.cx / unit, extent.cy / unit};
   SetMapMode(dc, MM_ANISOTROPIC);
   SetWindowOrgEx(dc, 0, 0, nullptr);
-  SetWindowExtEx(dc, static_cast<int>(extent.cx), static_cast<int>(extent.cy), nullptr);
-  const HRESULT drawn = barrier([&] {
-    control.window().draw(services().gdi, dc, RECTL{0, 0, extent.cx, extent.cy});
-  });
+  SetWindowExtEx(dc, static_cast<int>(bounds.right), static_cast<int>(bounds.bottom), nullptr);
+  const HRESULT drawn = barrier([&] { control.window().draw(services().gdi, dc, bounds); });
   const HMETAFILE recorded = CloseMetaFile(dc);
   if (SUCCEEDED(drawn) && recorded != nullptr) return recorded;
   DeleteMetaFile(recorded);
@@ -128,7 +135,7 @@ HRESULT DataPart::DAdvise(FORMATETC* format, DWORD flags, IAdviseSink* sink, DWO
 }
 
 HRESULT DataPart::DUnadvise(DWORD connection) {
-  return advises_ ? advises_->Unadvise(connection) : OLE_E_NOCONNECTION;
+  return entry([&] { return advises_ ? advises_->Unadvise(connection) : OLE_E_NOCONNECTION; });
 }
 
 HRESULT DataPart::EnumDAdvise(IEnumSTATDATA** advises) {

@@ -5,7 +5,9 @@
 
 #include <algorithm>
 #include <cstring>
+#include <iterator>
 #include <string>
+#include <utility>
 
 #include "activex/base_object.h"
 #include "activex/connections_part.h"
@@ -414,6 +416,13 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
     return base().Caption().empty() ? toUtf8(this->controlClass().userTypeName) : base().Caption();
   }
 
+  // Whoever has shown or hidden an area: host, menu or user.
+  void settled() override {
+    const bool now[] = {base().rightPanelVisible(), base().bottomPanelVisible()};
+    for (std::size_t area = 0; area < std::size(now); ++area)
+      if (std::exchange(storedAreas_[area], now[area]) != now[area]) propertyChanged(kStoredAreaIds[area]);
+  }
+
   void focusChanged(bool focused) override {
     Dispatching<DualControl<Dual>, Dual>::focusChanged(focused);
     if (focused) base().Activate();
@@ -459,6 +468,7 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
                : common.bottomPanelVisible();
   }
   void storedValue(std::size_t property, const Variant& value) override {
+    storedAreas_[property] = value.toBoolean();
     if (static_cast<AreaProperty>(property) == AreaProperty::DisplayPanelVisible)
       base().rightPanelVisible(value.toBoolean());
     else
@@ -476,13 +486,14 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
   HRESULT give(T* result, Body body) {
     if (result == nullptr) return E_POINTER;
     std::memset(result, 0, sizeof(T));
-    const ComPointer<IUnknown> alive(this->outer());
-    return barrier(__uuidof(Dual), [&] { *result = body(); });
+    return perform([&] { *result = body(); });
   }
   template <class Body>
   HRESULT perform(Body body) {
     const ComPointer<IUnknown> alive(this->outer());
-    return barrier(__uuidof(Dual), body);
+    const HRESULT done = barrier(__uuidof(Dual), body);
+    barrier([&] { settled(); });
+    return done;
   }
   // A stored property has another value: the form is to be saved, and whoever watches the property is told.
   void propertyChanged(DISPID id) {
@@ -546,14 +557,17 @@ class FrontPanelControl : public Dispatching<DualControl<Dual>, Dual>,
 
   HRESULT change(AreaProperty property, VARIANT_BOOL value) {
     return perform([&] {
-      storedValue(static_cast<std::size_t>(property), value != VARIANT_FALSE);
-      propertyChanged(kStoredAreaIds[static_cast<std::size_t>(property)]);
+      if (property == AreaProperty::DisplayPanelVisible)
+        base().rightPanelVisible(value != VARIANT_FALSE);
+      else
+        base().bottomPanelVisible(value != VARIANT_FALSE);
     });
   }
 
   PanelRequests requests_;
   BaseInstance baseObject_;
   Panel panel_;
+  bool storedAreas_[2] = {true, true};  // as the container knows them
 };
 
 }  // namespace frontpanels::activex

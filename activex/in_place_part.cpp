@@ -37,7 +37,9 @@ void InPlacePart::activate(HWND parent, const RECT* place) {
   core().window().visible(true);
 }
 
+// In each answer the container may end what has only begun.
 void InPlacePart::enterSite(HWND parent, const RECT* place) {
+  deactivate();  // of a window that went with its container's
   const auto site = core().site().query<IOleInPlaceSite>();
   if (!site || site->CanInPlaceActivate() != S_OK) throw ComFailure(E_FAIL);
   check(site->OnInPlaceActivate());
@@ -52,14 +54,17 @@ void InPlacePart::enterSite(HWND parent, const RECT* place) {
       SUCCEEDED(site->GetWindowContext(frame_.receive(), document_.receive(), &area, &clip, &info));
   if (!told && place != nullptr) area = *place;
   try {
-    core().window().create(container, area);
+    if (inPlaceSite_) core().window().create(container, area);
+    if (inPlaceSite_) addBoxOwner(*this);
   } catch (...) {
-    inPlaceSite_.reset();
-    site->OnInPlaceDeactivate();
+    deactivate();
     throw;
   }
+  if (!inPlaceSite_) {
+    core().window().destroy();
+    throw ComFailure(E_FAIL);
+  }
   active_ = true;
-  addBoxOwner(*this);
   takePlace(area, told ? &clip : nullptr);
   if (const ComPointer<IOleClientSite> client = core().site()) client->ShowObject();
 }
@@ -81,7 +86,7 @@ void InPlacePart::activateUi() {
   const ComPointer<IOleInPlaceSite> site = inPlaceSite_;  // may close in its answer
   site->OnUIActivate();
   // In each answer the container may change its mind.
-  if (active_ && !core().window().hasFocus()) SetFocus(core().window().window());
+  if (active_ && core().inUse() && !core().window().hasFocus()) SetFocus(core().window().window());
   if (active_) nameActiveObject(this);
 }
 
@@ -118,13 +123,15 @@ void InPlacePart::deactivate() {
   removeBoxOwner(*this);
   core().window().destroy();
   const ComPointer<IOleInPlaceSite> site = std::exchange(inPlaceSite_, {});
-  frame_.reset();
-  document_.reset();
+  const ComPointer<IOleInPlaceFrame> frame = std::exchange(frame_, {});
+  const ComPointer<IOleInPlaceUIWindow> document = std::exchange(document_, {});
   if (site) site->OnInPlaceDeactivate();
+  core().viewChanged();  // whatever the window has shown meanwhile
 }
 
 void InPlacePart::windowLost() noexcept {
   active_ = false;
+  uiActive_ = false;
   removeBoxOwner(*this);
 }
 

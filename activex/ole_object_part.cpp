@@ -110,15 +110,14 @@ HRESULT OleObjectPart::GetExtent(DWORD aspect, SIZEL* himetric) {
 
 HRESULT OleObjectPart::Advise(IAdviseSink* sink, DWORD* connection) {
   if (connection == nullptr) return E_POINTER;
-  if (!advises_) {
-    const HRESULT made = CreateOleAdviseHolder(advises_.receive());
-    if (FAILED(made)) return made;
-  }
-  return advises_->Advise(sink, connection);
+  return entry([&] {
+    if (!advises_) check(CreateOleAdviseHolder(advises_.receive()));
+    return advises_->Advise(sink, connection);
+  });
 }
 
 HRESULT OleObjectPart::Unadvise(DWORD connection) {
-  return advises_ ? advises_->Unadvise(connection) : OLE_E_NOCONNECTION;
+  return entry([&] { return advises_ ? advises_->Unadvise(connection) : OLE_E_NOCONNECTION; });
 }
 
 HRESULT OleObjectPart::EnumAdvise(IEnumSTATDATA** advises) {
@@ -139,7 +138,7 @@ HRESULT OleObjectPart::GetControlInfo(CONTROLINFO* info) {
   info->hAccel = nullptr;
   info->cAccel = 0;
   info->dwFlags = core().window().hasFields() ? CTRLINFO_EATS_RETURN : 0;
-  return barrier([&] { accessKeys_.give(core().window().accessKeys(), *info); });
+  return entry([&] { accessKeys_.give(core().window().accessKeys(), *info); });
 }
 
 bool OleObjectPart::accessKeysOutdated() { return accessKeys_.outdated(core().window().accessKeys()); }
@@ -147,8 +146,7 @@ bool OleObjectPart::accessKeysOutdated() { return accessKeys_.outdated(core().wi
 // As the key in the panel: the focus goes to the labelled field, a button is clicked.
 HRESULT OleObjectPart::OnMnemonic(MSG* message) {
   if (message == nullptr) return E_POINTER;
-  const ComPointer<IUnknown> alive(core().outer());
-  return barrier([&] { core().window().accessKey(message->wParam); });
+  return entry([&] { core().window().accessKey(message->wParam); });
 }
 
 HRESULT OleObjectPart::OnAmbientPropertyChange(DISPID property) {

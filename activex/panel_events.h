@@ -44,6 +44,8 @@ class PanelEvents {
   // The graph's own menu, empty for none.
   [[nodiscard]] virtual std::vector<PanelMenuItem> contextMenu() = 0;
   virtual void contextMenuClick(std::int16_t id) = 0;
+  // What the user did has had its effect.
+  virtual void settled() = 0;
   // What the graph shows, in words, with places in pixels of the view; and what is told of it as it happens.
   [[nodiscard]] virtual GraphItems graphItems() = 0;
   [[nodiscard]] virtual GraphState graphState() = 0;

@@ -15,6 +15,7 @@
 #include "activex/printed_window.h"
 #include "activex/services.h"
 #include "framework/panel/fields_picture.h"
+#include "framework/support/flag_scope.h"
 #include "platform/control_names.h"
 #include "platform/win32/field_fonts.h"
 #include "platform/win32/win32_windowing.h"
@@ -198,12 +199,16 @@ void PanelWindow::draw(PictureGdi& gdi, HDC dc, const RECTL& bounds) {
   const DcHandle view = hdc();
   const Size size = clientSizePx();
   const Rect graph = events_->paintedAreaPx();
-  const PictureGdi::Picture picture(gdi, {dc, bounds, size, events_->surface(), {graph.left, graph.top}});
+  const PictureGdi::Picture picture(gdi,
+                                    {dc, bounds, size, view, events_->surface(), {graph.left, graph.top}});
   gdi.fillRect(view, {0, 0, size.width, size.height}, gdi.sysColorBrush(SystemColor::ButtonFace));
-  events_->paint();
+  {
+    const FlagScope drawing(drawing_);
+    events_->paint();
+  }
   if (controls_ == nullptr) return;
   const FieldFonts fonts(font_, dotsPerInch(metrics_));
-  paintFields(gdi, view, *controls_, size, metrics_, [&fonts](const Control& control) {
+  paintFields(gdi, view, *controls_, size, dotsPerInch(metrics_), [&fonts](const Control& control) {
     return FontHandle{reinterpret_cast<std::uintptr_t>(fonts.of(control))};
   });
 }
@@ -212,6 +217,7 @@ void PanelWindow::renderGraph(MemoryPicture& picture) {
   picture.create(events_ == nullptr ? clientSizePx() : events_->graphSizePx());
   if (events_ == nullptr) return;
   const HDC before = std::exchange(rendering_, picture.dc());
+  const FlagScope drawing(drawing_);
   const HRESULT painted = barrier([&] { events_->paint(); });
   rendering_ = before;
   check(painted);
@@ -252,8 +258,12 @@ void PanelWindow::visible(bool visible) {
 }
 
 void PanelWindow::refresh() {
-  if (window_ == nullptr) return owner_.viewChanged();
-  InvalidateRect(window_, nullptr, FALSE);
+  if (window_ != nullptr) InvalidateRect(window_, nullptr, FALSE);
+}
+
+void PanelWindow::painted() {
+  voice_.painted();
+  if (window_ == nullptr && !drawing_) owner_.viewChanged();
 }
 
 // --- Messages
@@ -270,6 +280,7 @@ LRESULT CALLBACK PanelWindow::windowProcedure(HWND window, UINT message, WPARAM 
   const HeldControl held(self->owner_);
   LRESULT result = 0;
   barrier([&] { result = self->handle(message, wParam, lParam); });
+  if (self->events_ != nullptr) barrier([&] { self->events_->settled(); });
   if (message == WM_NCDESTROY) {
     SetWindowLongPtrW(window, GWLP_USERDATA, 0);
     self->window_ = nullptr;
@@ -305,6 +316,7 @@ LRESULT PanelWindow::handle(UINT message, WPARAM wParam, LPARAM lParam) {
     case WM_THEMECHANGED:
       services().gdi.settingsChanged();
       if (events_ != nullptr && windowDC_ != nullptr) events_->resized();  // makes the picture anew
+      if (window_ == nullptr) return 0;  // a report may have let the host close
       RedrawWindow(window_, nullptr, nullptr, RDW_INVALIDATE | RDW_ALLCHILDREN);
       return DefWindowProcW(window_, message, wParam, lParam);
     case WM_SETFOCUS:
@@ -411,6 +423,7 @@ void PanelWindow::release(std::int16_t button, WPARAM keys, LPARAM position) {
 void PanelWindow::run(const std::function<void()>& body) noexcept {
   const HeldControl held(owner_);
   barrier(body);
+  if (events_ != nullptr) barrier([&] { events_->settled(); });
 }
 
 bool PanelWindow::translateKey(const MSG& message) {

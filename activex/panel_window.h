@@ -105,7 +105,7 @@ class PanelWindow final : public GraphView, private FieldsOwner {
   bool visible() override { return visible_; }
   void visible(bool visible) override;
   void refresh() override;
-  void painted() override { voice_.painted(); }
+  void painted() override;
 
  private:
   static LRESULT CALLBACK windowProcedure(HWND window, UINT message, WPARAM wParam, LPARAM lParam) noexcept;
@@ -149,6 +149,7 @@ class PanelWindow final : public GraphView, private FieldsOwner {
   Size memorySizePx_;
   MemoryPicture memory_;     // made when it is drawn on, so a panel that is always in a window has none
   HDC rendering_ = nullptr;  // stands in for the view while a picture is made
+  bool drawing_ = false;     // for somebody else, who knows
   MousePointer pointer_ = MousePointer::Default;
   bool visible_ = true;
 };

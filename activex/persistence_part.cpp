@@ -29,8 +29,10 @@ HRESULT PersistencePart::loading(Body body) {
 
 template <class Body>
 HRESULT PersistencePart::saving(Body body) {
-  const ControlCore::Saving quiet(core());
-  return reported(kWriting, entry(body));
+  return reported(kWriting, entry([&] {
+                    const ControlCore::Saving quiet(core());
+                    return body();
+                  }));
 }
 
 HRESULT PersistencePart::GetClassID(CLSID* id) {
@@ -122,6 +124,7 @@ HRESULT PersistencePart::Load(IStorage* storage) {
 // Stays dirty until the container says that the save is complete.
 HRESULT PersistencePart::Save(IStorage* storage, BOOL sameAsLoad) {
   if (storage == nullptr) return E_POINTER;
+  saved_ = Saved::Nothing;
   return saving([&] {
     ComPointer<IStream> stream;
     check(storage->CreateStream(kStreamName, STGM_CREATE | STGM_WRITE | STGM_SHARE_EXCLUSIVE, 0, 0,

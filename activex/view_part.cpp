@@ -1,5 +1,7 @@
 #include "activex/view_part.h"
 
+#include <utility>
+
 #include "activex/services.h"
 
 namespace frontpanels::activex {
@@ -29,11 +31,12 @@ HRESULT ViewPart::GetColorSet(DWORD, LONG, void*, DVTARGETDEVICE*, HDC, LOGPALET
 }
 
 HRESULT ViewPart::SetAdvise(DWORD aspects, DWORD flags, IAdviseSink* sink) {
-  aspects_ = aspects;
-  flags_ = flags;
-  sink_ = ComPointer<IAdviseSink>(sink);
-  if ((flags & ADVF_PRIMEFIRST) != 0) changed();
-  return S_OK;
+  return entry([&] {
+    aspects_ = aspects;
+    flags_ = flags;
+    const ComPointer<IAdviseSink> before = std::exchange(sink_, ComPointer<IAdviseSink>(sink));
+    if ((flags & ADVF_PRIMEFIRST) != 0) changed();
+  });
 }
 
 HRESULT ViewPart::GetAdvise(DWORD* aspects, DWORD* flags, IAdviseSink** sink) {

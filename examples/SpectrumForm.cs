@@ -50,7 +50,7 @@ public sealed class SpectrumForm : Form, ISpectrumViewEvents
     private const short CodeCenter = 13, CodeSpan = 14, OpClose = 1;
 
     private readonly SpectrumPanel panel = new SpectrumPanel { Dock = DockStyle.Fill };
-    private readonly Timer sweeps = new Timer { Interval = 100 };
+    private readonly System.Windows.Forms.Timer sweeps = new System.Windows.Forms.Timer { Interval = 100 };
     private readonly Random noise = new Random(1);
     private readonly object hub = Activator.CreateInstance(Type.GetTypeFromProgID("FrontPanels.DataHub", throwOnError: true));
     private double centerHz = 881.52e6, spanHz = 5e6;

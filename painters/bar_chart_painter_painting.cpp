@@ -296,8 +296,10 @@ void clsBarChartPainter::writeTexts(DcHandle dc) {
     for (const BarTextLayout::Placed& text : layout_.placed()) {
       if (text.inside != inside) continue;
       if (background && !inside && text.part > 0) gdi().fillRect(dc, text.cell, background);
-      const Color bar = kBarColors[colorOf(painted[text.bar])];
-      if (inside) gdi().setTextColor(dc, colors.textOn(colors.line(bar), kTextOnBar));
+      if (inside && colors.byScheme()) {
+        const Color bar = kBarColors[colorOf(painted[text.bar])];
+        gdi().setTextColor(dc, colors.textOn(colors.line(bar), kTextOnBar));
+      }
       gdi().textOut(dc, {text.cell.left, text.cell.top - airPx}, texts_[text.bar].parts[text.part]);
     }
   }

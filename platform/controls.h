@@ -36,6 +36,12 @@ struct ControlPlace {
   float heightTwips = 0;
   friend bool operator==(const ControlPlace&, const ControlPlace&) = default;
 };
+// Whole twips to pixels at a scale in dots per inch, rounded half away from zero.
+[[nodiscard]] constexpr std::int32_t pixelsOfTwips(float twips, std::int32_t dpi) noexcept {
+  constexpr std::int64_t kTwipsPerInch = 1440;
+  const std::int64_t dots = static_cast<std::int64_t>(twips) * dpi;
+  return static_cast<std::int32_t>((dots + (dots < 0 ? -kTwipsPerInch : kTwipsPerInch) / 2) / kTwipsPerInch);
+}
 
 // Whether the keyboard focus may rest on a kind, whether it shows a caption, and whether others lie in it.
 struct ControlFacets {

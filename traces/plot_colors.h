@@ -23,6 +23,8 @@ class PlotColors {
   // `gdi` must outlive the colours.
   explicit PlotColors(Gdi& gdi) : gdi_(gdi), highContrast_(gdi.highContrast()) {}
 
+  // Whether the scheme's colours hold instead of the painters' own.
+  [[nodiscard]] bool byScheme() const noexcept { return highContrast_; }
   [[nodiscard]] Color background() const { return gdi_.sysColor(backgroundName()); }
   [[nodiscard]] BrushHandle backgroundBrush() const { return gdi_.sysColorBrush(backgroundName()); }
   // Of labels, borders and whatever else is written.

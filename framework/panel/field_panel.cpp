@@ -96,7 +96,6 @@ void FieldPanel::refreshTraces() {
         [this] {
           if (!view().visible()) return;
           base_.traceManager().paintTraces(true);
-          if (!view().hwnd()) view().refresh();  // what is shown elsewhere is no longer what there is
           tracesRefreshed();
         });
 }

@@ -4,7 +4,6 @@
 #include <string>
 #include <string_view>
 
-#include "framework/support/numeric.h"
 #include "platform/gdi_scope.h"
 
 namespace frontpanels {
@@ -41,8 +40,8 @@ std::string shownText(std::string_view caption) {
 
 class FieldsPicture {
  public:
-  FieldsPicture(Gdi& gdi, DcHandle dc, Size viewPx, const ScreenMetrics& metrics, const FieldFont& fontOf)
-      : gdi_(gdi), dc_(dc), view_{0, 0, viewPx.width, viewPx.height}, metrics_(metrics), fontOf_(fontOf) {}
+  FieldsPicture(Gdi& gdi, DcHandle dc, Size viewPx, std::int32_t dpi, const FieldFont& fontOf)
+      : gdi_(gdi), dc_(dc), view_{0, 0, viewPx.width, viewPx.height}, dpi_(dpi), fontOf_(fontOf) {}
 
   void paint(const Control& control);
 
@@ -53,9 +52,6 @@ class FieldsPicture {
   };
   enum class Align : std::uint8_t { Left, Middle };
 
-  [[nodiscard]] std::int32_t px(float twips, float twipsPerPixel) const {
-    return toInt32(twips / twipsPerPixel);
-  }
   [[nodiscard]] Place placeOf(const Control& control) const;
   void fill(Rect rect, SystemColor color) { gdi_.fillRect(dc_, rect, gdi_.sysColorBrush(color)); }
   void line(std::initializer_list<Point> points, SystemColor color);
@@ -72,19 +68,23 @@ class FieldsPicture {
   Gdi& gdi_;
   DcHandle dc_;
   Rect view_;
-  const ScreenMetrics& metrics_;
+  std::int32_t dpi_;
   const FieldFont& fontOf_;
 };
 
+// As the windows: frames hold none, so that places within them add up in twips; an area has whole pixels.
 FieldsPicture::Place FieldsPicture::placeOf(const Control& control) const {
-  const ControlPlace& own = control.place();
-  const Control* const parent = control.parent();
-  const Place around = parent == nullptr ? Place{{}, view_} : placeOf(*parent);
-  const float x = metrics_.twipsPerPixelX;
-  const float y = metrics_.twipsPerPixelY;
-  const Rect all{around.all.left + px(own.leftTwips, x), around.all.top + px(own.topTwips, y),
-                 around.all.left + px(own.leftTwips + own.widthTwips, x),
-                 around.all.top + px(own.topTwips + own.heightTwips, y)};
+  ControlPlace place = control.place();
+  const Control* area = control.parent();
+  for (; area != nullptr && area->kind() != ControlKind::Picture; area = area->parent()) {
+    place.leftTwips += area->place().leftTwips;
+    place.topTwips += area->place().topTwips;
+  }
+  const Place around = area == nullptr ? Place{{}, view_} : placeOf(*area);
+  const Rect all{around.all.left + pixelsOfTwips(place.leftTwips, dpi_),
+                 around.all.top + pixelsOfTwips(place.topTwips, dpi_),
+                 around.all.left + pixelsOfTwips(place.leftTwips + place.widthTwips, dpi_),
+                 around.all.top + pixelsOfTwips(place.topTwips + place.heightTwips, dpi_)};
   const bool cutsOff = control.kind() == ControlKind::Picture;
   return {all, cutsOff ? common(all, around.shown) : around.shown};
 }
@@ -242,9 +242,9 @@ void FieldsPicture::paint(const Control& control) {
 
 }  // namespace
 
-void paintFields(Gdi& gdi, DcHandle dc, const ControlSet& controls, Size viewPx, const ScreenMetrics& metrics,
+void paintFields(Gdi& gdi, DcHandle dc, const ControlSet& controls, Size viewPx, std::int32_t dpi,
                  const FieldFont& fontOf) {
-  FieldsPicture picture(gdi, dc, viewPx, metrics, fontOf);
+  FieldsPicture picture(gdi, dc, viewPx, dpi, fontOf);
   for (const std::unique_ptr<Control>& control : controls.controls())
     if (control->reallyVisible()) picture.paint(*control);
 }

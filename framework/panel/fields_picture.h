@@ -6,16 +6,14 @@
 #include <functional>
 
 #include "platform/control_set.h"
-#include "platform/windowing.h"
 
 namespace frontpanels {
 
 // The font of a field is its owner's.
 using FieldFont = std::function<FontHandle(const Control&)>;
 
-// Draws the controls of the set that are to be seen in a view of this size, places scaled to pixels of the
-// context.
-void paintFields(Gdi& gdi, DcHandle dc, const ControlSet& controls, Size viewPx, const ScreenMetrics& metrics,
+// Draws the controls of the set that are to be seen in a view of this size, places scaled to dots an inch.
+void paintFields(Gdi& gdi, DcHandle dc, const ControlSet& controls, Size viewPx, std::int32_t dpi,
                  const FieldFont& fontOf);
 
 }  // namespace frontpanels

@@ -1,5 +1,6 @@
 #include "platform/win32/picture_gdi.h"
 
+#include <algorithm>
 #include <cmath>
 #include <cstdint>
 #include <new>
@@ -14,15 +15,8 @@ namespace {
 HDC native(DcHandle dc) { return reinterpret_cast<HDC>(dc.value); }
 HBRUSH native(BrushHandle brush) { return reinterpret_cast<HBRUSH>(brush.value); }
 
-// The edge of a pixel on an axis of `viewPx` pixels that is drawn `length` units long.
-LONG edgeAt(LONG first, LONG length, std::int32_t px, std::int32_t viewPx) {
-  return first + static_cast<LONG>(std::floor(0.5 + static_cast<double>(px) * length / viewPx));
-}
-
-// The middle of a pixel: lines run there. At the view's own scale it is the pixel itself.
-LONG middleAt(LONG first, LONG length, std::int32_t px, std::int32_t viewPx) {
-  return first + static_cast<LONG>(std::floor((px + 0.5) * length / viewPx));
-}
+// 16-bit metafiles have 16 bits; of others' 32 the systems before the current ones used 27.
+double farthestOf(HDC dc) { return GetObjectType(dc) == OBJ_METADC ? 32767.0 : 134217727.0; }
 
 // What an object of a context is made of; all of it zero where the context does not say.
 template <class Description>
@@ -54,7 +48,11 @@ bool alike(const LOGFONTW& a, const LOGFONTW& b) {
 }  // namespace
 
 PictureGdi::Picture::Picture(PictureGdi& gdi, const PictureTarget& target)
-    : gdi_(gdi), outer_(gdi.picture_), target_(target), saved_(SaveDC(target.dc)) {
+    : gdi_(gdi),
+      outer_(gdi.picture_),
+      target_(target),
+      saved_(SaveDC(target.dc)),
+      farthest_(farthestOf(target.dc)) {
   SetTextAlign(target_.dc, TA_LEFT | TA_TOP | TA_NOUPDATECP);
   const RECTL& bounds = target_.bounds;
   IntersectClipRect(target_.dc, static_cast<int>(bounds.left), static_cast<int>(bounds.top),
@@ -66,26 +64,39 @@ PictureGdi::Picture::~Picture() {
   gdi_.picture_ = outer_;
   if (clipped_) RestoreDC(target_.dc, -1);
   if (saved_ != 0) RestoreDC(target_.dc, -1);
-  if (pen_ != nullptr) DeleteObject(pen_);
-  if (font_ != nullptr) DeleteObject(font_);
+  for (HGDIOBJ const object : made_) DeleteObject(object);
+}
+
+LONG PictureGdi::Picture::Axis::edgeOf(std::int32_t px) const {
+  return within(std::floor(first + 0.5 + static_cast<double>(px) * length / viewPx));
+}
+
+// At the view's own scale it is the pixel itself.
+LONG PictureGdi::Picture::Axis::middleOf(std::int32_t px) const {
+  return within(std::floor(first + (px + 0.5) * length / viewPx));
+}
+
+LONG PictureGdi::Picture::Axis::within(double coordinate) const {
+  return static_cast<LONG>(std::clamp(coordinate, -farthest, farthest));
+}
+
+PictureGdi::Picture::Axis PictureGdi::Picture::across() const {
+  return {target_.bounds.left, target_.bounds.right - target_.bounds.left, target_.viewPx.width, farthest_};
+}
+
+PictureGdi::Picture::Axis PictureGdi::Picture::down() const {
+  return {target_.bounds.top, target_.bounds.bottom - target_.bounds.top, target_.viewPx.height, farthest_};
 }
 
 POINT PictureGdi::Picture::at(DcHandle dc, Point point) const {
   const Point origin = dc == target_.surface ? target_.surfaceOriginPx : Point{};
-  const RECTL& bounds = target_.bounds;
-  return {middleAt(bounds.left, bounds.right - bounds.left, point.x + origin.x, target_.viewPx.width),
-          middleAt(bounds.top, bounds.bottom - bounds.top, point.y + origin.y, target_.viewPx.height)};
+  return {across().middleOf(point.x + origin.x), down().middleOf(point.y + origin.y)};
 }
 
 RECT PictureGdi::Picture::at(DcHandle dc, Rect rect) const {
   const Point origin = dc == target_.surface ? target_.surfaceOriginPx : Point{};
-  const RECTL& bounds = target_.bounds;
-  const LONG width = bounds.right - bounds.left;
-  const LONG height = bounds.bottom - bounds.top;
-  return {edgeAt(bounds.left, width, rect.left + origin.x, target_.viewPx.width),
-          edgeAt(bounds.top, height, rect.top + origin.y, target_.viewPx.height),
-          edgeAt(bounds.left, width, rect.right + origin.x, target_.viewPx.width),
-          edgeAt(bounds.top, height, rect.bottom + origin.y, target_.viewPx.height)};
+  return {across().edgeOf(rect.left + origin.x), down().edgeOf(rect.top + origin.y),
+          across().edgeOf(rect.right + origin.x), down().edgeOf(rect.bottom + origin.y)};
 }
 
 int PictureGdi::Picture::length(int px) const {
@@ -124,21 +135,25 @@ void PictureGdi::Picture::takePen(const LOGPEN& pen) {
   } else {
     made = CreatePen(static_cast<int>(pen.lopnStyle), dashed ? 1 : width, pen.lopnColor);
   }
-  if (made == nullptr) return;
-  SelectObject(target_.dc, made);
-  if (pen_ != nullptr) DeleteObject(pen_);
-  pen_ = made;
+  select(made);
 }
 
 void PictureGdi::Picture::takeFont(const LOGFONTW& font) {
   LOGFONTW wanted = font;
-  const int height = length(static_cast<int>(std::abs(font.lfHeight)));
+  // A height of 0 would stand for the usual one.
+  const int height = std::max(length(static_cast<int>(std::abs(font.lfHeight))), 1);
   wanted.lfHeight = font.lfHeight < 0 ? -height : height;
-  const HFONT made = CreateFontIndirectW(&wanted);
+  select(CreateFontIndirectW(&wanted));
+}
+
+// Without room to remember it the object before stays.
+void PictureGdi::Picture::select(HGDIOBJ made) {
   if (made == nullptr) return;
+  if (!drawn([&] { return made_.push_back(made), true; })) {
+    DeleteObject(made);
+    return;
+  }
   SelectObject(target_.dc, made);
-  if (font_ != nullptr) DeleteObject(font_);
-  font_ = made;
 }
 
 // Within a saved state: a picture's own clip is never widened, and a metafile records it where it is replayed
@@ -200,51 +215,57 @@ bool PictureGdi::Picture::textOut(DcHandle dc, Point topLeft, std::string_view t
 // --- The seam
 
 bool PictureGdi::selectClipRgn(DcHandle dc, RegionHandle region) {
-  if (picture_ != nullptr) picture_->clip(dc, region);
+  if (Picture* const picture = pictureOf(dc)) picture->clip(dc, region);
   return Win32Gdi::selectClipRgn(dc, region);
 }
 
 bool PictureGdi::fillRect(DcHandle dc, Rect rect, BrushHandle brush) {
-  if (picture_ == nullptr) return Win32Gdi::fillRect(dc, rect, brush);
-  picture_->takeOver(dc);  // a hatched brush leaves gaps in the background's colour
-  const RECT area = picture_->at(dc, rect);
-  return FillRect(picture_->target_.dc, &area, native(brush)) != 0;
+  Picture* const picture = pictureOf(dc);
+  if (picture == nullptr) return Win32Gdi::fillRect(dc, rect, brush);
+  picture->takeOver(dc);  // a hatched brush leaves gaps in the background's colour
+  const RECT area = picture->at(dc, rect);
+  return FillRect(picture->target_.dc, &area, native(brush)) != 0;
 }
 
 bool PictureGdi::moveTo(DcHandle dc, Point to) {
-  if (picture_ == nullptr) return Win32Gdi::moveTo(dc, to);
-  const POINT at = picture_->at(dc, to);
-  return MoveToEx(picture_->target_.dc, at.x, at.y, nullptr) != 0;
+  Picture* const picture = pictureOf(dc);
+  if (picture == nullptr) return Win32Gdi::moveTo(dc, to);
+  const POINT at = picture->at(dc, to);
+  return MoveToEx(picture->target_.dc, at.x, at.y, nullptr) != 0;
 }
 
 bool PictureGdi::lineTo(DcHandle dc, Point to) {
-  if (picture_ == nullptr) return Win32Gdi::lineTo(dc, to);
-  picture_->takeOver(dc);
-  const POINT at = picture_->at(dc, to);
-  return LineTo(picture_->target_.dc, at.x, at.y) != 0;
+  Picture* const picture = pictureOf(dc);
+  if (picture == nullptr) return Win32Gdi::lineTo(dc, to);
+  picture->takeOver(dc);
+  const POINT at = picture->at(dc, to);
+  return LineTo(picture->target_.dc, at.x, at.y) != 0;
 }
 
 bool PictureGdi::polyline(DcHandle dc, std::span<const Point> points) {
-  if (picture_ == nullptr) return Win32Gdi::polyline(dc, points);
-  picture_->takeOver(dc);
-  return drawn([&] { return picture_->polyline(dc, points); });
+  Picture* const picture = pictureOf(dc);
+  if (picture == nullptr) return Win32Gdi::polyline(dc, points);
+  picture->takeOver(dc);
+  return drawn([&] { return picture->polyline(dc, points); });
 }
 
 bool PictureGdi::drawEdge(DcHandle dc, Rect rect, std::uint32_t edge, std::uint32_t sides) {
-  if (picture_ == nullptr) return Win32Gdi::drawEdge(dc, rect, edge, sides);
-  picture_->edge(dc, rect, edge);
+  Picture* const picture = pictureOf(dc);
+  if (picture == nullptr) return Win32Gdi::drawEdge(dc, rect, edge, sides);
+  picture->edge(dc, rect, edge);
   return true;
 }
 
 bool PictureGdi::textOut(DcHandle dc, Point topLeft, std::string_view text) {
-  if (picture_ == nullptr) return Win32Gdi::textOut(dc, topLeft, text);
-  picture_->takeOver(dc);
-  return drawn([&] { return picture_->textOut(dc, topLeft, text); });
+  Picture* const picture = pictureOf(dc);
+  if (picture == nullptr) return Win32Gdi::textOut(dc, topLeft, text);
+  picture->takeOver(dc);
+  return drawn([&] { return picture->textOut(dc, topLeft, text); });
 }
 
 // The surface is nowhere but in the picture already.
 bool PictureGdi::bitBlt(DcHandle to, Rect destination, DcHandle from, Point source, RasterOp operation) {
-  if (picture_ == nullptr) return Win32Gdi::bitBlt(to, destination, from, source, operation);
+  if (pictureOf(to) == nullptr) return Win32Gdi::bitBlt(to, destination, from, source, operation);
   return true;
 }
 

@@ -17,6 +17,7 @@ struct PictureTarget {
   HDC dc = nullptr;
   RECTL bounds{};         // logical coordinates of the context; either axis may run backwards
   Size viewPx;            // what the bounds show
+  DcHandle view;          // the panel's own context
   DcHandle surface;       // the graph's off-screen surface
   Point surfaceOriginPx;  // its place in the view
 };
@@ -44,11 +45,28 @@ class PictureGdi final : public Win32Gdi {
       int operation = 0;
     };
 
+    // Of the panel that is pictured: another one may be painting meanwhile.
+    [[nodiscard]] bool shows(DcHandle dc) const { return dc == target_.view || dc == target_.surface; }
+    // An axis of `viewPx` pixels that is drawn `length` units long. Traces reach far beyond it.
+    struct Axis {
+      LONG first;
+      LONG length;
+      std::int32_t viewPx;
+      double farthest;
+
+      [[nodiscard]] LONG edgeOf(std::int32_t px) const;
+      [[nodiscard]] LONG middleOf(std::int32_t px) const;  // where a line runs
+      [[nodiscard]] LONG within(double coordinate) const;
+    };
+
+    [[nodiscard]] Axis across() const;
+    [[nodiscard]] Axis down() const;
     [[nodiscard]] POINT at(DcHandle dc, Point point) const;
     [[nodiscard]] RECT at(DcHandle dc, Rect rect) const;
     // Lengths that are as long both ways: of pens and edges.
     [[nodiscard]] int length(int px) const;
     void takeOver(DcHandle dc);
+    void select(HGDIOBJ made);
     void takePen(const LOGPEN& pen);
     void takeFont(const LOGFONTW& font);
     void clip(DcHandle dc, RegionHandle region);
@@ -63,8 +81,8 @@ class PictureGdi final : public Win32Gdi {
     bool clipped_ = false;
     bool known_ = false;  // whether the context has the state
     State state_;
-    HPEN pen_ = nullptr;
-    HFONT font_ = nullptr;
+    double farthest_;            // coordinate that the context can hold
+    std::vector<HGDIOBJ> made_;  // pens and fonts; a saved state may have any of them
     std::vector<POINT> points_;
   };
 
@@ -78,6 +96,11 @@ class PictureGdi final : public Win32Gdi {
   bool bitBlt(DcHandle to, Rect destination, DcHandle from, Point source, RasterOp operation) override;
 
  private:
+  // The open picture that a call goes to; null for none.
+  [[nodiscard]] Picture* pictureOf(DcHandle dc) const noexcept {
+    return picture_ != nullptr && picture_->shows(dc) ? picture_ : nullptr;
+  }
+
   Picture* picture_ = nullptr;
 };
 

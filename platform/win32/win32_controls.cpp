@@ -16,10 +16,7 @@
 namespace frontpanels {
 namespace {
 
-constexpr int kTwipsPerInch = 1440;
 constexpr int kUsualDpi = 96;
-
-int pixels(float twips, int dpi) { return MulDiv(static_cast<int>(twips), dpi, kTwipsPerInch); }
 
 // Windows stand in the nearest picture; frames are drawn round their controls and hold no windows.
 const Control* areaOf(const Control& control) {
@@ -166,8 +163,9 @@ RECT FieldWindows::placeOf(const Control& control) const {
     place.leftTwips += frame->place().leftTwips;
     place.topTwips += frame->place().topTwips;
   }
-  return {pixels(place.leftTwips, dpi_), pixels(place.topTwips, dpi_),
-          pixels(place.leftTwips + place.widthTwips, dpi_), pixels(place.topTwips + place.heightTwips, dpi_)};
+  return {pixelsOfTwips(place.leftTwips, dpi_), pixelsOfTwips(place.topTwips, dpi_),
+          pixelsOfTwips(place.leftTwips + place.widthTwips, dpi_),
+          pixelsOfTwips(place.topTwips + place.heightTwips, dpi_)};
 }
 
 void FieldWindows::arrange() {

@@ -471,18 +471,18 @@ HRESULT drawsIntoAMetafile(Stage& s) {
   return FAILED(answer) ? answer : yes(pixels > 100);
 }
 
-// Whoever offers its picture as data has it as a metafile.
 HRESULT givesData(Stage& s) {
   const auto data = s.as<IDataObject>();
-  if (!data) return S_OK;
-  FORMATETC format{CF_ENHMETAFILE, nullptr, DVASPECT_CONTENT, -1, TYMED_ENHMF};
-  if (data->QueryGetData(&format) != S_OK)
-    format = {CF_METAFILEPICT, nullptr, DVASPECT_CONTENT, -1, TYMED_MFPICT};
-  STGMEDIUM medium{};
-  const HRESULT answer = data->GetData(&format, &medium);
-  if (SUCCEEDED(answer)) ReleaseStgMedium(&medium);
+  if (!data) return E_NOINTERFACE;
+  for (FORMATETC format : {FORMATETC{CF_ENHMETAFILE, nullptr, DVASPECT_CONTENT, -1, TYMED_ENHMF},
+                           FORMATETC{CF_METAFILEPICT, nullptr, DVASPECT_CONTENT, -1, TYMED_MFPICT}}) {
+    STGMEDIUM medium{};
+    const HRESULT answer = data->GetData(&format, &medium);
+    if (FAILED(answer)) return answer;
+    ReleaseStgMedium(&medium);
+  }
   FORMATETC strange{CF_WAVE, nullptr, DVASPECT_CONTENT, -1, TYMED_HGLOBAL};
-  return FAILED(answer) ? answer : yes(FAILED(data->QueryGetData(&strange)));
+  return yes(FAILED(data->QueryGetData(&strange)));
 }
 
 const Step kOffice[] = {

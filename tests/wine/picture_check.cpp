@@ -148,6 +148,12 @@ void recordsIntoMetafiles() {
   PlayEnhMetaFile(replayed.dc(), enhanced.hEnhMetaFile, &all);
   replayed.keep("enhanced");
   expect(replayed.pixels(kTraceColor) > kViewPx.cx / 4, "which replays");
+  ENHMETAHEADER header{};
+  GetEnhMetaFileHeader(enhanced.hEnhMetaFile, sizeof header, &header);
+  const LONG rightMm100 =
+      MulDiv(static_cast<int>(header.rclBounds.right), 100 * static_cast<int>(header.szlMillimeters.cx),
+             static_cast<int>(header.szlDevice.cx));
+  expect(rightMm100 > header.rclFrame.right - 60, "and fills its frame, whatever the screen's size in mm");
   const Canvas part(kViewPx);
   const RECT bounds{200, 100, 700, 450};
   PlayEnhMetaFile(part.dc(), enhanced.hEnhMetaFile, &bounds);
@@ -171,6 +177,28 @@ void recordsIntoMetafiles() {
   RestoreDC(older.dc(), -1);
   older.keep("plain");
   expect(older.pixels(kTraceColor) > kViewPx.cx / 4, "and replays as well");
+  GlobalUnlock(plain.hMetaFilePict);
+  ReleaseStgMedium(&plain);
+}
+
+// 40,000 himetric do not fit into the 16 bits of the older kind.
+void recordsLargePictures() {
+  Hosted panel;
+  SIZEL extent{40000, 20000};
+  panel.object->SetExtent(DVASPECT_CONTENT, &extent);
+  publish(carrier());
+  STGMEDIUM plain = dataOf(panel, CF_METAFILEPICT, TYMED_MFPICT);
+  const auto* const picture = static_cast<const METAFILEPICT*>(GlobalLock(plain.hMetaFilePict));
+  const Canvas canvas(kViewPx);
+  SetMapMode(canvas.dc(), MM_ANISOTROPIC);
+  SetViewportExtEx(canvas.dc(), kViewPx.cx, kViewPx.cy, nullptr);
+  PlayMetaFile(canvas.dc(), picture->hMF);
+  SetMapMode(canvas.dc(), MM_TEXT);
+  SetWindowOrgEx(canvas.dc(), 0, 0, nullptr);
+  SetViewportOrgEx(canvas.dc(), 0, 0, nullptr);
+  expect(picture->xExt == 40000, "a large picture says how large it is");
+  expect(canvas.pixels(GetSysColor(COLOR_WINDOW), {kViewPx.cx * 3 / 4, 0, kViewPx.cx, kViewPx.cy}) > 500,
+         "and has its fields at its right edge");
   GlobalUnlock(plain.hMetaFilePict);
   ReleaseStgMedium(&plain);
 }
@@ -233,10 +261,17 @@ void tellsOnlookers(HWND window) {
     panel.object.query<IDataObject>()->DAdvise(&format, ADVF_NODATA, &onlooker, &connection);
     publish(carrier());
     expect(onlooker.views > 1 && onlooker.data > 0, "and that an inactive panel has got a sweep");
+    const int swept = onlooker.views;
+    panel.call(L"addMarker");
+    expect(onlooker.views > swept, "and a marker");
+    const auto stored = panel.object.query<IPersistStreamInit>();
+    panel.call(L"PopUp_Click", {0, 900});
+    expect(stored->IsDirty() == S_OK && panel.call(L"DisplayPanelVisible").number() == 0,
+           "an area that the menu hides is to be stored");
     const int before = onlooker.views;
     ComPointer<IStream> stream;
     CreateStreamOnHGlobal(nullptr, TRUE, stream.receive());
-    panel.object.query<IPersistStreamInit>()->Save(stream.get(), TRUE);
+    stored->Save(stream.get(), TRUE);
     expect(onlooker.views == before, "but not while it is saved");
     panel.verb(OLEIVERB_INPLACEACTIVATE);
     const int active = onlooker.views;
@@ -318,14 +353,14 @@ void takesItsSize() {
 // --- Scales of screens
 
 // A program tells one screen from another; its window says which scale is wanted.
-void followsItsWindowsScale(const Desk& desk) {
+void followsItsWindowsScale() {
   using SetAwareness = HANDLE(WINAPI*)(HANDLE);
   const auto setAwareness = reinterpret_cast<SetAwareness>(reinterpret_cast<void*>(
       GetProcAddress(GetModuleHandleW(L"user32.dll"), "SetThreadDpiAwarenessContext")));
   if (setAwareness == nullptr || Shown::dpi() == 96) return;
   const auto unaware = reinterpret_cast<HANDLE>(-1);
   Hosted plain;
-  const auto atScreenScale = static_cast<float>(plain.call(L"ViewScaleWidth").number());
+  const int atScreenScale = plain.call(L"ViewScaleWidth").number();
   const HANDLE before = setAwareness(unaware);
   const HWND parent = CreateWindowExW(0, L"STATIC", L"", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 0, 0, 700, 500,
                                       nullptr, nullptr, nullptr, nullptr);
@@ -340,7 +375,7 @@ void followsItsWindowsScale(const Desk& desk) {
   }
   DestroyWindow(parent);
   setAwareness(before);
-  expect(atScreenScale > 0 && IsWindow(desk.window), "and the others keep theirs");
+  expect(plain.call(L"ViewScaleWidth").number() == atScreenScale, "and the others keep theirs");
 }
 
 }  // namespace
@@ -352,13 +387,14 @@ int check() {
       drawsAtItsOwnScale();
       drawsAtOtherScales();
       recordsIntoMetafiles();
+      recordsLargePictures();
       saysWhatDataItHas();
       tellsOnlookers(desk.window);
       chapter("places");
       takesItsClip(desk.window);
       asksForItsPlace(desk.window);
       takesItsSize();
-      followsItsWindowsScale(desk);
+      followsItsWindowsScale();
     });
   });
 }

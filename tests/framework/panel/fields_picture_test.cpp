@@ -32,7 +32,7 @@ class FieldsPictureTest : public ::testing::Test {
   }
   void paint(Size viewPx = {400, 300}) {
     gdi.clear();
-    paintFields(gdi, gdi.viewDc(), set, viewPx, {15, 15}, [this](const Control&) { return font; });
+    paintFields(gdi, gdi.viewDc(), set, viewPx, 96, [this](const Control&) { return font; });
   }
   [[nodiscard]] const Call* textOf(std::string_view text) {
     texts = gdi.texts();
