@@ -4,6 +4,7 @@
 #include <optional>
 #include <utility>
 
+#include "activex/enumerators.h"
 #include "activex/variants.h"
 
 namespace frontpanels::activex {
@@ -108,62 +109,31 @@ LONG stateOf(HWND window) {
          (IsWindowEnabled(window) != FALSE ? 0 : STATE_SYSTEM_UNAVAILABLE);
 }
 
-// An enumeration apart from the object's own.
-class Children final : public IEnumVARIANT {
- public:
-  Children(std::vector<LONG> numbers, ComPointer<IAccessible> graph, std::size_t next = 0)
-      : numbers_(std::move(numbers)), graph_(std::move(graph)), next_(next) {}
-  virtual ~Children() = default;
-
-  HRESULT STDMETHODCALLTYPE QueryInterface(REFIID id, void** object) override {
-    if (object == nullptr) return E_POINTER;
-    *object = id == IID_IUnknown || id == IID_IEnumVARIANT ? this : nullptr;
-    if (*object == nullptr) return E_NOINTERFACE;
-    return AddRef(), S_OK;
-  }
-  ULONG STDMETHODCALLTYPE AddRef() override { return ++references_; }
-  ULONG STDMETHODCALLTYPE Release() override {
-    const ULONG left = --references_;
-    if (left == 0) delete this;
-    return left;
-  }
-  HRESULT STDMETHODCALLTYPE Next(ULONG count, VARIANT* items, ULONG* fetched) override {
-    if (items == nullptr || (fetched == nullptr && count != 1)) return E_POINTER;
-    ULONG given = 0;
-    for (; given < count && next_ < numbers_.size(); ++given) items[given] = hand(numbers_[next_++]);
-    if (fetched != nullptr) *fetched = given;
-    return given == count ? S_OK : S_FALSE;
-  }
-  HRESULT STDMETHODCALLTYPE Skip(ULONG count) override {
-    const std::size_t left = numbers_.size() - next_;
-    next_ += std::min<std::size_t>(count, left);
-    return count <= left ? S_OK : S_FALSE;
-  }
-  HRESULT STDMETHODCALLTYPE Reset() override { return next_ = 0, S_OK; }
-  HRESULT STDMETHODCALLTYPE Clone(IEnumVARIANT** copy) override {
-    if (copy == nullptr) return E_POINTER;
-    *copy = nullptr;
-    return barrier([&] { *copy = new Children(numbers_, graph_, next_); });
-  }
-
- private:
+// Enumerations apart from the object's own.
+struct ChildTraits {
+  struct Item {
+    ComPointer<IAccessible> graph;
+    LONG number = 0;
+  };
+  using Handed = VARIANT;
   // A window's number is given as its object. A child that has gone meanwhile keeps its number.
-  [[nodiscard]] VARIANT hand(LONG number) const {
-    VARIANT child = numbered(number);
+  static Handed hand(const Item& item) {
+    VARIANT child = numbered(item.number);
     IDispatch* object = nullptr;
-    if (graph_->get_accChild(child, &object) == S_OK && object != nullptr) {
+    if (item.graph->get_accChild(child, &object) == S_OK && object != nullptr) {
       V_VT(&child) = VT_DISPATCH;
       V_DISPATCH(&child) = object;
     }
     return child;
   }
-
-  ModuleLock lock_;
-  std::atomic<ULONG> references_ = 1;
-  std::vector<LONG> numbers_;
-  ComPointer<IAccessible> graph_;
-  std::size_t next_;
 };
+using Children = Enumerator<IEnumVARIANT, ChildTraits>;
+
+std::vector<ChildTraits::Item> childrenOf(AccessibleGraph& graph, const std::vector<LONG>& numbers) {
+  std::vector<ChildTraits::Item> items;
+  for (const LONG number : numbers) items.push_back({ComPointer<IAccessible>(&graph), number});
+  return items;
+}
 
 std::vector<LONG> selectedNumbers(const std::vector<GraphItem>& items) {
   std::vector<LONG> numbers;
@@ -342,7 +312,7 @@ HRESULT AccessibleGraph::Clone(IEnumVARIANT** copy) {
     std::vector<LONG> numbers(static_cast<std::size_t>(countOfChildren(teller)));
     for (std::size_t i = 0; i < numbers.size(); ++i) numbers[i] = static_cast<LONG>(i) + 1;
     const auto next = std::min(static_cast<std::size_t>(next_), numbers.size());
-    *copy = new Children(std::move(numbers), ComPointer<IAccessible>(this), next);
+    *copy = new Children(childrenOf(*this, numbers), next);
     return S_OK;
   });
 }
@@ -363,10 +333,10 @@ HRESULT AccessibleGraph::get_accSelection(VARIANT* children) {
   if (children == nullptr) return E_POINTER;
   VariantInit(children);
   return ask([&](GraphTeller& teller) -> HRESULT {
-    std::vector<LONG> numbers = selectedNumbers(teller.items());
+    const std::vector<LONG> numbers = selectedNumbers(teller.items());
     if (numbers.empty()) return S_FALSE;
     if (numbers.size() == 1) return *children = numbered(numbers.front()), S_OK;
-    V_UNKNOWN(children) = new Children(std::move(numbers), ComPointer<IAccessible>(this));
+    V_UNKNOWN(children) = new Children(childrenOf(*this, numbers));
     V_VT(children) = VT_UNKNOWN;
     return S_OK;
   });

@@ -89,27 +89,8 @@ TEST(StoredValuesTest, StreamsOfOtherVersionsAreReadAndDamagedOnesRefused) {
     EXPECT_EQ(valuesIn(whole.substr(0, length)), std::nullopt) << length;
 }
 
-// Knows texts only, as a page does.
-class TextBag final : public testing::Counted<IPropertyBag> {
- public:
-  std::map<std::wstring, std::wstring> texts;
-  HRESULT STDMETHODCALLTYPE Read(LPCOLESTR name, VARIANT* value, IErrorLog*) override {
-    if (texts.count(name) == 0) return E_INVALIDARG;
-    V_VT(value) = VT_BSTR;
-    V_BSTR(value) = SysAllocString(texts[name].c_str());
-    return S_OK;
-  }
-  HRESULT STDMETHODCALLTYPE Write(LPCOLESTR name, VARIANT* value) override {
-    texts[name] = V_VT(value) == VT_BSTR ? V_BSTR(value) : V_BOOL(value) ? L"-1" : L"0";
-    return S_OK;
-  }
-
- protected:
-  void* find(REFIID id) override { return id == IID_IUnknown || id == IID_IPropertyBag ? this : nullptr; }
-};
-
 TEST(StoredValuesTest, ComeBackFromABag) {
-  TextBag bag;
+  testing::TextBag bag;
   writeStored(bag, kProperties, kUsual, false);
   EXPECT_TRUE(bag.texts.empty());
   EXPECT_EQ(readStored(bag, nullptr, kProperties), kUsual);
