@@ -326,6 +326,54 @@ void losesItsWindow(const Desk&) {
          "and the container hears of it");
 }
 
+// A container that lets go while it is asked for the place of the new window.
+class Wavering final : public FullContainer {
+ public:
+  using FullContainer::FullContainer;
+  std::function<void()> during;
+  HRESULT STDMETHODCALLTYPE GetWindowContext(IOleInPlaceFrame** frame, IOleInPlaceUIWindow** document,
+                                             LPRECT area, LPRECT clip, LPOLEINPLACEFRAMEINFO info) override {
+    if (during) during();
+    return FullContainer::GetWindowContext(frame, document, area, clip, info);
+  }
+};
+
+void leavesNoHalfState(const Desk& desk) {
+  Wavering wavering(desk.window);
+  Hosted hosted;
+  hosted.object->SetClientSite(&wavering);
+  wavering.during = [&] { hosted.inPlace->InPlaceDeactivate(); };
+  expect(FAILED(hosted.verb(OLEIVERB_UIACTIVATE)) && hosted.window() == nullptr &&
+             wavering.count("OnInPlaceDeactivate") == 1 && wavering.count("OnUIActivate") == 0,
+         "an activation that the container takes back in the middle fails");
+  wavering.during = nullptr;
+  expect(hosted.verb(OLEIVERB_UIACTIVATE) == S_OK && IsWindow(hosted.window()) &&
+             wavering.count("OnUIActivate") == 1,
+         "and the next one does not");
+  hosted.close();
+  expect(wavering.references == 1, "no reference to the container is left");
+
+  FullContainer dead(reinterpret_cast<HWND>(static_cast<LONG_PTR>(0x7FF0)));
+  Hosted homeless;
+  homeless.object->SetClientSite(&dead);
+  expect(FAILED(homeless.verb(OLEIVERB_INPLACEACTIVATE)), "a window that is none takes no panel");
+  homeless.object->SetClientSite(nullptr);
+  expect(dead.references == 1 && dead.count("OnInPlaceDeactivate") == 1, "nor does the panel keep its frame");
+
+  const HWND form = CreateWindowExW(0, L"STATIC", L"", WS_OVERLAPPEDWINDOW | WS_VISIBLE, 0, 0, 500, 400,
+                                    nullptr, nullptr, nullptr, nullptr);
+  Wavering again(form);
+  Hosted lost;
+  lost.object->SetClientSite(&again);
+  lost.verb(OLEIVERB_UIACTIVATE);
+  DestroyWindow(form);
+  again.stand(desk.window);
+  expect(lost.verb(OLEIVERB_UIACTIVATE) == S_OK && IsWindow(lost.window()) &&
+             again.count("OnInPlaceActivate") == 2 && again.count("OnInPlaceDeactivate") == 1 &&
+             again.count("OnUIActivate") == 2,
+         "a panel whose form has gone stands on the next one, whole");
+}
+
 void changesItsSite(const Desk& desk) {
   FullContainer first(desk.window);
   FullContainer second(desk.window);
@@ -618,6 +666,7 @@ constexpr struct {
                  {"designer", staysQuietInADesigner},
                  {"activation", activatesStepByStep},
                  {"lost window", losesItsWindow},
+                 {"half states", leavesNoHalfState},
                  {"sites", changesItsSite},
                  {"keys", sharesTheKeys},
                  {"mouse", capturesTheMouse},

@@ -132,6 +132,7 @@ class FullContainer
     : public Counted<IOleClientSite, IOleInPlaceSite, IOleControlSite, IOleInPlaceFrame, IDispatch> {
  public:
   explicit FullContainer(HWND window) : window_(window) {}
+  void stand(HWND window) { window_ = window; }
 
   std::vector<std::string> told;
   bool userMode = true;
