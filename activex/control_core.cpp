@@ -154,7 +154,7 @@ bool ControlCore::putExtended(const wchar_t* name, const Variant& value) noexcep
 void ControlCore::extent(SIZEL himetric) {
   if (himetric.cx == extent_.cx && himetric.cy == extent_.cy) return;
   extent_ = himetric;
-  dirty_ = true;
+  dirty(true);
   window_.resizeMemory(pixelsOf(himetric));
   viewChanged();
 }
@@ -183,7 +183,7 @@ bool ControlCore::adoptSize(Size sizePx) {
   window_.resizeMemory(sizePx);  // for the time after the window
   if (sizePx.width <= 0 || sizePx.height <= 0 || pixelsOf(extent_) == sizePx) return false;
   extent_ = himetricOf(sizePx);
-  dirty_ = true;
+  dirty(true);
   return true;
 }
 

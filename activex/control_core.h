@@ -66,7 +66,12 @@ class ControlCore : public Aggregable, public WindowOwner {
   bool adoptSize(Size sizePx);
 
   [[nodiscard]] bool dirty() const noexcept { return dirty_; }
-  void dirty(bool dirty) noexcept { dirty_ = dirty; }
+  void dirty(bool dirty) noexcept {
+    dirty_ = dirty;
+    if (dirty) ++changes_;
+  }
+  // How often it became so, or more so: what has changed since a save is not in it.
+  [[nodiscard]] unsigned changes() const noexcept { return changes_; }
   // The control's place as the container last gave it, pixels of the container's window.
   [[nodiscard]] const RECT& placePx() const noexcept { return placePx_; }
   void placePx(const RECT& place) noexcept { placePx_ = place; }
@@ -127,6 +132,7 @@ class ControlCore : public Aggregable, public WindowOwner {
   ComPointer<IFont> font_;  // of the container, as long as the fields show it
   bool userMode_ = true;
   bool dirty_ = false;
+  unsigned changes_ = 0;
   int freezes_ = 0;
   int savings_ = 0;
   bool changedMeanwhile_ = false;

@@ -131,6 +131,7 @@ HRESULT PersistencePart::Save(IStorage* storage, BOOL sameAsLoad) {
                                 stream.receive()));
     writeStream(*stream.get());
     saved_ = sameAsLoad ? Saved::Original : Saved::Copy;
+    savedChanges_ = core().changes();
   });
 }
 
@@ -138,7 +139,8 @@ HRESULT PersistencePart::Save(IStorage* storage, BOOL sameAsLoad) {
 // failed a storage comes back as well: the control is as dirty as it was then.
 HRESULT PersistencePart::SaveCompleted(IStorage* storage) {
   const Saved saved = std::exchange(saved_, Saved::Nothing);
-  if (saved == Saved::Original || (saved == Saved::Copy && storage != nullptr)) core().dirty(false);
+  const bool whole = saved == Saved::Original || (saved == Saved::Copy && storage != nullptr);
+  if (whole && savedChanges_ == core().changes()) core().dirty(false);
   return S_OK;
 }
 

@@ -46,6 +46,7 @@ class PersistencePart final : public ControlPart<IPersistStreamInit, IPersistPro
   void writeStream(IStream& stream) const;
 
   Saved saved_ = Saved::Nothing;
+  unsigned savedChanges_ = 0;  // as many as the control had when it was saved
 };
 
 }  // namespace frontpanels::activex

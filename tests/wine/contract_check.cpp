@@ -502,6 +502,11 @@ void keepsStateInAStorage(const Desk&) {
   hosted.object->SetExtent(DVASPECT_CONTENT, &extent);
   expect(persist->Save(storage.get(), TRUE) == S_OK && persist->IsDirty() == S_OK, "saved is dirty still");
   expect(persist->SaveCompleted(nullptr) == S_OK && persist->IsDirty() == S_FALSE, "until it is for good");
+  persist->Save(storage.get(), TRUE);
+  extent = {7001, 5004};
+  hosted.object->SetExtent(DVASPECT_CONTENT, &extent);
+  persist->SaveCompleted(nullptr);
+  expect(persist->IsDirty() == S_OK, "what has changed since is not in it");
   Hosted other;
   expect(other.object.query<IPersistStorage>()->Load(storage.get()) == S_OK, "loads");
   SIZEL back{};
