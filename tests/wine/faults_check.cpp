@@ -680,9 +680,8 @@ const Method kPanelMethods[] = {
      [](Subject& s) {
        DWORD cookie = 0;
        return ask(s, &IOleObject::Advise, nullptr, &cookie);
-     },
-     kSystems},
-    {"IOleObject::Unadvise", [](Subject& s) { return ask(s, &IOleObject::Unadvise, 9); }, kSystems},
+     }},
+    {"IOleObject::Unadvise", [](Subject& s) { return ask(s, &IOleObject::Unadvise, 9); }},
     {"IOleObject::EnumAdvise", hands<&IOleObject::EnumAdvise, IEnumSTATDATA>, kSystems},
     {"IOleObject::GetMiscStatus",
      [](Subject& s) {
@@ -730,7 +729,7 @@ const Method kPanelMethods[] = {
      [](Subject& s) { return ask(s, &IOleInPlaceActiveObject::EnableModeless, TRUE); }, kTells},
     {"IViewObject::Draw", paints},
     {"IViewObject::SetAdvise",
-     [](Subject& s) { return ask(s, &IViewObject::SetAdvise, DVASPECT_CONTENT, 0, nullptr); }, kTells},
+     [](Subject& s) { return ask(s, &IViewObject::SetAdvise, DVASPECT_CONTENT, 0, nullptr); }},
     {"IViewObject::GetColorSet",
      [](Subject& s) {
        LOGPALETTE* none = nullptr;
@@ -773,7 +772,7 @@ const Method kPanelMethods[] = {
        DWORD cookie = 0;
        return ask(s, &IDataObject::DAdvise, &metafile, 0, nullptr, &cookie);
      }},
-    {"IDataObject::DUnadvise", [](Subject& s) { return ask(s, &IDataObject::DUnadvise, 9); }, kSystems},
+    {"IDataObject::DUnadvise", [](Subject& s) { return ask(s, &IDataObject::DUnadvise, 9); }},
     {"IDataObject::EnumDAdvise", hands<&IDataObject::EnumDAdvise, IEnumSTATDATA>, kSystems},
     {"IPersist::GetClassID", tells<&IPersist::GetClassID, CLSID>, kTells},
     {"IPersistStreamInit::IsDirty", asks<&IPersistStreamInit::IsDirty>, kTells},
