@@ -40,17 +40,23 @@ std::string shownText(std::string_view caption) {
 
 class FieldsPicture {
  public:
-  FieldsPicture(Gdi& gdi, DcHandle dc, Size viewPx, std::int32_t dpi, const FieldFont& fontOf)
-      : gdi_(gdi), dc_(dc), view_{0, 0, viewPx.width, viewPx.height}, dpi_(dpi), fontOf_(fontOf) {}
+  FieldsPicture(Gdi& gdi, DcHandle dc, const ControlSet& controls, Size viewPx, std::int32_t dpi,
+                const FieldFont& fontOf)
+      : gdi_(gdi),
+        dc_(dc),
+        controls_(controls),
+        view_{0, 0, viewPx.width, viewPx.height},
+        dpi_(dpi),
+        fontOf_(fontOf) {}
 
-  void paint(const Control& control);
+  void paint();
 
  private:
   struct Place {
     Rect all;    // of the control
     Rect shown;  // of it, what the areas that it lies in leave to be seen
   };
-  enum class Align : std::uint8_t { Left, Middle };
+  enum class Align : std::uint8_t { Left, Middle, Right };
 
   [[nodiscard]] Place placeOf(const Control& control) const;
   void fill(Rect rect, SystemColor color) { gdi_.fillRect(dc_, rect, gdi_.sysColorBrush(color)); }
@@ -60,6 +66,10 @@ class FieldsPicture {
   void sunkenField(const Place& place);
   void arrow(Rect button, bool up);
 
+  // A number that an arrow steps stands at the right, beside it.
+  [[nodiscard]] bool isStepped(const Control& box) const;
+
+  void paint(const Control& control);
   void paintFrame(const Control& control, const Place& place);
   void paintSpin(const Place& place);
   void paintList(const ItemList& list, const Place& place);
@@ -67,6 +77,7 @@ class FieldsPicture {
 
   Gdi& gdi_;
   DcHandle dc_;
+  const ControlSet& controls_;
   Rect view_;
   std::int32_t dpi_;
   const FieldFont& fontOf_;
@@ -103,7 +114,8 @@ void FieldsPicture::text(const Control& control, std::string_view text, Rect wit
   const SelectedFont font(gdi_, dc_, fontOf_(control));
   const Size size = gdi_.textExtent(dc_, text);
   const std::int32_t free = within.width() - size.width;
-  const std::int32_t left = within.left + (align == Align::Middle ? std::max(free / 2, 0) : 0);
+  const std::int32_t before = align == Align::Middle ? free / 2 : align == Align::Right ? free : 0;
+  const std::int32_t left = within.left + std::max(before, 0);
   const std::int32_t top = within.top + (within.height() - size.height) / 2;
   const RegionHandle region = gdi_.createRectRgn(visible);
   gdi_.selectClipRgn(dc_, region);
@@ -210,6 +222,19 @@ void FieldsPicture::paintMark(const Control& control, const Place& place, bool r
   caption(control, {mark.right + kMarkGapPx, place.all.top, place.all.right, place.all.bottom});
 }
 
+bool FieldsPicture::isStepped(const Control& box) const {
+  const auto all = controls_.controls();
+  return std::any_of(all.begin(), all.end(), [&box](const std::unique_ptr<Control>& other) {
+    const auto* const spin = dynamic_cast<const SpinButton*>(other.get());
+    return spin != nullptr && spin->buddy() == &box;
+  });
+}
+
+void FieldsPicture::paint() {
+  for (const std::unique_ptr<Control>& control : controls_.controls())
+    if (control->reallyVisible()) paint(*control);
+}
+
 void FieldsPicture::paint(const Control& control) {
   const Place place = placeOf(control);
   if (empty(common(place.all, place.shown))) return;
@@ -223,7 +248,7 @@ void FieldsPicture::paint(const Control& control) {
     case ControlKind::TextBox:
       sunkenField(place);
       return text(control, static_cast<const TextBox&>(control).Text(), shrunk(place.all, kTextInsetPx - 1),
-                  Align::Left, SystemColor::WindowText);
+                  isStepped(control) ? Align::Right : Align::Left, SystemColor::WindowText);
     case ControlKind::SpinButton:
       return paintSpin(place);
     case ControlKind::ComboBox:
@@ -244,9 +269,7 @@ void FieldsPicture::paint(const Control& control) {
 
 void paintFields(Gdi& gdi, DcHandle dc, const ControlSet& controls, Size viewPx, std::int32_t dpi,
                  const FieldFont& fontOf) {
-  FieldsPicture picture(gdi, dc, viewPx, dpi, fontOf);
-  for (const std::unique_ptr<Control>& control : controls.controls())
-    if (control->reallyVisible()) picture.paint(*control);
+  FieldsPicture(gdi, dc, controls, viewPx, dpi, fontOf).paint();
 }
 
 }  // namespace frontpanels

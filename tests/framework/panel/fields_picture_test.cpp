@@ -76,6 +76,9 @@ TEST_F(FieldsPictureTest, FieldsStandWhereTheirWindowsWould) {
   EXPECT_EQ(text->clip, (Rect{113, 13, 167, 27}));
   EXPECT_EQ(text->textColor, gdi.sysColor(SystemColor::WindowText));
   EXPECT_EQ(textOf("Hidden"), nullptr);
+  set.textBox("Box").Text("5");
+  paint();
+  EXPECT_EQ(textOf("5")->points[0].x, 167 - 8);  // a number stands at the right, beside its arrows
 }
 
 TEST_F(FieldsPictureTest, CaptionsLoseTheMarkOfTheirKeyAndButtonsHaveThemInTheMiddle) {
