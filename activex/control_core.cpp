@@ -58,6 +58,7 @@ ControlCore::~ControlCore() = default;
 
 // A container that lets go without closing first gets its window back all the same.
 void ControlCore::lastRelease() noexcept {
+  ending_ = true;
   inPlace_->deactivate();
   connections_->disconnectAll();
   site_.reset();
@@ -167,9 +168,9 @@ void ControlCore::requestPlace(const RECT& place) {
   if (const ComPointer<IOleClientSite> site = site_) site->RequestNewObjectLayout();
 }
 
-// A window shows by itself what it has got.
+// A window shows by itself what it has got. Of a control that is going nobody may keep hold any more.
 void ControlCore::viewChanged() {
-  if (inPlace_->active()) return;
+  if (ending_ || inPlace_->active()) return;
   if (savings_ == 0) return LateNotices::tell(*this);
   changedMeanwhile_ = true;
 }

@@ -136,6 +136,7 @@ class ControlCore : public Aggregable, public WindowOwner {
   int freezes_ = 0;
   int savings_ = 0;
   bool changedMeanwhile_ = false;
+  bool ending_ = false;
   RECT placePx_{};
 
   std::unique_ptr<OleObjectPart> oleObject_;

@@ -27,6 +27,14 @@ struct FormatTraits {
 };
 using FormatEnumerator = Enumerator<IEnumFORMATETC, FormatTraits>;
 
+// What was recorded, when all of it was drawn. Raises ComFailure.
+template <class Metafile>
+Metafile whole(HRESULT drawn, Metafile recorded, WINBOOL(WINAPI* discard)(Metafile)) {
+  if (SUCCEEDED(drawn) && recorded != nullptr) return recorded;
+  if (recorded != nullptr) discard(recorded);
+  throw ComFailure(FAILED(drawn) ? drawn : E_OUTOFMEMORY);
+}
+
 // The kinds of metafile have the size in himetric. What is drawn into an enhanced one is counted in pixels of
 // the screen by its size in millimetres, which need not be those of its dots an inch.
 HENHMETAFILE recordEnhanced(ControlCore& control) {
@@ -40,10 +48,7 @@ HENHMETAFILE recordEnhanced(ControlCore& control) {
   };
   const RECTL bounds{0, 0, lengthPx(extent.cx, HORZRES, HORZSIZE), lengthPx(extent.cy, VERTRES, VERTSIZE)};
   const HRESULT drawn = barrier([&] { control.window().draw(services().gdi, dc, bounds); });
-  const HENHMETAFILE recorded = CloseEnhMetaFile(dc);
-  if (SUCCEEDED(drawn) && recorded != nullptr) return recorded;
-  DeleteEnhMetaFile(recorded);
-  throw ComFailure(FAILED(drawn) ? drawn : E_OUTOFMEMORY);
+  return whole(drawn, CloseEnhMetaFile(dc), DeleteEnhMetaFile);
 }
 
 HMETAFILE recordPlain(ControlCore& control) {
@@ -58,10 +63,7 @@ HMETAFILE recordPlain(ControlCore& control) {
   SetWindowOrgEx(dc, 0, 0, nullptr);
   SetWindowExtEx(dc, static_cast<int>(bounds.right), static_cast<int>(bounds.bottom), nullptr);
   const HRESULT drawn = barrier([&] { control.window().draw(services().gdi, dc, bounds); });
-  const HMETAFILE recorded = CloseMetaFile(dc);
-  if (SUCCEEDED(drawn) && recorded != nullptr) return recorded;
-  DeleteMetaFile(recorded);
-  throw ComFailure(FAILED(drawn) ? drawn : E_OUTOFMEMORY);
+  return whole(drawn, CloseMetaFile(dc), DeleteMetaFile);
 }
 
 HGLOBAL metafilePicture(ControlCore& control) {

@@ -25,11 +25,13 @@ LateNotices::~LateNotices() {
   for (const Waiting& one : told) barrier([&one] { one.control->tellOnlookers(); });
 }
 
-void LateNotices::tell(ControlCore& control) {
-  if (open == 0) return control.tellOnlookers();
-  const bool known = std::any_of(waiting.begin(), waiting.end(),
-                                 [&control](const Waiting& one) { return one.control == &control; });
-  if (!known) waiting.push_back({&control, ComPointer<IUnknown>(control.outer())});
+void LateNotices::tell(ControlCore& control) noexcept {
+  barrier([&control] {
+    if (open == 0) return control.tellOnlookers();
+    const bool known = std::any_of(waiting.begin(), waiting.end(),
+                                   [&control](const Waiting& one) { return one.control == &control; });
+    if (!known) waiting.push_back({&control, ComPointer<IUnknown>(control.outer())});
+  });
 }
 
 }  // namespace frontpanels::activex

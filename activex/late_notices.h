@@ -13,8 +13,9 @@ class LateNotices {
   LateNotices(const LateNotices&) = delete;
   LateNotices& operator=(const LateNotices&) = delete;
 
-  // At the end of the outermost one that lives, else at once. Raises std::bad_alloc.
-  static void tell(ControlCore& control);
+  // At the end of the outermost one that lives, else at once. A notice that there is no memory for is lost:
+  // the next change brings another.
+  static void tell(ControlCore& control) noexcept;
 };
 
 }  // namespace frontpanels::activex

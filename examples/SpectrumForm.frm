@@ -40,6 +40,7 @@ Private Const OpClose As Integer = 1
 Private Hub As FrontPanels.DataHub
 Private CenterHz As Double
 Private SpanHz As Double
+Private Closing As Boolean
 
 Private Sub Form_Load()
     Set Hub = New FrontPanels.DataHub
@@ -59,6 +60,7 @@ Private Sub Sweeps_Timer()
     Dim Levels(0 To 512) As Single
     Dim I As Long
     Dim Offset As Double
+    If Closing Then Unload Me: Exit Sub
     For I = 0 To 512
         Offset = (CenterHz + SpanHz * (I / 512 - 0.5) - 881520000#) / 60000#
         Levels(I) = -105 + 2 * Rnd
@@ -76,10 +78,10 @@ Private Sub Panel_frontPanelSet(ByVal hwId As Long, ByVal vfpId As Long, ByVal p
     End Select
 End Sub
 
-' Unloading inside the panel's own event would take it away under its feet: the form goes when the event is over.
+' Visual Basic does not unload a form inside every event: the timer does it.
 Private Sub Panel_frontPanelOp(ByVal hwId As Long, ByVal vfpId As Long, ByVal OP As Integer, ByVal argument As Variant, status As Long)
     status = 0
-    If OP = OpClose Then Sweeps.Enabled = False: Hide
+    If OP = OpClose Then Closing = True
 End Sub
 
 Private Sub Tell(ByVal Code As Integer, ByVal Hz As Double)

@@ -103,9 +103,7 @@ void FieldPanel::refreshTraces() {
 // --- Markers
 
 void FieldPanel::setMarkerFrameColor(Color color) {
-  // Of a scheme's few colours the frame has the one that goes with its area.
-  if (Control* const frame = controls_.find("MarkerFrame"))
-    frame->ForeColor(gdi().highContrast() ? std::nullopt : std::optional(color));
+  if (Control* const frame = controls_.find("MarkerFrame")) frame->ForeColor(color);
 }
 
 void FieldPanel::deltaMarkerButtonEnabled(bool enable) {

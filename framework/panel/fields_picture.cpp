@@ -1,6 +1,7 @@
 #include "framework/panel/fields_picture.h"
 
 #include <algorithm>
+#include <optional>
 #include <string>
 #include <string_view>
 
@@ -120,8 +121,9 @@ void FieldsPicture::text(const Control& control, std::string_view text, Rect wit
   const RegionHandle region = gdi_.createRectRgn(visible);
   gdi_.selectClipRgn(dc_, region);
   {
-    const Color shown = !control.reallyEnabled() ? gdi_.sysColor(SystemColor::GrayText)
-                                                 : control.ForeColor().value_or(gdi_.sysColor(color));
+    const std::optional<Color> own = gdi_.highContrast() ? std::nullopt : control.ForeColor();
+    const Color shown =
+        control.reallyEnabled() ? own.value_or(gdi_.sysColor(color)) : gdi_.sysColor(SystemColor::GrayText);
     const TextStyleScope style(gdi_, dc_, shown, BackgroundMode::Transparent);
     gdi_.textOut(dc_, {left, top}, text);
   }

@@ -11,6 +11,7 @@
 
 #include "platform/runtime_error.h"
 #include "platform/win32/utf16.h"
+#include "platform/win32/win32_windowing.h"
 
 namespace frontpanels {
 namespace {
@@ -441,13 +442,6 @@ DWORD listStyle(const Control& control) {
   if (list == nullptr || list->kind() != ControlKind::ComboBox) return 0;
   if (list->Style() == ListStyle::DropDownList) return CBS_DROPDOWNLIST;
   return CBS_AUTOHSCROLL | (list->Style() == ListStyle::SimpleCombo ? CBS_SIMPLE : CBS_DROPDOWN);
-}
-
-bool isHighContrast() {
-  HIGHCONTRASTW state{};
-  state.cbSize = sizeof state;
-  return SystemParametersInfoW(SPI_GETHIGHCONTRAST, sizeof state, &state, 0) != 0 &&
-         (state.dwFlags & HCF_HIGHCONTRASTON) != 0;
 }
 
 // A themed frame paints its caption in the theme's colour, whatever it is told.

@@ -7,6 +7,8 @@
 #include <limits>
 #include <vector>
 
+#include "platform/win32/win32_windowing.h"
+
 namespace frontpanels {
 namespace {
 
@@ -108,11 +110,7 @@ Color Win32Gdi::sysColor(SystemColor color) {
   return Color{static_cast<std::uint32_t>(GetSysColor(static_cast<int>(color)))};
 }
 bool Win32Gdi::highContrast() {
-  if (!highContrast_) {
-    HIGHCONTRASTW mode{sizeof mode, 0, nullptr};
-    highContrast_ = SystemParametersInfoW(SPI_GETHIGHCONTRAST, sizeof mode, &mode, 0) != 0 &&
-                    (mode.dwFlags & HCF_HIGHCONTRASTON) != 0;
-  }
+  if (!highContrast_) highContrast_ = isHighContrast();
   return *highContrast_;
 }
 BrushHandle Win32Gdi::sysColorBrush(SystemColor color) {

@@ -46,6 +46,12 @@ ScreenMetrics metricsOf(HWND window) {
   return {twipsPerPixel, twipsPerPixel};
 }
 
+bool isHighContrast() noexcept {
+  HIGHCONTRASTW mode{sizeof mode, 0, nullptr};
+  return SystemParametersInfoW(SPI_GETHIGHCONTRAST, sizeof mode, &mode, 0) != 0 &&
+         (mode.dwFlags & HCF_HIGHCONTRASTON) != 0;
+}
+
 int dotsPerInch(const ScreenMetrics& metrics) noexcept {
   return static_cast<int>(kTwipsPerInch / metrics.twipsPerPixelX + 0.5F);
 }

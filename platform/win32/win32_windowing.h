@@ -20,5 +20,7 @@ class Win32Windowing final : public Windowing {
 // That of the screen which a window is on, as far as its program tells one screen from another.
 [[nodiscard]] ScreenMetrics metricsOf(HWND window);
 [[nodiscard]] int dotsPerInch(const ScreenMetrics& metrics) noexcept;
+// Whether the user has asked for a scheme of few colours that stand out against each other.
+[[nodiscard]] bool isHighContrast() noexcept;
 
 }  // namespace frontpanels

@@ -6,6 +6,7 @@
 #include <ocidl.h>
 #include <olectl.h>
 
+#include <functional>
 #include <map>
 #include <string>
 #include <vector>
@@ -249,6 +250,17 @@ class Onlooker final : public Counted<IAdviseSink> {
   void* find(REFIID id) override { return id == IID_IUnknown || id == IID_IAdviseSink ? this : nullptr; }
 };
 
+// Does something else while it is written into.
+class InterruptingBag final : public Counted<IPropertyBag> {
+ public:
+  std::function<void()> during;
+  HRESULT STDMETHODCALLTYPE Read(LPCOLESTR, VARIANT*, IErrorLog*) override { return E_INVALIDARG; }
+  HRESULT STDMETHODCALLTYPE Write(LPCOLESTR, VARIANT*) override { return during(), S_OK; }
+
+ protected:
+  void* find(REFIID id) override { return id == IID_IUnknown || id == IID_IPropertyBag ? this : nullptr; }
+};
+
 void tellsOnlookers(HWND window) {
   Onlooker onlooker;
   {
@@ -269,10 +281,15 @@ void tellsOnlookers(HWND window) {
     expect(stored->IsDirty() == S_OK && panel.call(L"DisplayPanelVisible").number() == 0,
            "an area that the menu hides is to be stored");
     const int before = onlooker.views;
-    ComPointer<IStream> stream;
-    CreateStreamOnHGlobal(nullptr, TRUE, stream.receive());
-    stored->Save(stream.get(), TRUE);
-    expect(onlooker.views == before, "but not while it is saved");
+    int within = -1;
+    InterruptingBag bag;
+    bag.during = [&] {
+      publish(carrier());
+      within = onlooker.views;
+    };
+    panel.object.query<IPersistPropertyBag>()->Save(&bag, TRUE, TRUE);
+    expect(within == before && onlooker.views == before + 1,
+           "a sweep that comes during a save is told after it");
     panel.verb(OLEIVERB_INPLACEACTIVATE);
     const int active = onlooker.views;
     publish(carrier());
