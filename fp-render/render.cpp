@@ -10,7 +10,7 @@
 
 #include "fp-render/headless_panel.h"
 #include "fp-render/options.h"
-#include "fp-render/picture_file.h"
+#include "hosting/whole_file.h"
 #include "framework/support/error_handler.h"
 #include "framework/support/guard.h"
 #include "platform/raster/png.h"

@@ -1,4 +1,4 @@
-#include "fp-render/picture_file.h"
+#include "hosting/whole_file.h"
 
 #include <cerrno>
 #include <cstdio>

@@ -1,4 +1,4 @@
-// A picture's file: there is a whole one or none.
+// A file that is written whole: there is the old one or the new one, never half of one.
 #pragma once
 
 #include <cstdint>
