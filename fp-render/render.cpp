@@ -10,9 +10,9 @@
 
 #include "fp-render/headless_panel.h"
 #include "fp-render/options.h"
-#include "hosting/whole_file.h"
 #include "framework/support/error_handler.h"
 #include "framework/support/guard.h"
+#include "hosting/whole_file.h"
 #include "platform/raster/png.h"
 #include "platform/runtime_error.h"
 #include "sources/resample.h"
