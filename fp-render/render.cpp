@@ -13,6 +13,7 @@
 #include "framework/support/error_handler.h"
 #include "framework/support/guard.h"
 #include "hosting/whole_file.h"
+#include "platform/file_path.h"
 #include "platform/raster/png.h"
 #include "platform/runtime_error.h"
 #include "sources/resample.h"
@@ -141,7 +142,7 @@ class Renderer {
     std::string problem;
     if (!encodePng(panel.picture(), png_, problem))
       throw RuntimeError(kPathFileAccessError, path.string() + ": " + problem);
-    saveWhole(path, png_);
+    saveWhole(utf8FromPath(path), png_);
     ++drawn_;
     output_ << pictureLine(path, sweep) << '\n';
   }

@@ -1,41 +1,192 @@
 #include "hosting/whole_file.h"
 
-#include <cerrno>
-#include <cstdio>
-#include <memory>
-#include <string>
-#include <system_error>
+#include <fcntl.h>
 
+#include <algorithm>
+#include <cerrno>
+#include <chrono>
+#include <filesystem>
+#include <limits>
+#include <system_error>
+#include <thread>
+#include <utility>
+
+#include "platform/file_path.h"
 #include "platform/runtime_error.h"
+
+#ifdef _WIN32
+#include <io.h>
+#include <share.h>
+#include <sys/stat.h>
+#else
+#include <sys/file.h>
+#include <sys/stat.h>
+#include <unistd.h>
+#endif
 
 namespace frontpanels {
 namespace {
 
-constexpr int kPathFileAccessError = 75;
+namespace fs = std::filesystem;
 
-// Writes, flushes and closes; the error number of what failed first, 0 when all went well.
-int writeFile(const std::filesystem::path& path, std::span<const std::uint8_t> bytes) {
-  errno = 0;
-  std::FILE* const file = std::fopen(path.string().c_str(), "wb");
-  if (file == nullptr) return errno;
-  const bool written =
-      std::fwrite(bytes.data(), 1, bytes.size(), file) == bytes.size() && std::fflush(file) == 0;
-  const int writeError = written ? 0 : errno;
-  const int closeError = std::fclose(file) == 0 ? 0 : errno;
-  return writeError != 0 ? writeError : closeError;
+constexpr int kPathFileAccessError = 75;
+// Another program that saves the same file, or looks through it, is given so long.
+constexpr int kAttempts = 200;
+constexpr std::chrono::milliseconds kBetweenAttempts(10);
+
+std::error_code lastError() noexcept { return {errno, std::generic_category()}; }
+
+// What the two systems word differently: a file of one's own, open for writing and empty.
+#ifdef _WIN32
+bool isTaken(const std::error_code& error) noexcept { return error == std::errc::permission_denied; }
+
+int openOwn(const fs::path& path) noexcept {
+  // Shared with nobody: a second program cannot open it before this one is through.
+  return _wsopen(path.c_str(), _O_CREAT | _O_TRUNC | _O_WRONLY | _O_BINARY | _O_NOINHERIT, _SH_DENYRW,
+                 _S_IREAD | _S_IWRITE);
+}
+int writeSome(int file, const std::uint8_t* bytes, std::size_t count) noexcept {
+  return _write(file, bytes, static_cast<unsigned>(count));
+}
+int bringToDisk(int file) noexcept { return _commit(file); }
+int closeFile(int file) noexcept { return _close(file); }
+void bringNameToDisk(const fs::path&) noexcept {}
+// An open file cannot be renamed here.
+constexpr bool kCloseBeforeRename = true;
+#else
+bool isTaken(const std::error_code& error) noexcept { return error == std::errc::operation_would_block; }
+
+// A lock on a file that was renamed away meanwhile is none on this path: that file must not be emptied.
+bool isAt(const fs::path& path, int file) noexcept {
+  struct stat opened {};
+  struct stat named {};
+  return fstat(file, &opened) == 0 && lstat(path.c_str(), &named) == 0 && opened.st_dev == named.st_dev &&
+         opened.st_ino == named.st_ino;
+}
+
+int openOwn(const fs::path& path) noexcept {
+  constexpr mode_t kWhateverTheUserAllows = 0666;
+  const int file = open(path.c_str(), O_CREAT | O_WRONLY | O_CLOEXEC | O_NOFOLLOW, kWhateverTheUserAllows);
+  if (file < 0) return file;
+  bool own = flock(file, LOCK_EX | LOCK_NB) == 0;
+  if (own && !isAt(path, file)) {
+    own = false;
+    errno = EWOULDBLOCK;
+  }
+  if (own && ftruncate(file, 0) == 0) return file;
+  const int error = errno;
+  close(file);
+  errno = error;
+  return -1;
+}
+ssize_t writeSome(int file, const std::uint8_t* bytes, std::size_t count) noexcept {
+  return write(file, bytes, count);
+}
+int bringToDisk(int file) noexcept { return fsync(file); }
+int closeFile(int file) noexcept { return close(file); }
+// So that a renaming outlives a loss of power; not every file system can.
+void bringNameToDisk(const fs::path& path) noexcept {
+  const int folder = open(path.has_parent_path() ? path.parent_path().c_str() : ".", O_RDONLY | O_CLOEXEC);
+  if (folder < 0) return;
+  static_cast<void>(fsync(folder));
+  close(folder);
+}
+constexpr bool kCloseBeforeRename = false;
+#endif
+
+// Tries again while another program has the file.
+template <class Step>
+std::error_code onceFree(const Step& step) {
+  for (int attempt = 1;; ++attempt) {
+    const std::error_code error = step();
+    if (!isTaken(error) || attempt == kAttempts) return error;
+    std::this_thread::sleep_for(kBetweenAttempts);
+  }
+}
+
+// The file aside; its name goes with it unless it was renamed.
+class AsideFile {
+ public:
+  explicit AsideFile(fs::path path) : path_(std::move(path)) {}
+  ~AsideFile() {
+    std::error_code ignored;
+    // Without a lock it may be another program's by now; one that cannot be removed while open waits.
+    if (kCloseBeforeRename) static_cast<void>(shut());
+    if (own_) fs::remove(path_, ignored);
+    static_cast<void>(shut());
+  }
+  AsideFile(const AsideFile&) = delete;
+  AsideFile& operator=(const AsideFile&) = delete;
+
+  std::error_code openFile() {
+    const std::error_code error = onceFree([this] {
+      file_ = openOwn(path_);
+      return file_ >= 0 ? std::error_code() : lastError();
+    });
+    own_ = !error;
+    return error;
+  }
+
+  std::error_code fill(std::span<const std::uint8_t> bytes) noexcept {
+    constexpr std::size_t kAtOnce = 1U << 30U;  // a count of bytes must fit an int where writing answers one
+    while (!bytes.empty()) {
+      const auto written = writeSome(file_, bytes.data(), std::min(bytes.size(), kAtOnce));
+      if (written < 0 && errno == EINTR) continue;
+      if (written < 0) return lastError();
+      if (written == 0) return std::make_error_code(std::errc::no_space_on_device);
+      bytes = bytes.subspan(static_cast<std::size_t>(written));
+    }
+    return bringToDisk(file_) == 0 ? std::error_code() : lastError();
+  }
+
+  std::error_code rename(const fs::path& path) {
+    std::error_code error;
+    if (const fs::file_status old = fs::status(path, error); fs::exists(old))
+      fs::permissions(path_, old.permissions(), error);
+    if (kCloseBeforeRename && shut() != 0) return lastError();
+    error = onceFree([&] {
+      std::error_code refused;
+      fs::rename(path_, path, refused);
+      return refused;
+    });
+    if (error) return error;
+    own_ = false;
+    bringNameToDisk(path);
+    return {};
+  }
+
+ private:
+  int shut() noexcept { return file_ < 0 ? 0 : closeFile(std::exchange(file_, -1)); }
+
+  fs::path path_;
+  int file_ = -1;
+  bool own_ = false;
+};
+
+std::error_code save(fs::path path, std::span<const std::uint8_t> bytes) {
+  std::error_code error;
+  if (fs::is_symlink(path, error)) {
+    path = fs::canonical(path, error);
+    if (error) return error;
+  }
+  fs::path aside = path;
+  aside += ".part";
+  AsideFile file(std::move(aside));
+  error = file.openFile();
+  if (!error) error = file.fill(bytes);
+  if (!error) error = file.rename(path);
+  return error;
 }
 
 }  // namespace
 
-void saveWhole(const std::filesystem::path& path, std::span<const std::uint8_t> bytes) {
-  std::filesystem::path aside = path;
-  aside += ".part";
-  std::error_code error(writeFile(aside, bytes), std::generic_category());
-  if (!error) std::filesystem::rename(aside, path, error);
-  if (!error) return;
-  std::error_code ignored;
-  std::filesystem::remove(aside, ignored);
-  throw RuntimeError(kPathFileAccessError, path.string() + ": cannot be written: " + error.message());
+void saveWhole(const std::string& pathUtf8, std::span<const std::uint8_t> bytes) {
+  if (const std::error_code error = save(pathFromUtf8(pathUtf8), bytes))
+    throw RuntimeError(kPathFileAccessError, pathUtf8 + ": cannot be written: " + error.message());
+}
+
+void saveWhole(const std::string& pathUtf8, std::string_view text) {
+  saveWhole(pathUtf8, std::span(reinterpret_cast<const std::uint8_t*>(text.data()), text.size()));
 }
 
 }  // namespace frontpanels

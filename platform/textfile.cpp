@@ -10,6 +10,7 @@
 #include <system_error>
 #include <utility>
 
+#include "platform/file_path.h"
 #include "platform/runtime_error.h"
 
 namespace frontpanels {
@@ -87,21 +88,10 @@ class FileTextReader : public TextReader {
   raisePathFileAccessError();
 }
 
-// What is no UTF-8 cannot name a file where the system's names are UTF-16; a zero byte would hide what
-// follows it.
-fs::path nativePath(const std::string& path) {
-  if (path.find('\0') != std::string::npos) raisePathFileAccessError();
-  try {
-    return fs::path(std::u8string(path.begin(), path.end()));
-  } catch (const std::system_error&) {
-    raisePathFileAccessError();
-  }
-}
-
 class SystemTextFiles : public TextFiles {
  public:
   [[nodiscard]] std::unique_ptr<TextReader> open(const std::string& path, std::size_t maxLineBytes) override {
-    const fs::path native = nativePath(path);
+    const fs::path native = pathFromUtf8(path);
     std::error_code error;
     const fs::file_status status = fs::status(native, error);
     if (status.type() == fs::file_type::not_found) raiseFileNotFound();

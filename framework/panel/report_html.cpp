@@ -2,37 +2,16 @@
 
 #include <algorithm>
 
+#include "framework/support/html_text.h"
+
 namespace frontpanels {
 namespace {
 
 constexpr std::string_view kBase64Digits = "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789+/";
 
-std::string escaped(std::string_view text) {
-  std::string html;
-  for (const char c : text) {
-    switch (c) {
-      case '&':
-        html += "&amp;";
-        break;
-      case '<':
-        html += "&lt;";
-        break;
-      case '>':
-        html += "&gt;";
-        break;
-      case '"':
-        html += "&quot;";
-        break;
-      default:
-        html += c;
-    }
-  }
-  return html;
-}
-
 std::string cell(std::string_view tag, std::string_view text) {
   const std::string name(tag);
-  return "<" + name + ">" + escaped(text) + "</" + name + ">";
+  return "<" + name + ">" + htmlEscaped(text) + "</" + name + ">";
 }
 
 }  // namespace
@@ -62,7 +41,7 @@ std::string reportHtml(const PanelReport& report) {
     html += "</table>\n";
   }
   if (!report.picturePng.empty())
-    html += "<img alt=\"" + escaped(report.caption) + "\" src=\"data:image/png;base64," +
+    html += "<img alt=\"" + htmlEscaped(report.caption) + "\" src=\"data:image/png;base64," +
             base64(report.picturePng) + "\">\n";
   return html + "</div>\n";
 }
