@@ -28,7 +28,7 @@ std::unique_ptr<Control> make(const ControlRow& row) {
 
 // In the order of ControlKind.
 using Maker = std::unique_ptr<Control> (*)(const ControlRow&);
-constexpr Maker kMakers[] = {make<Frame>,      make<Label>,    make<TextBox>,  make<SpinButton>,
+constexpr Maker kMakers[] = {make<FieldFrame>, make<Label>,    make<TextBox>,  make<SpinButton>,
                              make<ItemList>,   make<ItemList>, make<CheckBox>, make<OptionButton>,
                              make<PushButton>, make<Picture>};
 

@@ -54,7 +54,7 @@ class ControlSet final : private ControlScope {
   [[nodiscard]] CheckBox& checkBox(std::string_view name) const { return typed<CheckBox>(name); }
   [[nodiscard]] OptionButton& optionButton(std::string_view name) const { return typed<OptionButton>(name); }
   [[nodiscard]] PushButton& pushButton(std::string_view name) const { return typed<PushButton>(name); }
-  [[nodiscard]] Frame& frame(std::string_view name) const { return typed<Frame>(name); }
+  [[nodiscard]] FieldFrame& frame(std::string_view name) const { return typed<FieldFrame>(name); }
   [[nodiscard]] Label& label(std::string_view name) const { return typed<Label>(name); }
   [[nodiscard]] Picture& picture(std::string_view name) const { return typed<Picture>(name); }
 

@@ -215,9 +215,9 @@ class Label final : public Control {
   explicit Label(std::string name) : Control(ControlKind::Label, std::move(name)) {}
 };
 
-class Frame final : public Control {
+class FieldFrame final : public Control {
  public:
-  explicit Frame(std::string name) : Control(ControlKind::Frame, std::move(name)) {}
+  explicit FieldFrame(std::string name) : Control(ControlKind::Frame, std::move(name)) {}
 };
 
 // An area of its own, which cuts off what lies in it.
