@@ -1,6 +1,7 @@
 // Where frames come from: a recording or the simulator.
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <functional>
 #include <memory>
@@ -38,11 +39,14 @@ class FrameSource {
 // Hears how far a long work is, 0 to 100, every now and then. False ends the work.
 using Progress = std::function<bool(int percent)>;
 
+inline constexpr std::size_t kMaxBookmarks = 4096;
+
 // The format is recognised from the content. The recording is read once, to know its frames and to be able to
-// seek; held are one frame and a bounded number of places. Null when `progress` ended the work. Raises a
-// run-time error whose description names the file: when it cannot be opened, is empty, or is no recording.
-// `files` must outlive the source.
+// seek; held are one frame and at most `maxBookmarks` places, from 2 on. `progress` hears of every 64 KiB.
+// Null when it ended the work. Raises a run-time error whose description names the file: when it cannot be
+// opened, is empty, or is no recording. `files` must outlive the source.
 [[nodiscard]] std::unique_ptr<FrameSource> openRecording(TextFiles& files, const std::string& path,
-                                                         const Progress& progress = {});
+                                                         const Progress& progress = {},
+                                                         std::size_t maxBookmarks = kMaxBookmarks);
 
 }  // namespace frontpanels

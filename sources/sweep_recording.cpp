@@ -6,26 +6,14 @@
 #include <utility>
 
 #include "platform/runtime_error.h"
+#include "sources/named_files.h"
 
 namespace frontpanels {
 namespace {
 
-constexpr int kInvalidFileFormat = 321;
 // How far into a file its first row is looked for.
 constexpr std::uint64_t kHeadLines = 1000;
 constexpr std::uint64_t kHeadBytes = std::uint64_t{4} << 20;
-
-[[noreturn]] void refuse(const std::string& path, const std::string& reason) {
-  throw RuntimeError(kInvalidFileFormat, path + ": " + reason);
-}
-
-std::unique_ptr<TextReader> openNamed(TextFiles& files, const std::string& path) {
-  try {
-    return files.open(path, SweepRecording::kMaxLineBytes);
-  } catch (const RuntimeError& error) {
-    throw RuntimeError(error.number(), path + ": " + error.description());
-  }
-}
 
 // A shell of Windows that redirects a program's output writes UTF-16.
 bool isUtf16(std::string_view text) { return text.starts_with("\xff\xfe") || text.starts_with("\xfe\xff"); }
@@ -60,37 +48,52 @@ std::unique_ptr<SweepRecording> SweepRecording::open(TextFiles& files, const std
 }
 
 void SweepRecording::rewind() {
-  reader_ = openNamed(files_, path_);
-  readFailed_ = false;
+  openAnew();
   cutShort_ = false;
-  rowPending_ = false;
-  startSweep();
-  sweepNumber_ = 0;
   unreadableRows_ = 0;
   rowsOutOfOrder_ = 0;
   problems_.clear();
   recognise();
 }
 
+void SweepRecording::openAnew() {
+  reader_ = namingFile(path_, [this] { return files_.open(path_, kMaxLineBytes); });
+  readFailed_ = false;
+  rowPending_ = false;
+  startSweep();
+  sweepNumber_ = 0;
+}
+
+FramePlace SweepRecording::place() const {
+  return rowPending_ ? rowPlace_ : FramePlace{reader_->positionBytes(), line_.number};
+}
+
+void SweepRecording::goTo(const FramePlace& place) {
+  openAnew();
+  namingFile(path_, [&] { reader_->goTo(place.bytes, place.linesBefore); });
+  line_.number = place.linesBefore;
+}
+
 void SweepRecording::recognise() {
   line_.number = 0;
   while (line_.number < kHeadLines && reader_->positionBytes() < kHeadBytes && readLine()) {
     if (line_.number == 1 && isUtf16(line_.text))
-      refuse(path_, "UTF-16 text; save it as UTF-8 or plain text");
+      refuseFile(path_, "UTF-16 text; save it as UTF-8 or plain text");
     if (line_.text.empty()) continue;
     if (parseSweepRow(line_.text, row_, problem_)) {
       rowPending_ = true;
       rowLine_ = line_.number;
+      rowPlace_ = linePlace_;
       format_ = formatOf(row_);
       lastBinTwice_ = row_.rangeBins != 0 && row_.writtenValues == row_.rangeBins + 1;
       return;
     }
     noteUnreadable(line_.number, problem_);
   }
-  if (problems_.empty()) refuse(path_, "the file is empty");
+  if (problems_.empty()) refuseFile(path_, "the file is empty");
   std::string reason = "not a recording of rtl_power or hackrf_sweep";
   for (const RowProblem& problem : problems_) reason += lineText(problem);
-  refuse(path_, reason);
+  refuseFile(path_, reason);
 }
 
 bool SweepRecording::next(Sweep& sweep) {
@@ -115,6 +118,7 @@ bool SweepRecording::next(Sweep& sweep) {
 // A file that cannot be read further ends here; what came before is kept.
 bool SweepRecording::readLine() {
   if (readFailed_) return false;
+  linePlace_ = {reader_->positionBytes(), line_.number};
   try {
     if (!reader_->readLine(line_)) return false;
   } catch (const RuntimeError& error) {
@@ -132,6 +136,7 @@ bool SweepRecording::readRow() {
   while (readLine()) {
     if (line_.text.find_first_not_of(" \t\r") == std::string::npos) continue;
     rowLine_ = line_.number;
+    rowPlace_ = linePlace_;
     if (line_.cut) {
       noteUnreadable(rowLine_, "longer than " + std::to_string(kMaxLineBytes) + " bytes");
     } else if (parseSweepRow(line_.text, row_, problem_)) {

@@ -10,6 +10,7 @@
 #include <vector>
 
 #include "platform/textfile.h"
+#include "sources/frame_reader.h"
 #include "sources/sweep.h"
 #include "sources/sweep_row.h"
 
@@ -43,6 +44,11 @@ class SweepRecording {
   // Back to before the first sweep; the counts begin anew. Raises as `open` does.
   void rewind();
 
+  // Where the sweep to come begins, and back to there; sweeps are then counted from 1 again, the problems go
+  // on being counted. Raises as `open` does.
+  [[nodiscard]] FramePlace place() const;
+  void goTo(const FramePlace& place);
+
   [[nodiscard]] const std::string& path() const noexcept { return path_; }
   [[nodiscard]] SweepFormat format() const noexcept { return format_; }
   [[nodiscard]] std::uint64_t positionBytes() const { return reader_->positionBytes(); }
@@ -67,6 +73,7 @@ class SweepRecording {
   SweepRecording(TextFiles& files, std::string path) : files_(files), path_(std::move(path)) {}
 
   void recognise();
+  void openAnew();
   bool readLine();
   bool readRow();
   [[nodiscard]] Fit fitOfRow() const;
@@ -89,8 +96,10 @@ class SweepRecording {
   bool lastBinTwice_ = false;
 
   TextLine line_;
+  FramePlace linePlace_;
   SweepRow row_;
   std::uint64_t rowLine_ = 0;
+  FramePlace rowPlace_;
   bool rowPending_ = false;  // row_ is read and belongs to the sweep to come
   std::string problem_;
 

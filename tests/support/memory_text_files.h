@@ -1,11 +1,13 @@
 // Text files that exist in a test only.
 #pragma once
 
+#include <algorithm>
 #include <cstddef>
 #include <cstdint>
 #include <limits>
 #include <map>
 #include <memory>
+#include <span>
 #include <string>
 #include <utility>
 
@@ -13,6 +15,28 @@
 #include "platform/textfile.h"
 
 namespace frontpanels::testing {
+
+class MemoryBytes : public ByteReader {
+ public:
+  MemoryBytes(std::string content, std::uint64_t failAtByte)
+      : content_(std::move(content)), failAtByte_(failAtByte) {}
+
+  std::size_t read(std::span<char> bytes) override {
+    const std::size_t size = content_.copy(bytes.data(), bytes.size(), at_);
+    if (failAtByte_ != 0 && at_ + size >= failAtByte_) raiseDeviceIoError();
+    at_ += size;
+    return size;
+  }
+  void goTo(std::uint64_t positionBytes) override {
+    at_ = static_cast<std::size_t>(std::min<std::uint64_t>(positionBytes, content_.size()));
+  }
+  [[nodiscard]] std::uint64_t sizeBytes() const override { return content_.size(); }
+
+ private:
+  std::string content_;
+  std::uint64_t failAtByte_;
+  std::size_t at_ = 0;
+};
 
 class MemoryTextReader : public TextReader {
  public:
@@ -32,6 +56,10 @@ class MemoryTextReader : public TextReader {
     line.number = ++line_;
     return true;
   }
+  void goTo(std::uint64_t positionBytes, std::uint64_t linesBefore) override {
+    at_ = static_cast<std::size_t>(std::min<std::uint64_t>(positionBytes, content_.size()));
+    line_ = linesBefore;
+  }
   [[nodiscard]] std::uint64_t positionBytes() const override { return at_; }
   [[nodiscard]] std::uint64_t sizeBytes() const override { return content_.size(); }
 
@@ -47,11 +75,17 @@ class MemoryTextFiles : public TextFiles {
  public:
   std::map<std::string, std::string> contents;
   std::uint64_t failAtLine = 0;  // reading this line fails; none when 0
+  std::uint64_t failAtByte = 0;  // the same for what is read as bytes
 
   [[nodiscard]] std::unique_ptr<TextReader> open(const std::string& path, std::size_t maxLineBytes) override {
     const auto found = contents.find(path);
     if (found == contents.end()) raiseFileNotFound();
     return std::make_unique<MemoryTextReader>(found->second, maxLineBytes, failAtLine);
+  }
+  [[nodiscard]] std::unique_ptr<ByteReader> openBytes(const std::string& path) override {
+    const auto found = contents.find(path);
+    if (found == contents.end()) raiseFileNotFound();
+    return std::make_unique<MemoryBytes>(found->second, failAtByte);
   }
 };
 
