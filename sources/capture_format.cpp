@@ -46,8 +46,7 @@ class PayloadWriter {
 
   template <class T>
   void number(T value) {
-    const auto raw = toLittleEndian(value);
-    bytes_.insert(bytes_.end(), raw.begin(), raw.end());
+    for (const char byte : toLittleEndian(value)) bytes_.push_back(byte);
   }
   template <class T>
   void count(const T& values) {

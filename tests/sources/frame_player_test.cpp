@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <functional>
+
 #include "tests/support/memory_text_files.h"
 #include "tests/support/raised.h"
 
@@ -59,15 +61,44 @@ TEST_F(FramePlayerTest, DoesWhatTheKeysOfARecorderDo) {
       {"play from the end", [&] { p.play(); }, "playing 0"},
       {"step", [&] { EXPECT_TRUE(p.step()); }, "playing 1"},
       {"seek to the last", [&] { p.seek(3); }, "playing 3"},
-      {"step in a loop", [&] { p.loop(true), EXPECT_TRUE(p.step()); }, "playing 1"},
-      {"pause and seek", [&] { p.pause(), p.seek(3); }, "paused 3"},
+      {"step in a loop",
+       [&] {
+         p.loop(true);
+         EXPECT_TRUE(p.step());
+       },
+       "playing 1"},
+      {"pause and seek",
+       [&] {
+         p.pause();
+         p.seek(3);
+       },
+       "paused 3"},
       {"step in a loop", [&] { EXPECT_TRUE(p.step()); }, "paused 1"},
-      {"end", [&] { p.loop(false), p.seek(3), EXPECT_FALSE(p.step()); }, "ended 3"},
-      {"step on in a loop", [&] { p.loop(true), EXPECT_TRUE(p.step()); }, "paused 1"},
+      {"end",
+       [&] {
+         p.loop(false);
+         p.seek(3);
+         EXPECT_FALSE(p.step());
+       },
+       "ended 3"},
+      {"step on in a loop",
+       [&] {
+         p.loop(true);
+         EXPECT_TRUE(p.step());
+       },
+       "paused 1"},
       {"nothing to open", [&] { p.open(nullptr); }, "paused 1"},
       {"close", [&] { p.close(); }, "empty 0"},
       {"all keys without a source",
-       [&] { p.play(), p.pause(), p.restart(), p.stepBack(), p.seek(1), EXPECT_FALSE(p.step()); }, "empty 0"},
+       [&] {
+         p.play();
+         p.pause();
+         p.restart();
+         p.stepBack();
+         p.seek(1);
+         EXPECT_FALSE(p.step());
+       },
+       "empty 0"},
   };
   for (const auto& press : kPresses) {
     press.press();
