@@ -84,6 +84,31 @@ std::vector<ReceiverSetting> Receiver::settings() const {
   return all;
 }
 
+SpectrumTuning Receiver::tuning(const SpectrumTuning& defaults) const {
+  const auto value = [this](std::int16_t code, double otherwise) {
+    const auto found = values_.find(code);
+    return found == values_.end() ? otherwise : found->second;
+  };
+  SpectrumTuning tuning = defaults;
+  if (tuned_) {
+    const double widest = kHighestTunedHz - kLowestTunedHz;
+    tuning.spanHz = std::min(value(kSpanParameter, defaults.spanHz), widest);
+    const double half = tuning.spanHz / 2;
+    tuning.centerHz = std::clamp(value(kCenterFrequencyParameter, defaults.centerHz), kLowestTunedHz + half,
+                                 kHighestTunedHz - half);
+  }
+  tuning.rbwHz = value(kRbwParameter, defaults.rbwHz);
+  tuning.narrowIf = value(FREQ_FILTER, defaults.narrowIf ? 1 : 0) != 0;
+  tuning.periodS = value(TIME_MEASUREMENT_PERIOD, defaults.periodS);
+  const double points = std::min(value(kDisplayLengthParameter, static_cast<double>(defaults.points)),
+                                 static_cast<double>(kDisplayCells));
+  tuning.points = static_cast<std::size_t>(std::max(points, 2.0));
+  tuning.averageType = static_cast<std::int16_t>(value(kAverageTypeParameter, defaults.averageType));
+  tuning.averageCount = static_cast<std::int32_t>(value(kAverageCountParameter, defaults.averageCount));
+  tuning.averageLogPower = value(PARM_AVERAGE_AS_LOG_POWER, defaults.averageLogPower ? 1 : 0) != 0;
+  return tuning;
+}
+
 const DisplaySweep& Receiver::receive(const Sweep& sweep) {
   display_.count = 0;
   if (sweep.levelsDb.empty()) return display_;

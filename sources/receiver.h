@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "sources/resample.h"
+#include "sources/tuning.h"
 
 namespace frontpanels {
 
@@ -31,6 +32,8 @@ class Receiver {
   [[nodiscard]] std::vector<ReceiverSetting> takeAnswers();
   // All that was requested so far: for a panel that is new.
   [[nodiscard]] std::vector<ReceiverSetting> settings() const;
+  // The defaults with what was requested in place of theirs, points as many as a panel shows at most.
+  [[nodiscard]] SpectrumTuning tuning(const SpectrumTuning& defaults) const;
 
   // The sweep as panels show it. Before a request of centre or span that is the whole sweep; from then on the
   // range stays, whatever is swept, and what was not requested stays as it was shown last. A range that
