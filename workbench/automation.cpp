@@ -44,6 +44,28 @@ BSTR makeBstr(std::wstring_view text) {
   return copy;
 }
 
+struct Filling {
+  VARIANT& target;
+
+  void operator()(const Variant::Empty&) const {}
+  void operator()(bool value) const {
+    target.vt = VT_BOOL, target.boolVal = value ? VARIANT_TRUE : VARIANT_FALSE;
+  }
+  void operator()(std::uint8_t value) const { target.vt = VT_UI1, target.bVal = value; }
+  void operator()(std::int16_t value) const { target.vt = VT_I2, target.iVal = value; }
+  void operator()(std::int32_t value) const { target.vt = VT_I4, target.lVal = value; }
+  void operator()(float value) const { target.vt = VT_R4, target.fltVal = value; }
+  void operator()(double value) const { target.vt = VT_R8, target.dblVal = value; }
+  void operator()(const std::string& value) const {
+    target.bstrVal = makeBstr(toUtf16(value));
+    target.vt = VT_BSTR;
+  }
+  template <class Other>
+  void operator()(const Other&) const {
+    throw HostFailure("A value is neither a number nor a text");
+  }
+};
+
 }  // namespace
 
 Value::Value(bool value) noexcept : Value() {
@@ -80,6 +102,60 @@ Value::Value(std::span<const float> singles) : Value() {
   check(SafeArrayAccessData(array, &data), "Filling an array");
   if (!singles.empty()) std::memcpy(data, singles.data(), singles.size_bytes());
   SafeArrayUnaccessData(array);
+}
+
+Value Value::of(const Variant& plain) {
+  Value value;
+  std::visit(Filling{value.variant_}, plain.value());
+  return value;
+}
+
+Value::Value(ComPointer<IDispatch> object) noexcept : Value() {
+  variant_.vt = VT_DISPATCH;
+  variant_.pdispVal = object.detach();
+}
+
+Variant variantOf(const VARIANT& value) {
+  switch (value.vt) {
+    case VT_EMPTY:
+      return {};
+    case VT_BOOL:
+      return value.boolVal != VARIANT_FALSE;
+    case VT_UI1:
+      return value.bVal;
+    case VT_I2:
+      return static_cast<std::int16_t>(value.iVal);
+    case VT_I4:
+      return static_cast<std::int32_t>(value.lVal);
+    case VT_R4:
+      return value.fltVal;
+    case VT_R8:
+      return value.dblVal;
+    case VT_BSTR:
+      return toUtf8({value.bstrVal, SysStringLen(value.bstrVal)});
+    default:
+      throw HostFailure("A value is neither a number nor a text");
+  }
+}
+
+std::vector<Variant> elementsOf(const VARIANT& array) {
+  const bool byReference = (array.vt & VT_BYREF) != 0;
+  if (byReference && (array.vt & VT_TYPEMASK) == VT_VARIANT && (array.vt & VT_ARRAY) == 0)
+    return elementsOf(*array.pvarVal);
+  if ((array.vt & ~VT_BYREF) != (VT_ARRAY | VT_VARIANT)) throw HostFailure("A list is no array of values");
+  SAFEARRAY* const elements = byReference ? *array.pparray : array.parray;
+  LONG low = 0;
+  LONG high = -1;
+  if (elements == nullptr || SafeArrayGetDim(elements) != 1 ||
+      FAILED(SafeArrayGetLBound(elements, 1, &low)) || FAILED(SafeArrayGetUBound(elements, 1, &high)))
+    throw HostFailure("A list is no array of values");
+  std::vector<Variant> values;
+  for (LONG i = low; i <= high; ++i) {
+    Value element;
+    check(SafeArrayGetElement(elements, &i, element.receive()), "Reading a list");
+    values.push_back(variantOf(element.variant()));
+  }
+  return values;
 }
 
 Value::Value(const Value& other) : Value() {
@@ -141,6 +217,23 @@ std::string Automation::text(const std::string& member, Arguments arguments) {
   Value result;
   invoke(DISPATCH_METHOD | DISPATCH_PROPERTYGET, member, arguments, result);
   return result.toText();
+}
+
+bool Automation::flag(const std::string& member, Arguments arguments) {
+  return variantOf(value(member, arguments).variant()).toBoolean();
+}
+
+Value Automation::value(const std::string& member, Arguments arguments) {
+  Value result;
+  invoke(DISPATCH_METHOD | DISPATCH_PROPERTYGET, member, arguments, result);
+  return result;
+}
+
+Automation Automation::object(const std::string& property) {
+  const Value result = value(property);
+  if (result.variant().vt != VT_DISPATCH || result.variant().pdispVal == nullptr)
+    throw HostFailure(property + " is no object");
+  return Automation(ComPointer<IDispatch>(result.variant().pdispVal));
 }
 
 void Automation::put(const std::string& property, const Value& value) {

@@ -10,7 +10,9 @@
 #include <span>
 #include <string>
 #include <string_view>
+#include <vector>
 
+#include "platform/variant.h"
 #include "platform/win32/com_pointer.h"
 
 namespace frontpanels::workbench {
@@ -28,11 +30,17 @@ class Value {
   Value(const char* utf8) : Value(std::string_view(utf8)) {}
   // An array of singles, counted from 0.
   Value(std::span<const float> singles);
+  Value(ComPointer<IDispatch> object) noexcept;
   Value(const Value& other);
   Value& operator=(const Value&) = delete;
   ~Value() { VariantClear(&variant_); }
 
+  // Of a boolean, a number or a text; raises a failure for anything else.
+  [[nodiscard]] static Value of(const Variant& plain);
+
   [[nodiscard]] const VARIANT& variant() const noexcept { return variant_; }
+  // For functions that only read, and are declared without saying so.
+  [[nodiscard]] VARIANT* inPlace() noexcept { return &variant_; }
   // Gives up what is held; for functions that hand a value out.
   [[nodiscard]] VARIANT* receive() noexcept;
   // Raise a failure when it cannot be read so.
@@ -42,6 +50,12 @@ class Value {
  private:
   VARIANT variant_;
 };
+
+// A boolean, a number or a text of the system's kind; raises a failure for anything else.
+[[nodiscard]] Variant variantOf(const VARIANT& value);
+// The elements of an array of variants, by themselves as well as by reference; raises a failure for anything
+// else.
+[[nodiscard]] std::vector<Variant> elementsOf(const VARIANT& array);
 
 using Arguments = std::initializer_list<Value>;
 
@@ -55,6 +69,11 @@ class Automation {
   void call(const std::string& member, Arguments arguments);
   [[nodiscard]] std::int32_t number(const std::string& member, Arguments arguments = {});
   [[nodiscard]] std::string text(const std::string& member, Arguments arguments = {});
+  [[nodiscard]] bool flag(const std::string& member, Arguments arguments = {});
+  [[nodiscard]] Value value(const std::string& member, Arguments arguments = {});
+  // The object that a property gives.
+  [[nodiscard]] Automation object(const std::string& property);
+  [[nodiscard]] const ComPointer<IDispatch>& dispatch() const noexcept { return object_; }
   void put(const std::string& property, const Value& value);
 
  private:

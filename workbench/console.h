@@ -1,4 +1,4 @@
-// Where an unattended run leaves its words: the standard error of whoever started it, if there is one.
+// The standard error of whoever started the program, if there is one.
 #pragma once
 
 #include <string_view>

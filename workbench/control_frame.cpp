@@ -14,7 +14,7 @@ HRESULT ControlFrame::GetWindow(HWND* window) {
   return comBarrier([&]() -> HRESULT {
     if (window == nullptr) return E_POINTER;
     if (owner_ == nullptr) return E_UNEXPECTED;
-    *window = owner_->place().parentWindow();
+    *window = owner_->place().frameWindow();
     return S_OK;
   });
 }

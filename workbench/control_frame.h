@@ -1,5 +1,5 @@
 // The in-place frame: the program's window as an active control sees it. Panels bring no menus and no tool
-// bars.
+// bars, so the window of their own in it need not be known as a document's.
 #pragma once
 
 #include <oleidl.h>

@@ -13,8 +13,6 @@ class ControlOwner {
   [[nodiscard]] virtual PanelPlace& place() = 0;
   // The object that gets the keys first; null when there is none.
   virtual void activeObject(IOleInPlaceActiveObject* object) = 0;
-  [[nodiscard]] virtual bool visible() = 0;
-  virtual void visible(bool visible) = 0;
   // Puts the control's window where the place says.
   virtual void layOut() = 0;
 

@@ -88,11 +88,11 @@ HRESULT ControlSite::GetWindowContext(IOleInPlaceFrame** frame, IOleInPlaceUIWin
     if (owner_ == nullptr) return E_UNEXPECTED;
     *place = *clip = owner_->place().panelRect();
     const HACCEL accelerators = owner_->place().acceleratorTable();
-    info->fMDIApp = FALSE;
-    info->hwndFrame = owner_->place().parentWindow();
+    info->fMDIApp = TRUE;
+    info->hwndFrame = owner_->place().frameWindow();
     info->haccel = accelerators;
     info->cAccelEntries = static_cast<UINT>(CopyAcceleratorTableW(accelerators, nullptr, 0));
-    // The document window is the frame's own: there is none to hand out beside it.
+    // No tool bars are shared out, so there is no document window to ask for room.
     *frame = frame_.get();
     frame_->AddRef();
     return S_OK;

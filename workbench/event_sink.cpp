@@ -4,6 +4,7 @@
 
 #include <olectl.h>
 
+#include <cmath>
 #include <limits>
 
 #include "workbench/automation.h"
@@ -87,6 +88,8 @@ struct EventSink::Handler {
 const EventSink::Handler EventSink::kHandlers[] = {
     {L"frontPanelOp", 5, &EventSink::frontPanelOp},
     {L"frontPanelSet", 6, &EventSink::frontPanelSet},
+    {L"saveDisplaySettings", 4, &EventSink::saveDisplaySettings},
+    {L"saveSetup", 4, &EventSink::saveSetup},
 };
 
 EventSink::EventSink(PanelRequests& requests, const IID& id, ITypeInfo& events)
@@ -123,15 +126,29 @@ HRESULT EventSink::Invoke(DISPID member, REFIID, LCID, WORD, DISPPARAMS* paramet
 
 std::int32_t EventSink::frontPanelOp(VARIANT* arguments) {
   enum { kStatus, kArgument, kOperation, kPanelId, kHardwareId };
-  return requests_->frontPanelOp(numberOf(arguments[kHardwareId]), numberOf(arguments[kPanelId]),
-                                 shortOf(arguments[kOperation]));
+  const double argument = realOf(arguments[kArgument]);
+  return requests_->frontPanelOp({numberOf(arguments[kHardwareId]), numberOf(arguments[kPanelId])},
+                                 shortOf(arguments[kOperation]),
+                                 std::isnan(argument) ? -1 : numberOf(arguments[kArgument]));
 }
 
 std::int32_t EventSink::frontPanelSet(VARIANT* arguments) {
   enum { kStatus, kValue, kIndex, kParameterType, kPanelId, kHardwareId };
-  return requests_->frontPanelSet(numberOf(arguments[kHardwareId]), numberOf(arguments[kPanelId]),
+  return requests_->frontPanelSet({numberOf(arguments[kHardwareId]), numberOf(arguments[kPanelId])},
                                   shortOf(arguments[kParameterType]), shortOf(arguments[kIndex]),
                                   realOf(arguments[kValue]));
+}
+
+std::int32_t EventSink::saveDisplaySettings(VARIANT* arguments) {
+  enum { kStatus, kList, kPanelId, kHardwareId };
+  return requests_->saveDisplaySettings({numberOf(arguments[kHardwareId]), numberOf(arguments[kPanelId])},
+                                        arguments[kList]);
+}
+
+std::int32_t EventSink::saveSetup(VARIANT* arguments) {
+  enum { kStatus, kPanelId, kResourceId, kSetUpId };
+  return requests_->saveSetup(numberOf(arguments[kSetUpId]),
+                              {numberOf(arguments[kResourceId]), numberOf(arguments[kPanelId])});
 }
 
 EventConnection::EventConnection(IUnknown& control, PanelRequests& requests) {

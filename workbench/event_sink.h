@@ -35,6 +35,8 @@ class EventSink final : public ComObject<IDispatch> {
   [[nodiscard]] void* findInterface(REFIID id) noexcept override;
   [[nodiscard]] std::int32_t frontPanelOp(VARIANT* arguments);
   [[nodiscard]] std::int32_t frontPanelSet(VARIANT* arguments);
+  [[nodiscard]] std::int32_t saveDisplaySettings(VARIANT* arguments);
+  [[nodiscard]] std::int32_t saveSetup(VARIANT* arguments);
 
   PanelRequests* requests_;
   IID id_;

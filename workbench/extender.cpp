@@ -53,25 +53,43 @@ struct Extender::Property {
 
 namespace {
 
-// The panel fills the window, whose size is the user's: a panel that wants another place is heard and stays.
-constexpr auto kDocked = [](auto&, VARIANT& value) { Converted(value, VT_R8); };
+// A side, or the extent from one side to the other, that a panel asks for.
+template <LONG RECT::*low, LONG RECT::*high, bool isExtent>
+void putTwips(PanelPlace& place, VARIANT& value) {
+  const LONG pixels = pixelsFromTwips(Converted(value, VT_R8).value().dblVal);
+  RECT wanted = place.bounds();
+  const LONG extent = wanted.*high - wanted.*low;
+  if (!isExtent) wanted.*low = pixels;
+  wanted.*high = wanted.*low + (isExtent ? pixels : extent);
+  place.bounds(wanted);
+}
 
 }  // namespace
 
+// Places are counted in the program's window, extents are those of the panel's own window in it.
 const Extender::Property Extender::kProperties[] = {
     {L"Name", 1, [](Extender& self, VARIANT& result) { answer(result, self.name_); }, nullptr},
     {L"Left", 2, [](Extender& self, VARIANT& result) { answer(result, self.edgeTwips(&RECT::left)); },
-     kDocked},
-    {L"Top", 3, [](Extender& self, VARIANT& result) { answer(result, self.edgeTwips(&RECT::top)); }, kDocked},
+     [](Extender& self, VARIANT& value) {
+       putTwips<&RECT::left, &RECT::right, false>(self.owner_->place(), value);
+     }},
+    {L"Top", 3, [](Extender& self, VARIANT& result) { answer(result, self.edgeTwips(&RECT::top)); },
+     [](Extender& self, VARIANT& value) {
+       putTwips<&RECT::top, &RECT::bottom, false>(self.owner_->place(), value);
+     }},
     {L"Width", 4,
      [](Extender& self, VARIANT& result) { answer(result, self.extentTwips(&RECT::left, &RECT::right)); },
-     kDocked},
+     [](Extender& self, VARIANT& value) {
+       putTwips<&RECT::left, &RECT::right, true>(self.owner_->place(), value);
+     }},
     {L"Height", 5,
      [](Extender& self, VARIANT& result) { answer(result, self.extentTwips(&RECT::top, &RECT::bottom)); },
-     kDocked},
-    {L"Visible", 6, [](Extender& self, VARIANT& result) { answer(result, self.owner_->visible()); },
      [](Extender& self, VARIANT& value) {
-       self.owner_->visible(Converted(value, VT_BOOL).value().boolVal != VARIANT_FALSE);
+       putTwips<&RECT::top, &RECT::bottom, true>(self.owner_->place(), value);
+     }},
+    {L"Visible", 6, [](Extender& self, VARIANT& result) { answer(result, self.owner_->place().visible()); },
+     [](Extender& self, VARIANT& value) {
+       self.owner_->place().visible(Converted(value, VT_BOOL).value().boolVal != VARIANT_FALSE);
      }},
     {L"Caption", 7, [](Extender& self, VARIANT& result) { answer(result, self.caption_); },
      [](Extender& self, VARIANT& value) {
@@ -79,18 +97,20 @@ const Extender::Property Extender::kProperties[] = {
        self.caption_.assign(text.value().bstrVal, SysStringLen(text.value().bstrVal));
        self.owner_->place().panelCaption(self.caption_);
      }},
-    // 0 normal, 1 minimised, 2 maximised: a docked panel is always all of its window.
-    {L"ViewState", 8, [](Extender& self, VARIANT& result) { answer(result, self.viewState_); },
-     [](Extender& self, VARIANT& value) { self.viewState_ = Converted(value, VT_I4).value().lVal; }},
+    {L"ViewState", 8,
+     [](Extender& self, VARIANT& result) { answer(result, self.owner_->place().viewState()); },
+     [](Extender& self, VARIANT& value) {
+       self.owner_->place().viewState(Converted(value, VT_I4).value().lVal);
+     }},
 };
 
 LONG Extender::edgeTwips(LONG RECT::*edge) {
-  const RECT rect = owner_->place().panelRect();
+  const RECT rect = owner_->place().bounds();
   return twipsFromPixels(rect.*edge);
 }
 
 LONG Extender::extentTwips(LONG RECT::*low, LONG RECT::*high) {
-  const RECT rect = owner_->place().panelRect();
+  const RECT rect = owner_->place().bounds();
   return twipsFromPixels(rect.*high - rect.*low);
 }
 

@@ -31,7 +31,6 @@ class Extender final : public ComObject<IDispatch> {
   ControlOwner* owner_;
   std::wstring name_;
   std::wstring caption_;
-  LONG viewState_ = 0;
 };
 
 }  // namespace frontpanels::workbench

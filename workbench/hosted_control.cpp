@@ -8,13 +8,13 @@
 namespace frontpanels::workbench {
 
 HostedControl::HostedControl(const std::string& progId, const std::wstring& name, PanelPlace& place,
-                             PanelRequests& requests)
+                             PanelRequests& requests, const Properties* stored)
     : place_(place), site_(makeComObject<ControlSite>(static_cast<ControlOwner&>(*this), name)) {
   const ComPointer<IUnknown> control = createObject(progId);
   object_ = control.query<IOleObject>();
   if (!object_) throw HostFailure(progId + " is not a control");
   try {
-    siteAndInitialise(name);
+    siteAndInitialise(name, stored);
     events_.emplace(*control.get(), requests);
     activate();
   } catch (...) {
@@ -25,15 +25,30 @@ HostedControl::HostedControl(const std::string& progId, const std::wstring& name
 
 HostedControl::~HostedControl() { close(); }
 
-void HostedControl::siteAndInitialise(const std::wstring& name) {
+void HostedControl::siteAndInitialise(const std::wstring& name, const Properties* stored) {
   DWORD status = 0;
   object_->GetMiscStatus(DVASPECT_CONTENT, &status);
   const bool siteFirst = (status & OLEMISC_SETCLIENTSITEFIRST) != 0;
   if (siteFirst) check(object_->SetClientSite(site_.get()), "Giving the panel its site");
-  if (const auto persist = object_.query<IPersistStreamInit>())
-    check(persist->InitNew(), "Initialising the panel");
+  initialise(stored);
   if (!siteFirst) check(object_->SetClientSite(site_.get()), "Giving the panel its site");
   object_->SetHostNames(L"Front Panels workbench", name.c_str());
+}
+
+void HostedControl::initialise(const Properties* stored) {
+  const auto bag = object_.query<IPersistPropertyBag>();
+  if (stored != nullptr && bag)
+    return check(bag->Load(makeComObject<PropertyBag>(*stored).get(), nullptr), "Restoring the panel");
+  if (const auto persist = object_.query<IPersistStreamInit>())
+    check(persist->InitNew(), "Initialising the panel");
+}
+
+Properties HostedControl::properties() const {
+  const auto persist = object_.query<IPersistPropertyBag>();
+  if (!persist) return {};
+  const auto bag = makeComObject<PropertyBag>(Properties{});
+  check(persist->Save(bag.get(), TRUE, TRUE), "Asking the panel for what it keeps");
+  return bag->properties();
 }
 
 void HostedControl::activate() {
@@ -76,10 +91,10 @@ bool HostedControl::translateAccelerator(MSG& message) {
   return alive && alive->TranslateAccelerator(&message) == S_OK;
 }
 
-void HostedControl::visible(bool visible) {
-  if (visible == visible_) return;
-  visible_ = visible;
-  check(doVerb(visible ? OLEIVERB_SHOW : OLEIVERB_HIDE), "Showing or hiding the panel");
+// Beside another panel it has no keys, no border and no focus.
+void HostedControl::documentActivated(bool active) {
+  if (activeObject_) activeObject_->OnDocWindowActivate(active);
+  if (!active && inPlace_) inPlace_->UIDeactivate();
 }
 
 void HostedControl::close() noexcept {

@@ -12,15 +12,17 @@
 #include "workbench/control_owner.h"
 #include "workbench/control_site.h"
 #include "workbench/event_sink.h"
+#include "workbench/property_bag.h"
 
 namespace frontpanels::workbench {
 
 class HostedControl final : private ControlOwner {
  public:
-  // `name` is what the container calls the control. Raises `NotRegistered`, or a failure that names the step;
-  // what was set up until then is undone.
+  // `name` is what the container calls the control, `stored` what it kept with its form; without that it
+  // begins anew. Raises `NotRegistered`, or a failure that names the step; what was set up until then is
+  // undone.
   HostedControl(const std::string& progId, const std::wstring& name, PanelPlace& place,
-                PanelRequests& requests);
+                PanelRequests& requests, const Properties* stored);
   HostedControl(const HostedControl&) = delete;
   HostedControl& operator=(const HostedControl&) = delete;
   ~HostedControl();
@@ -30,8 +32,11 @@ class HostedControl final : private ControlOwner {
   void layOut() override;
   // Gives it the keyboard.
   void focus();
-  // The program's window has become active, or no longer is.
+  // The program's window has become active, or no longer is; the same for the panel's own in it.
   void frameActivated(bool active);
+  void documentActivated(bool active);
+  // What is to be kept with the form.
+  [[nodiscard]] Properties properties() const;
   // True when the control has dealt with the key.
   [[nodiscard]] bool translateAccelerator(MSG& message);
 
@@ -40,10 +45,9 @@ class HostedControl final : private ControlOwner {
   void activeObject(IOleInPlaceActiveObject* object) override {
     activeObject_ = ComPointer<IOleInPlaceActiveObject>(object);
   }
-  [[nodiscard]] bool visible() override { return visible_; }
-  void visible(bool visible) override;
 
-  void siteAndInitialise(const std::wstring& name);
+  void siteAndInitialise(const std::wstring& name, const Properties* stored);
+  void initialise(const Properties* stored);
   void activate();
   [[nodiscard]] HRESULT doVerb(LONG verb);
   void close() noexcept;
@@ -54,7 +58,6 @@ class HostedControl final : private ControlOwner {
   ComPointer<IOleInPlaceObject> inPlace_;
   ComPointer<IOleInPlaceActiveObject> activeObject_;
   std::optional<EventConnection> events_;
-  bool visible_ = true;
 };
 
 }  // namespace frontpanels::workbench

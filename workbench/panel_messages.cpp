@@ -6,13 +6,13 @@ PanelMessages::PanelMessages() : diagnostics_(Automation::create("FrontPanels.Di
   diagnostics_.put("ShowMessages", false);
 }
 
-std::optional<std::string> PanelMessages::takeLatest() {
+std::vector<std::string> PanelMessages::takeAll() {
   const std::int32_t count = diagnostics_.number("Count");
-  if (count == 0) return std::nullopt;
-  std::string latest = diagnostics_.text("Message", {count - 1});
+  std::vector<std::string> messages;
+  for (std::int32_t i = 0; i < count; ++i) messages.push_back(diagnostics_.text("Message", {i}));
   // Cleared, so that a day of sweeps with a message each does not pile up.
-  diagnostics_.call("Clear", {});
-  return latest;
+  if (count > 0) diagnostics_.call("Clear", {});
+  return messages;
 }
 
 }  // namespace frontpanels::workbench

@@ -1,9 +1,8 @@
-// The messages of the panels: kept and shown in the status bar instead of boxes, which would stop the play.
+// The messages of the panels: kept and listed instead of boxes, which would stop the play.
 #pragma once
 
-#include <cstdint>
-#include <optional>
 #include <string>
+#include <vector>
 
 #include "workbench/automation.h"
 
@@ -13,8 +12,8 @@ class PanelMessages {
  public:
   PanelMessages();
 
-  // The latest message that came since the last call.
-  [[nodiscard]] std::optional<std::string> takeLatest();
+  // Those that came since the last call, in their order.
+  [[nodiscard]] std::vector<std::string> takeAll();
 
  private:
   Automation diagnostics_;

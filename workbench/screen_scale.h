@@ -3,6 +3,9 @@
 
 #include <windows.h>
 
+#include <algorithm>
+#include <cmath>
+
 namespace frontpanels::workbench {
 
 // Dots an inch; 96 where no screen tells.
@@ -11,6 +14,13 @@ namespace frontpanels::workbench {
 [[nodiscard]] inline LONG twipsFromPixels(LONG pixels) noexcept {
   constexpr int kTwipsAnInch = 1440;
   return MulDiv(pixels, kTwipsAnInch, screenDpi());
+}
+
+[[nodiscard]] inline LONG pixelsFromTwips(double twips) noexcept {
+  constexpr double kTwipsAnInch = 1440;
+  constexpr double kFarthest = 32767;  // as far as windows are placed
+  const double pixels = twips * screenDpi() / kTwipsAnInch;
+  return std::lround(std::clamp(pixels, -kFarthest, kFarthest));
 }
 
 // Hundredths of a millimetre.

@@ -1,44 +1,33 @@
-// The host's part for a spectrum panel: identity, periods, caption, trace, show; then the sweeps.
+// The host's part for a spectrum panel: its receiver, its trace, the sweeps.
 #pragma once
 
-#include <windows.h>
-
-#include <cstdint>
-#include <string>
-
 #include "sources/receiver.h"
-#include "workbench/automation.h"
-#include "workbench/hosted_control.h"
+#include "workbench/panel.h"
 
 namespace frontpanels::workbench {
 
-class SpectrumPanel {
+class SpectrumPanel final : public Panel {
  public:
-  static constexpr const char* kProgId = "FrontPanels.SpectrumView";
+  SpectrumPanel(PanelFrame& frame, PanelListener& listener, const StoredPanel* stored);
 
-  // Raises `NotRegistered`, or a failure that says what the panel refused.
-  SpectrumPanel(PanelPlace& place, PanelRequests& requests);
-  SpectrumPanel(const SpectrumPanel&) = delete;
-  SpectrumPanel& operator=(const SpectrumPanel&) = delete;
-  ~SpectrumPanel();
-
-  // Tells it what the receiver is set to.
-  void set(const ReceiverSetting& setting);
   // Retunes the panel when the range is another, and hands it the levels.
-  void show(const DisplaySweep& sweep);
-  // What the graph shows, as PNG.
-  void savePicture(const std::string& path);
-
-  [[nodiscard]] HostedControl& control() noexcept { return control_; }
+  void show(const Frame& frame) override;
+  void sourceChanged(const DriveSimulator* simulator) override;
+  void tune(DriveSimulator& simulator) const override;
+  // As it was shown last; without values before the first one.
+  [[nodiscard]] const DisplaySweep& shown() const noexcept { return shown_; }
 
  private:
-  void set(std::int16_t parameter, const char* meaning, const Value& value);
-  void operate(std::int16_t operation, const char* meaning, const Value& parameter);
+  bool request(std::int16_t code, std::int16_t index, double value) override;
+  bool requestDisplay(std::int32_t, bool) override { return false; }
+  [[nodiscard]] std::vector<ReceiverSetting> takeAnswers() override { return receiver_.takeAnswers(); }
+  void told(const ReceiverSetting& setting) override;
+  void appendOwn(std::vector<StoredSetting>&) const override {}
+  void tell(const ReceiverSetting& setting);
 
-  HostedControl control_;
-  Automation panel_;
-  Automation hub_;
+  Receiver receiver_;
   FrequencyRange told_;
+  DisplaySweep shown_;
 };
 
 }  // namespace frontpanels::workbench

@@ -2,109 +2,193 @@
 
 #include <windows.h>
 
-#include <commdlg.h>
-
 #include <algorithm>
-#include <chrono>
-#include <cstdio>
-#include <filesystem>
 #include <iterator>
 
 #include "framework/support/host_codes.h"
+#include "frontpanels_version.h"
 #include "platform/win32/utf16.h"
 #include "workbench/console.h"
 #include "workbench/failure.h"
+#include "workbench/program_files.h"
 #include "workbench/resource_ids.h"
-#include "workbench/window_picture.h"
 
 namespace frontpanels::workbench {
 namespace {
 
-// Operations that panels ask for.
-enum Operation : std::int16_t { kClose = 1, kSingleSweep = 2, kContinuousSweeps = 3, kStopSweeps = 4 };
-constexpr std::int32_t kDone = 0;
-constexpr std::int32_t kUnknownRequest = -1;
-constexpr std::int32_t kUnusableValue = -8;
-// Unattended there is nobody to watch: as fast as timers go.
-constexpr std::chrono::milliseconds kUnattendedPeriod{10};
-
-std::filesystem::path programFolder() {
-  std::wstring path(MAX_PATH, L'\0');
-  while (true) {
-    const DWORD length = GetModuleFileNameW(nullptr, path.data(), static_cast<DWORD>(path.size()));
-    if (length == 0) raiseLastError("Looking for the program's folder");
-    if (length < path.size()) return std::filesystem::path(path.substr(0, length)).parent_path();
-    path.resize(path.size() * 2);
-  }
-}
-
-std::string carriedRecording() {
-  return toUtf8((programFolder() / L"recordings" / L"fm_band.csv").wstring());
-}
-
-std::string fileName(const std::string& path) {
-  return toUtf8(std::filesystem::path(toUtf16(path)).filename().wstring());
-}
-
-const char* stateName(SweepPlayer::State state) {
-  switch (state) {
-    case SweepPlayer::State::Empty:
-      return "no recording";
-    case SweepPlayer::State::Paused:
-      return "paused";
-    case SweepPlayer::State::Playing:
-      return "playing";
-    case SweepPlayer::State::Ended:
-      return "at the end";
-  }
-  return "";
-}
+const char* const kHelp =
+    "Ctrl+O opens a recording, Ctrl+D a simulated drive.\n"
+    "F5 plays, F6 pauses, F7 takes one frame, Shift+F7 goes one back, F8 begins anew, Ctrl+G goes to the "
+    "slider, Ctrl+L plays in a loop.\n"
+    "F9 records what is played.\n\n"
+    "Ctrl+1 and Ctrl+2 open and close the panels, Ctrl+F6 goes to the next one, Ctrl+F4 closes it, Alt+- "
+    "opens "
+    "the menu of its window, Ctrl+P its own menu.\n"
+    "Ctrl+M shows the messages, Ctrl+S saves the settings.\n\n"
+    "In a graph: left and right move a marker, P and N go to peaks, D makes a delta marker.";
 
 }  // namespace
+
+// --- Commands
 
 struct Workbench::Command {
   UINT id;
   void (Workbench::*run)();
-  // Whether the menu offers it now.
+  // Whether the menu offers it now, and shows a check mark.
   bool (*offered)(const Workbench& self);
+  bool (*checked)(const Workbench& self);
+};
+
+// Those of a row of the menu that stand for one number each, from 0.
+struct Workbench::Numbered {
+  UINT first;
+  UINT last;
+  void (Workbench::*run)(int number);
+  bool (*offered)(const Workbench& self, int number);
+  bool (*checked)(const Workbench& self, int number);
 };
 
 namespace {
 
 constexpr auto kAlways = [](const auto&) { return true; };
+constexpr auto kNever = [](const auto&) { return false; };
+constexpr auto kAnyNumber = [](const auto&, int) { return true; };
+constexpr auto kNoNumber = [](const auto&, int) { return false; };
 
 }  // namespace
 
 const Workbench::Command Workbench::kCommands[] = {
-    {IDM_FILE_OPEN, &Workbench::askForRecording, kAlways},
-    {IDM_PANELS_SPECTRUM, &Workbench::togglePanel, kAlways},
-    {IDM_PANELS_CLOSE, &Workbench::closePanel, kAlways},
+    {IDM_FILE_OPEN, &Workbench::askForRecording, kAlways, kNever},
+    {IDM_FILE_SIMULATE, &Workbench::simulateAgain, kAlways,
+     [](const Workbench& self) { return self.simulator_ != nullptr; }},
+    {IDM_FILE_SIMULATE_OTHER, &Workbench::simulateOther, kAlways, kNever},
+    {IDM_FILE_RECORD, &Workbench::toggleRecording,
+     [](const Workbench& self) { return self.player_.state() != FramePlayer::State::Empty; },
+     [](const Workbench& self) { return self.capture_.has_value(); }},
+    {IDM_EXPORT_PICTURE, &Workbench::exportPicture,
+     [](const Workbench& self) { return self.activePanel() != nullptr; }, kNever},
+    {IDM_EXPORT_WINDOW, &Workbench::exportWindow, kAlways, kNever},
+    {IDM_EXPORT_VALUES, &Workbench::exportValues,
+     [](const Workbench& self) { return self.activePanel() != nullptr; }, kNever},
+    {IDM_EXPORT_REPORT, &Workbench::exportReport, [](const Workbench& self) { return !self.panels_.empty(); },
+     kNever},
+    {IDM_FILE_EXIT, &Workbench::quit, kAlways, kNever},
+    {IDM_PANELS_SIDE_BY_SIDE, &Workbench::sideBySide, kAlways,
+     [](const Workbench& self) { return self.window_.arrangement() == Arrangement::SideBySide; }},
+    {IDM_PANELS_STACKED, &Workbench::stacked, kAlways,
+     [](const Workbench& self) { return self.window_.arrangement() == Arrangement::Stacked; }},
+    {IDM_PANELS_NEXT, &Workbench::nextPanel, [](const Workbench& self) { return self.panels_.size() > 1; },
+     kNever},
+    {IDM_PANELS_CLOSE, &Workbench::closeActive,
+     [](const Workbench& self) { return self.activePanel() != nullptr; }, kNever},
+    {IDM_PANELS_POP_UP, &Workbench::popUpOfActive,
+     [](const Workbench& self) { return self.activePanel() != nullptr; }, kNever},
+    {IDM_PANELS_PLAYBACK, &Workbench::playbackOnly,
+     [](const Workbench& self) {
+       const Panel* const active = self.activePanel();
+       return active != nullptr && !active->isPlayback();
+     },
+     [](const Workbench& self) {
+       const Panel* const active = self.activePanel();
+       return active != nullptr && active->isPlayback();
+     }},
+    {IDM_PANELS_MESSAGES, &Workbench::toggleMessages, kAlways,
+     [](const Workbench& self) { return self.window_.messagesShown(); }},
+    {IDM_PANELS_CLEAR_MESSAGES, &Workbench::clearMessages, kAlways, kNever},
     {IDM_SOURCE_PLAY, &Workbench::play,
      [](const Workbench& self) {
-       return self.player_.state() == SweepPlayer::State::Paused ||
-              self.player_.state() == SweepPlayer::State::Ended;
-     }},
+       return self.player_.state() == FramePlayer::State::Paused ||
+              self.player_.state() == FramePlayer::State::Ended;
+     },
+     kNever},
     {IDM_SOURCE_PAUSE, &Workbench::pause,
-     [](const Workbench& self) { return self.player_.state() == SweepPlayer::State::Playing; }},
+     [](const Workbench& self) { return self.player_.state() == FramePlayer::State::Playing; }, kNever},
     {IDM_SOURCE_STEP, &Workbench::step,
      [](const Workbench& self) {
-       return self.player_.state() == SweepPlayer::State::Paused ||
-              self.player_.state() == SweepPlayer::State::Playing;
-     }},
+       return self.player_.state() == FramePlayer::State::Paused ||
+              self.player_.state() == FramePlayer::State::Playing;
+     },
+     kNever},
+    {IDM_SOURCE_STEP_BACK, &Workbench::stepBack,
+     [](const Workbench& self) { return self.player_.frameNumber() > 1; }, kNever},
     {IDM_SOURCE_RESTART, &Workbench::restart,
-     [](const Workbench& self) { return self.player_.state() != SweepPlayer::State::Empty; }},
-    {IDM_HELP_ABOUT, &Workbench::about, kAlways},
-    {IDM_SINGLE_SWEEP, &Workbench::single, kAlways},
-    {IDM_ANSWER_PANEL, &Workbench::answerPanel, kAlways},
+     [](const Workbench& self) { return self.player_.state() != FramePlayer::State::Empty; }, kNever},
+    {IDM_SOURCE_LOOP, &Workbench::toggleLoop, kAlways,
+     [](const Workbench& self) { return self.player_.loop(); }},
+    {IDM_SOURCE_GO_TO, &Workbench::goTo,
+     [](const Workbench& self) { return self.player_.frameCount().has_value(); }, kNever},
+    {IDM_SETTINGS_SAVE, &Workbench::saveSettingsNow, kAlways, kNever},
+    {IDM_SETTINGS_RESTORE, &Workbench::restoreSettings,
+     [](const Workbench& self) { return !self.panels_.empty(); }, kNever},
+    {IDM_IMPORT_CELLS, &Workbench::importCells,
+     [](const Workbench& self) { return self.panel(PanelKind::Pilots) != nullptr; }, kNever},
+    {IDM_HELP_KEYS, &Workbench::keys, kAlways, kNever},
+    {IDM_HELP_ABOUT, &Workbench::about, kAlways, kNever},
+    {IDM_LATER, &Workbench::doLater, kAlways, kNever},
 };
 
-Workbench::Workbench(Options options, TextFiles& files)
-    : options_(std::move(options)), player_(files), window_(*this) {}
+const Workbench::Numbered Workbench::kNumbered[] = {
+    {IDM_PANELS_FIRST, IDM_PANELS_LAST, &Workbench::togglePanel, kAnyNumber,
+     [](const Workbench& self, int number) {
+       return self.panel(kPanelKinds[static_cast<std::size_t>(number)].kind) != nullptr;
+     }},
+    {IDM_RATE_FIRST, IDM_RATE_LAST, &Workbench::rate, kAnyNumber,
+     [](const Workbench& self, int number) { return self.rate_ == static_cast<std::size_t>(number); }},
+    {IDM_SAVE_SET_UP_FIRST, IDM_SAVE_SET_UP_LAST, &Workbench::saveSetUp,
+     [](const Workbench& self, int) { return !self.panels_.empty(); },
+     [](const Workbench& self, int number) { return self.hasSetUp(number); }},
+    {IDM_RESTORE_SET_UP_FIRST, IDM_RESTORE_SET_UP_LAST, &Workbench::restoreSetUp,
+     [](const Workbench& self, int number) { return self.hasSetUp(number) && !self.panels_.empty(); },
+     kNoNumber},
+    {IDM_POP_UP_FIRST, IDM_POP_UP_LAST, &Workbench::popUpClick, kAnyNumber, kNoNumber},
+};
 
-// The panel goes before the window that it lives in.
-Workbench::~Workbench() { closePanel(); }
+void Workbench::command(UINT id) {
+  if (id == IDM_CANCEL) {
+    cancelled_ = true;
+    return;
+  }
+  // While a recording is read the window lives, but what it is asked for comes after that; ending ends both.
+  if (reading_ && id != IDM_LATER) {
+    cancelled_ = cancelled_ || id == IDM_FILE_EXIT;
+    if (id == IDM_FILE_EXIT) later([this] { quit(); });
+    return;
+  }
+  for (const Command& row : kCommands)
+    if (row.id == id && row.offered(*this)) (this->*row.run)();
+  for (const Numbered& row : kNumbered) {
+    const int number = static_cast<int>(id) - static_cast<int>(row.first);
+    if (id >= row.first && id <= row.last && row.offered(*this, number)) (this->*row.run)(number);
+  }
+  if (!reading_) showMessages();
+}
+
+void Workbench::menuOpening(HMENU menu) {
+  const auto show = [menu](UINT id, bool offered, bool checked) {
+    EnableMenuItem(menu, id, MF_BYCOMMAND | (offered ? MF_ENABLED : MF_GRAYED));
+    CheckMenuItem(menu, id, MF_BYCOMMAND | (checked ? MF_CHECKED : MF_UNCHECKED));
+  };
+  for (const Command& row : kCommands) show(row.id, !reading_ && row.offered(*this), row.checked(*this));
+  for (const Numbered& row : kNumbered) {
+    if (row.first == IDM_POP_UP_FIRST) continue;
+    for (UINT id = row.first; id <= row.last; ++id) {
+      const int number = static_cast<int>(id - row.first);
+      show(id, !reading_ && row.offered(*this, number), row.checked(*this, number));
+    }
+  }
+}
+
+// --- Beginning and ending
+
+Workbench::Workbench(Options options, TextFiles& files)
+    : options_(std::move(options)), files_(files), window_(*this) {}
+
+// The panels go before the window that they live in.
+Workbench::~Workbench() { panels_.clear(); }
 
 ExitCode Workbench::run(int showCommand) {
+  loadSettings();
+  placeWindow();
   window_.show(showCommand);
   showStatus();
   const bool started = start();
@@ -121,244 +205,235 @@ bool Workbench::start() {
     } catch (const NotRegistered&) {
       whole = false;
       exitCode_ = ExitCode::NotRegistered;
-      report(currentFailure(), true);
+      report(currentFailure());
     } catch (...) {
       whole = false;
-      exitCode_ = ExitCode::Failed;
-      report(currentFailure(), true);
+      if (exitCode_ == ExitCode::Done) exitCode_ = ExitCode::Failed;
+      report(currentFailure());
     }
   };
-  attempt([this] { openPanel(); });
-  if (!options_.exit || whole)
-    attempt([this] { openRecording(options_.recording.empty() ? carriedRecording() : options_.recording); });
+  attempt([this] { openFirstSource(); });
+  for (const PanelKind kind : firstPanels())
+    if (exitCode_ != ExitCode::NotRegistered) attempt([this, kind] { openPanel(kind); });
+  attempt([this] {
+    if (!options_.record.empty()) record(options_.record);
+  });
+  if (whole) attempt([this] { play(); });
   return whole;
 }
 
-// --- Commands
-
-void Workbench::command(UINT id) {
-  if (id == IDM_FILE_EXIT) return end(ExitCode::Done);
-  if (id >= IDM_RATE_FIRST && id <= IDM_RATE_LAST) return rate(id - IDM_RATE_FIRST);
-  const auto* const found = std::find_if(std::begin(kCommands), std::end(kCommands),
-                                         [id](const Command& row) { return row.id == id; });
-  if (found != std::end(kCommands)) (this->*found->run)();
-}
-
-void Workbench::menuOpening(HMENU menu) {
-  for (const Command& row : kCommands)
-    EnableMenuItem(menu, row.id, MF_BYCOMMAND | (row.offered(*this) ? MF_ENABLED : MF_GRAYED));
-  CheckMenuItem(menu, IDM_PANELS_SPECTRUM, MF_BYCOMMAND | (panel_ ? MF_CHECKED : MF_UNCHECKED));
-  CheckMenuRadioItem(menu, IDM_RATE_FIRST, IDM_RATE_LAST, IDM_RATE_FIRST + static_cast<UINT>(rate_),
-                     MF_BYCOMMAND);
-}
-
-void Workbench::askForRecording() {
-  wchar_t path[32768] = L"";
-  OPENFILENAMEW dialog{};
-  dialog.lStructSize = sizeof dialog;
-  dialog.hwndOwner = window_.handle();
-  dialog.lpstrFilter = L"Recordings (*.csv; *.txt)\0*.csv;*.txt\0All files (*.*)\0*.*\0";
-  dialog.lpstrFile = path;
-  dialog.nMaxFile = static_cast<DWORD>(std::size(path));
-  dialog.lpstrTitle = L"Open recording";
-  dialog.Flags = OFN_FILEMUSTEXIST | OFN_PATHMUSTEXIST | OFN_HIDEREADONLY | OFN_NOCHANGEDIR;
-  if (GetOpenFileNameW(&dialog)) openRecording(toUtf8(path));
-}
-
-void Workbench::openRecording(const std::string& path) {
-  player_.open(path);
-  receiver_.showWholeSweeps();
-  window_.status(StatusPart::Message, "");
-  play();
-}
-
-void Workbench::togglePanel() { panel_ ? closePanel() : openPanel(); }
-
-void Workbench::openPanel() {
-  // Asked first: of the library's classes the panel is the one that the user knows.
-  registeredClass(SpectrumPanel::kProgId);
-  if (!messages_) messages_.emplace();
-  panel_ = std::make_unique<SpectrumPanel>(window_, static_cast<PanelRequests&>(*this));
-  window_.occupy(&panel_->control());
-  for (const ReceiverSetting& setting : receiver_.settings()) panel_->set(setting);
-  if (player_.sweepNumber() > 0) showSweep();
-  showMessages();
-}
-
-void Workbench::closePanel() {
-  window_.occupy(nullptr);
-  panel_.reset();
-}
-
-void Workbench::play() {
-  player_.play();
-  applyState();
-}
-
-void Workbench::pause() {
-  player_.pause();
-  applyState();
-}
-
-void Workbench::step() {
-  player_.pause();
-  applyState();
-  takeSweep();
-}
-
-// At the end of a recording it begins anew, as playing does.
-void Workbench::single() {
-  player_.pause();
-  applyState();
-  if (takeSweep()) return;
-  player_.play();
-  step();
-}
-
-void Workbench::restart() {
-  player_.restart();
-  receiver_.showWholeSweeps();
-  applyState();
-}
-
-void Workbench::rate(std::size_t index) {
-  rate_ = index;
-  applyState();
-}
-
-void Workbench::about() {
-  box("Front Panels workbench 0.1.0\n\nA host for the Front Panels controls: it plays recordings of "
-      "rtl_power and "
-      "hackrf_sweep into the spectrum panel.\n\nF5 plays, F6 pauses, F7 takes one sweep, F8 begins anew.",
-      MB_ICONINFORMATION);
-}
-
-// --- Playing
-
-void Workbench::applyState() {
-  if (player_.state() == SweepPlayer::State::Playing) {
-    window_.startTicking(options_.exit ? kUnattendedPeriod
-                                       : std::chrono::milliseconds(1000 / kSweepsASecond.at(rate_)));
-  } else {
-    window_.stopTicking();
+std::vector<PanelKind> Workbench::firstPanels() const {
+  if (options_.panels) return *options_.panels;
+  std::vector<PanelKind> panels;
+  const bool asBefore =
+      options_.recording.empty() && !options_.simulate && settings_.find("window") != nullptr;
+  for (const PanelKindRow& row : kPanelKinds) {
+    const SettingsSection* const kept = settings_.find(panelWord(row.kind));
+    const FrameSource* const source = player_.source();
+    const bool wanted = row.kind == PanelKind::Spectrum ? source == nullptr || source->hasSweeps()
+                                                        : source != nullptr && source->hasPilots();
+    if (asBefore ? kept != nullptr && kept->get<bool>("open").value_or(false) : wanted)
+      panels.push_back(row.kind);
   }
-  showStatus();
+  return panels;
 }
 
-void Workbench::tick() {
-  // A tick may still wait in the queue when the play has been stopped.
-  if (player_.state() != SweepPlayer::State::Playing) return;
-  const bool more = takeSweep() && sweepsTaken_ != options_.sweeps;
-  if (more) return;
-  player_.pause();
-  applyState();
-  if (options_.exit) finishUnattended();
-}
-
-bool Workbench::takeSweep() {
-  if (!player_.step()) {
-    applyState();
-    if (const std::string problems = player_.recording()->problemReport(); !problems.empty())
-      report(problems, false);
-    return false;
+void Workbench::openFirstSource() {
+  if (options_.simulate) return simulate(*options_.simulate);
+  if (!options_.recording.empty()) return openRecording(options_.recording);
+  if (const SettingsSection* const source = settings_.find("source")) {
+    if (const auto seed = source->get<std::int32_t>("simulated drive"); seed && *seed >= 0)
+      return simulate(static_cast<std::uint64_t>(*seed));
+    if (const auto recording = source->get<std::string>("recording")) return openRecording(*recording);
   }
-  ++sweepsTaken_;
-  showSweep();
-  showStatus();
-  showMessages();
-  takeScreenshots();
-  return true;
+  openRecording(carriedRecording());
 }
 
-void Workbench::showSweep() {
-  const DisplaySweep& sweep = receiver_.receive(player_.sweep());
-  if (panel_ && sweep.count > 0) panel_->show(sweep);
+void Workbench::quit() {
+  stopRecording();
+  saveSettings();
+  end(exitCode_);
 }
-
-// As a receiver does once it is set: tells the panel, and shows what it receives now. Where nothing was taken
-// yet the next sweep will.
-void Workbench::answerPanel() {
-  bool retuned = false;
-  for (const ReceiverSetting& answer : receiver_.takeAnswers()) {
-    if (panel_) panel_->set(answer);
-    retuned = retuned || answer.code == kCenterFrequencyParameter || answer.code == kSpanParameter;
-  }
-  if (!retuned) return;
-  showSweep();
-  showMessages();
-  takeScreenshots();
-}
-
-void Workbench::showMessages() {
-  if (const std::optional<std::string> latest = messages_->takeLatest()) report(*latest, false);
-}
-
-void Workbench::takeScreenshots() {
-  if (options_.screenshotFolder.empty() || player_.sweepNumber() == 0) return;
-  const std::filesystem::path folder = std::filesystem::absolute(toUtf16(options_.screenshotFolder));
-  std::filesystem::create_directories(folder);
-  wchar_t number[24];
-  std::swprintf(number, std::size(number), L"%04llu.png",
-                static_cast<unsigned long long>(player_.sweepNumber()));
-  saveWindowPicture(window_.handle(), toUtf8((folder / (std::wstring(L"window-") + number)).wstring()));
-  if (panel_) panel_->savePicture(toUtf8((folder / (std::wstring(L"spectrum-") + number)).wstring()));
-}
-
-// --- Ending, and telling the user
 
 void Workbench::finishUnattended() {
-  if (sweepsTaken_ == 0) {
-    report(player_.recording()->path() + ": there is no sweep in it", false);
-    return end(ExitCode::Failed);
+  if (framesTaken_ == 0) {
+    report(player_.source()->name() + ": there is no sweep in it");
+    exitCode_ = ExitCode::Failed;
   }
-  end(exitCode_);
+  quit();
 }
 
 void Workbench::end(ExitCode code) noexcept { PostQuitMessage(static_cast<int>(code)); }
 
-// --- What the panel asks for. It is still inside its own event: all but stopping is done after it.
+// --- Panels
 
-std::int32_t Workbench::frontPanelOp(std::int32_t, std::int32_t, std::int16_t operation) {
-  const bool empty = player_.state() == SweepPlayer::State::Empty;
-  const auto afterwards = [this](UINT id) {
-    return PostMessageW(window_.handle(), WM_COMMAND, id, 0) ? kDone : kUnknownRequest;
-  };
+Panel* Workbench::panel(PanelKind kind) const {
+  const auto found = std::find_if(panels_.begin(), panels_.end(),
+                                  [kind](const auto& panel) { return panel->kind() == kind; });
+  return found == panels_.end() ? nullptr : found->get();
+}
+
+Panel* Workbench::activePanel() const {
+  const PanelWindow* const active = window_.activePanel();
+  const auto found = std::find_if(panels_.begin(), panels_.end(),
+                                  [active](const auto& panel) { return &panel->window() == active; });
+  return found == panels_.end() ? nullptr : found->get();
+}
+
+void Workbench::togglePanel(int number) {
+  const PanelKind kind = kPanelKinds[static_cast<std::size_t>(number)].kind;
+  panel(kind) != nullptr ? closePanel(kind) : openPanel(kind);
+}
+
+void Workbench::openPanel(PanelKind kind) {
+  if (panel(kind) != nullptr) return;
+  // Asked first: of the library's classes the panel is the one that the user knows.
+  registeredClass(panelKind(kind).progId);
+  if (!messages_) messages_.emplace();
+  const std::optional<StoredPanel> stored = storedPanel(kind);
+  Panel& opened =
+      *panels_.emplace_back(workbench::openPanel(kind, window_, *this, stored ? &*stored : nullptr));
+  window_.panelsChanged();
+  opened.sourceChanged(simulator_);
+  if (capture_) opened.logging(true);
+  tune();
+  showFrame();
+  showMessages();
+}
+
+void Workbench::closePanel(PanelKind kind) {
+  Panel* const closed = panel(kind);
+  if (closed == nullptr) return;
+  keepPanel(*closed);
+  if (SettingsSection* const kept = settings_.find(panelWord(kind))) kept->set("open", false);
+  std::erase_if(panels_, [closed](const auto& panel) { return panel.get() == closed; });
+  window_.panelsChanged();
+}
+
+void Workbench::closeActive() {
+  if (const Panel* const active = activePanel()) closePanel(active->kind());
+}
+
+void Workbench::playbackOnly() {
+  if (Panel* const active = activePanel()) active->playback();
+}
+
+void Workbench::toggleMessages() {
+  const bool shown = !window_.messagesShown();
+  window_.showMessages(shown);
+  if (shown) window_.messages().focus();
+}
+
+void Workbench::clearMessages() {
+  window_.messages().clear();
+  window_.status(StatusPart::Message, "");
+}
+
+// --- What the panels ask for. They may still be inside an event: all but stopping is done after it.
+
+void Workbench::later(std::function<void()> work) {
+  later_.push_back(std::move(work));
+  if (!PostMessageW(window_.handle(), WM_COMMAND, IDM_LATER, 0))
+    raiseLastError("Putting off what a panel asked for");
+}
+
+void Workbench::doLater() {
+  const std::vector<std::function<void()>> works = std::exchange(later_, {});
+  for (const auto& work : works) work();
+}
+
+void Workbench::closeAsked(PanelKind kind) {
+  later([this, kind] { closePanel(kind); });
+}
+
+void Workbench::answerWanted(PanelKind kind) {
+  later([this, kind] { answer(kind); });
+}
+
+bool Workbench::operationAsked(PanelKind kind, std::int16_t operation) {
+  const bool empty = player_.state() == FramePlayer::State::Empty;
   switch (operation) {
-    case kClose:
-      return afterwards(IDM_PANELS_CLOSE);
-    case kSingleSweep:
-      return empty ? kUnknownRequest : afterwards(IDM_SINGLE_SWEEP);
-    case kContinuousSweeps:
-      return empty ? kUnknownRequest : afterwards(IDM_SOURCE_PLAY);
-    case kStopSweeps:
+    case kSingleSweepOperation:
+      if (!empty) later([this] { single(); });
+      return !empty;
+    case kContinuousSweepOperation:
+      if (!empty) later([this] { play(); });
+      return !empty;
+    case kStopSweepOperation:
       pause();
       // What was asked for before it and has not begun is stopped as well.
-      return afterwards(IDM_SOURCE_PAUSE);
+      later([this] { pause(); });
+      return true;
+    case QUILL_VFP_SAVE:
+      later([this, kind] {
+        if (Panel* const saved = panel(kind)) saved->save();
+        saveSettingsNow();
+      });
+      return true;
     default:
-      return kUnknownRequest;
+      return false;
   }
 }
 
-std::int32_t Workbench::frontPanelSet(std::int32_t, std::int32_t, std::int16_t parameterType, std::int16_t,
-                                      double value) {
-  const bool taken = receiver_.request(parameterType, value);
-  const BOOL answered = PostMessageW(window_.handle(), WM_COMMAND, IDM_ANSWER_PANEL, 0);
-  return taken && answered ? kDone : kUnusableValue;
+// As a receiver does once it is set: tells the panel, and shows what it receives now. Where nothing was taken
+// yet the next frame will.
+void Workbench::answer(PanelKind kind) {
+  Panel* const asking = panel(kind);
+  if (asking == nullptr || !asking->answer()) return;
+  receiveAnew();
+  showMessages();
+  takeScreenshots();
 }
 
-void Workbench::showStatus() {
-  const SweepRecording* const recording = player_.recording();
-  if (recording != nullptr)
-    window_.status(StatusPart::Source,
-                   fileName(recording->path()) + " (" + sweepFormatName(recording->format()) + ")");
-  if (player_.sweepNumber() == 0) {
-    window_.status(StatusPart::Sweep, "");
-  } else {
-    window_.status(StatusPart::Sweep,
-                   "Sweep " + std::to_string(player_.sweepNumber()) + ", " + player_.sweepTime());
+void Workbench::popUpAsked(PanelKind kind, POINT onScreen) {
+  Panel* const asked = panel(kind);
+  if (asked == nullptr) return;
+  struct DestroyMenuOf {
+    void operator()(HMENU menu) const noexcept { DestroyMenu(menu); }
+  };
+  const std::unique_ptr<std::remove_pointer_t<HMENU>, DestroyMenuOf> menu(CreatePopupMenu());
+  if (!menu) raiseLastError("Making the panel's menu");
+  for (const PopUpItem& item : asked->popUpItems()) {
+    const UINT state = (item.checked ? MF_CHECKED : 0U) | (item.enabled ? 0U : MF_GRAYED);
+    AppendMenuW(menu.get(), MF_STRING | state, IDM_POP_UP_FIRST + static_cast<UINT>(item.id),
+                toUtf16(item.caption).c_str());
   }
-  const std::string rate = options_.exit ? "" : ", " + std::to_string(kSweepsASecond.at(rate_)) + " a second";
-  window_.status(StatusPart::Rate, stateName(player_.state()) + rate);
+  const auto chosen =
+      static_cast<UINT>(TrackPopupMenu(menu.get(), TPM_RETURNCMD | TPM_NONOTIFY | TPM_RIGHTBUTTON, onScreen.x,
+                                       onScreen.y, 0, window_.handle(), nullptr));
+  if (chosen == 0) return;
+  later([this, kind, chosen] {
+    if (Panel* const clicked = panel(kind))
+      clicked->popUpClick(static_cast<std::int16_t>(chosen - IDM_POP_UP_FIRST));
+  });
+}
+
+void Workbench::popUpOfActive() {
+  Panel* const active = activePanel();
+  if (active == nullptr) return;
+  POINT at{0, 0};
+  ClientToScreen(active->window().handle(), &at);
+  popUpAsked(active->kind(), at);
+}
+
+void Workbench::popUpClick(int item) {
+  if (Panel* const active = activePanel()) active->popUpClick(static_cast<std::int16_t>(item));
+}
+
+// --- Telling the user
+
+void Workbench::showMessages() {
+  if (!messages_) return;
+  for (const std::string& message : messages_->takeAll()) report(message);
+}
+
+// The list comes up by itself, since what it says may be the reason why nothing is seen; whoever has started
+// the program from a console reads it there as well.
+void Workbench::report(const std::string& message) {
+  window_.messages().add("Workbench", message);
+  window_.status(StatusPart::Message, message.substr(0, message.find_first_of("\r\n")));
+  writeError(message);
+  if (!options_.exit && !window_.messagesShown()) window_.showMessages(true);
 }
 
 // A play that fails once would fail at every tick.
@@ -367,20 +442,20 @@ void Workbench::failed(const std::string& message) noexcept {
     player_.pause();
     window_.stopTicking();
     showStatus();
-    report(message, true);
+    report(message);
   } catch (...) {
     writeError(message);
   }
   if (options_.exit) end(ExitCode::Failed);
 }
 
-void Workbench::report(const std::string& message, bool withBox) {
-  window_.status(StatusPart::Message, message.substr(0, message.find('\n')));
-  if (options_.exit) {
-    writeError(message);
-  } else if (withBox) {
-    box(message, MB_ICONWARNING);
-  }
+void Workbench::keys() { box(kHelp, MB_ICONINFORMATION); }
+
+void Workbench::about() {
+  box("Front Panels workbench " FRONTPANELS_VERSION_TEXT
+      "\n\nA host for the Front Panels controls: it plays recordings of receivers and a simulated drive into "
+      "the spectrum panel and the pilot panel.",
+      MB_ICONINFORMATION);
 }
 
 void Workbench::box(const std::string& message, UINT icon) {

@@ -1,23 +1,29 @@
-// The program: plays a recording into its panel at the user's command, or by itself and unattended.
+// The program: plays a recording or a simulated drive into its panels at the user's command, or by itself and
+// unattended; keeps what the panels hand back; exports what they show.
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <memory>
 #include <optional>
 #include <string>
+#include <vector>
 
+#include "hosting/csv_export.h"
+#include "hosting/settings_file.h"
 #include "platform/textfile.h"
-#include "sources/receiver.h"
-#include "sources/sweep_player.h"
+#include "sources/capture_writer.h"
+#include "sources/drive_simulator.h"
+#include "sources/frame_player.h"
 #include "workbench/main_window.h"
 #include "workbench/options.h"
+#include "workbench/panel.h"
 #include "workbench/panel_messages.h"
 #include "workbench/rates.h"
-#include "workbench/spectrum_panel.h"
 
 namespace frontpanels::workbench {
 
-class Workbench final : private MainWindowEvents, private PanelRequests {
+class Workbench final : private MainWindowEvents, private PanelListener {
  public:
   // `files` must outlive the program.
   Workbench(Options options, TextFiles& files);
@@ -31,52 +37,129 @@ class Workbench final : private MainWindowEvents, private PanelRequests {
  private:
   struct Command;
   static const Command kCommands[];
+  struct Numbered;
+  static const Numbered kNumbered[];
 
   // MainWindowEvents
   void command(UINT id) override;
   void menuOpening(HMENU menu) override;
   void tick() override;
+  void seek(std::uint64_t frame) override;
   void failed(const std::string& message) noexcept override;
-  // PanelRequests
-  std::int32_t frontPanelOp(std::int32_t hardwareId, std::int32_t panelId, std::int16_t operation) override;
-  std::int32_t frontPanelSet(std::int32_t hardwareId, std::int32_t panelId, std::int16_t parameterType,
-                             std::int16_t index, double value) override;
+  // PanelListener
+  void closeAsked(PanelKind kind) override;
+  bool operationAsked(PanelKind kind, std::int16_t operation) override;
+  void answerWanted(PanelKind kind) override;
+  void settingsHanded(PanelKind kind, std::optional<std::int32_t> setUp,
+                      std::vector<StoredSetting> settings) override;
+  void popUpAsked(PanelKind kind, POINT onScreen) override;
 
+  // Beginning and ending
   bool start();
+  void openFirstSource();
+  [[nodiscard]] std::vector<PanelKind> firstPanels() const;
+  void finishUnattended();
+  void quit();
+  void end(ExitCode code) noexcept;
+
+  // Panels
+  [[nodiscard]] Panel* panel(PanelKind kind) const;
+  [[nodiscard]] Panel* activePanel() const;
+  void openPanel(PanelKind kind);
+  void closePanel(PanelKind kind);
+  void togglePanel(int number);
+  void closeActive();
+  void sideBySide() { window_.arrange(Arrangement::SideBySide); }
+  void stacked() { window_.arrange(Arrangement::Stacked); }
+  void nextPanel() { window_.nextPanel(); }
+  void toggleMessages();
+  void clearMessages();
+  void playbackOnly();
+  void popUpOfActive();
+  void popUpClick(int item);
+  void answer(PanelKind kind);
+
+  // Sources and playing
   void askForRecording();
   void openRecording(const std::string& path);
-  void openPanel();
-  void closePanel();
-  void togglePanel();
+  void simulate(std::uint64_t seed);
+  void simulateAgain();
+  void simulateOther();
+  void open(std::unique_ptr<FrameSource> source, DriveSimulator* simulator);
+  void tune();
+  void receiveAnew();
   void play();
   void pause();
   void step();
+  void stepBack();
   void single();
   void restart();
-  void rate(std::size_t index);
-  void about();
-
+  void toggleLoop();
+  void goTo();
+  void rate(int index);
   void applyState();
-  bool takeSweep();
-  void showSweep();
-  void answerPanel();
+  bool takeFrame();
+  void showFrame();
+  void toggleRecording();
+  void record(const std::string& path);
+  void stopRecording();
+  void appendToCapture();
+
+  // What is kept
+  void loadSettings();
+  void saveSettings();
+  void saveSettingsNow();
+  void restoreSettings();
+  void saveSetUp(int number);
+  void restoreSetUp(int number);
+  [[nodiscard]] bool hasSetUp(int number) const;
+  [[nodiscard]] std::optional<StoredPanel> storedPanel(PanelKind kind) const;
+  void keepPanel(Panel& panel);
+  void keepWindow();
+  void placeWindow();
+  void importCells();
+
+  // Exports
+  void exportPicture();
+  void exportWindow();
+  void exportValues();
+  void exportReport();
+  [[nodiscard]] std::optional<std::string> exportName(std::string_view stem, const wchar_t* extension,
+                                                      const wchar_t* filter) const;
+  void exported(const std::string& path);
+  [[nodiscard]] ExportHeader exportHeader(Panel& panel) const;
+
+  // Telling the user
   void showMessages();
   void takeScreenshots();
-  void finishUnattended();
-  void end(ExitCode code) noexcept;
   void showStatus();
-  void report(const std::string& message, bool withBox);
+  void report(const std::string& message);
+  void about();
+  void keys();
   void box(const std::string& message, UINT icon);
+  // After the event or message that is being dealt with.
+  void later(std::function<void()> work);
+  void doLater();
 
   Options options_;
-  SweepPlayer player_;
-  Receiver receiver_;
+  TextFiles& files_;
+  FramePlayer player_;
+  DriveSimulator* simulator_ = nullptr;  // the player's source, while that is one
+  std::uint64_t seed_ = kUsualSeed;
+  std::optional<CaptureWriter> capture_;
   std::size_t rate_ = kFirstRate;
-  std::uint64_t sweepsTaken_ = 0;
+  std::uint64_t framesTaken_ = 0;
+  std::string openedPath_;
+  bool reading_ = false;  // a long recording; nothing else is begun meanwhile
+  bool cancelled_ = false;
   ExitCode exitCode_ = ExitCode::Done;
+  std::string settingsPath_;
+  SettingsFile settings_;
+  bool settingsMayBeReplaced_ = true;
+  std::vector<std::function<void()>> later_;
   MainWindow window_;
   std::optional<PanelMessages> messages_;
-  std::unique_ptr<SpectrumPanel> panel_;
+  std::vector<std::unique_ptr<Panel>> panels_;
 };
 
 }  // namespace frontpanels::workbench

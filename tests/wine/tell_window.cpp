@@ -4,8 +4,10 @@
 //
 // Waits for a window of that class and puts into its queue, in order, for each word: "key:118" a key pressed
 // and let go (a virtual key's number), "command:1101" a menu's command, "click:<Stop>" a click on the button
-// of that caption, "type:<Span>=1M" the text and Enter into the box beside that label, "close" its closing.
-// Ends with 1 when no such window came.
+// of that caption, "choose:History" an item of whatever list has it, "type:<Span>=1M" the text and Enter
+// into the box beside that label, "file:NAME" the name into a dialog for files, and its button, "close" its
+// closing. After "in:Pilots" fields are looked for in the panel's window whose title begins so. Ends with 1
+// when no such window came.
 #include <windows.h>
 
 #include <cstdio>
@@ -13,6 +15,7 @@
 #include <cwchar>
 #include <string>
 #include <utility>
+#include <vector>
 
 #include "tests/wine/panel_user.h"
 
@@ -55,10 +58,40 @@ bool typeBeside(HWND window, const std::wstring& labelAndText) {
   return true;
 }
 
-bool tell(HWND window, const std::wstring& word) {
+// The list tells its owner, as it does when a user has chosen.
+bool choose(HWND window, const std::wstring& item) {
+  for (const HWND list : windowsOf(window, L"ComboBox")) {
+    const LRESULT place = SendMessageW(list, CB_FINDSTRINGEXACT, static_cast<WPARAM>(-1),
+                                       reinterpret_cast<LPARAM>(item.c_str()));
+    if (place == CB_ERR) continue;
+    SendMessageW(list, CB_SETCURSEL, static_cast<WPARAM>(place), 0);
+    const auto chosen = MAKEWPARAM(GetDlgCtrlID(list), CBN_SELCHANGE);
+    return PostMessageW(GetParent(list), WM_COMMAND, chosen, reinterpret_cast<LPARAM>(list));
+  }
+  return false;
+}
+
+bool nameFile(HWND dialog, const std::wstring& name) {
+  const std::vector<HWND> boxes = windowsOf(dialog, L"Edit");
+  if (boxes.empty()) return false;
+  SendMessageW(boxes.front(), WM_SETTEXT, 0, reinterpret_cast<LPARAM>(name.c_str()));
+  return PostMessageW(dialog, WM_COMMAND, IDOK, 0);
+}
+
+HWND panelOf(HWND window, const std::wstring& title) {
+  for (const HWND panel : windowsOf(window, L"FrontPanelsPanel"))
+    if (textOf(panel).rfind(title, 0) == 0) return panel;
+  return nullptr;
+}
+
+// `scope` is where fields are looked for.
+bool tell(HWND window, HWND& scope, const std::wstring& word) {
   const auto [what, rest] = halvesOf(word, L':');
-  if (what == L"click") return clickOn(window, rest);
-  if (what == L"type") return typeBeside(window, rest);
+  if (what == L"in") return (scope = panelOf(window, rest)) != nullptr;
+  if (what == L"click") return clickOn(scope, rest);
+  if (what == L"choose") return choose(scope, rest);
+  if (what == L"type") return typeBeside(scope, rest);
+  if (what == L"file") return nameFile(window, rest);
   if (what == L"close") return PostMessageW(window, WM_CLOSE, 0, 0);
   const auto number = std::wcstoul(rest.c_str(), nullptr, 10);
   if (what == L"command") return PostMessageW(window, WM_COMMAND, number, 0);
@@ -75,8 +108,9 @@ int main(int count, char** words) {
     std::fprintf(stderr, "no window of the class %s\n", words[1]);
     return 1;
   }
+  HWND scope = window;
   for (int i = 2; i < count; ++i) {
-    if (!tell(window, std::wstring(words[i], words[i] + std::strlen(words[i])))) {
+    if (!tell(window, scope, std::wstring(words[i], words[i] + std::strlen(words[i])))) {
       std::fprintf(stderr, "the window cannot be told %s\n", words[i]);
       return 2;
     }

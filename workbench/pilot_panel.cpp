@@ -1,0 +1,149 @@
+#include "workbench/pilot_panel.h"
+
+#include <algorithm>
+#include <array>
+#include <string_view>
+
+#include "framework/support/host_codes.h"
+
+namespace frontpanels::workbench {
+namespace {
+
+constexpr double kNoSecondId = -1;  // of a cell: its PN offset alone says which it is
+constexpr char kPathSeparator = 27;
+
+// Path `index` of a server, as a new panel is subscribed to it.
+std::string_view pathOf(PilotServer server, std::size_t index) {
+  std::string_view paths = pilotServers()[static_cast<std::size_t>(server)].paths;
+  for (; index > 0; --index) paths.remove_prefix(paths.find(kPathSeparator) + 1);
+  return paths.substr(0, paths.find(kPathSeparator));
+}
+
+// The paths of a server of bars behind that of the total power, in their order.
+constexpr std::array<float PilotRecord::*, 6> kColumns = {
+    &PilotRecord::pnOffset,        &PilotRecord::peakEcIoDb,       &PilotRecord::delayChips,
+    &PilotRecord::aggregateEcIoDb, &PilotRecord::delaySpreadChips, &PilotRecord::aggregateMinusPeakDb,
+};
+
+struct SetRow {
+  PilotSet set;
+  bool PilotTuning::*on;
+};
+constexpr SetRow kSets[] = {
+    {PilotSet::AllPilots, &PilotTuning::allPilots},
+    {PilotSet::ZoomedPilots, &PilotTuning::zoomedPilots},
+    {PilotSet::TopN, &PilotTuning::topN},
+    {PilotSet::UserList, &PilotTuning::userList},
+};
+
+// Result types of what a new panel shows: all pilots, and the strongest of them.
+constexpr std::array<std::int32_t, 2> kFirstDisplays = {14, 201};
+
+template <class List>
+bool contains(const List& list, std::int32_t value) {
+  return std::find(list.begin(), list.end(), value) != list.end();
+}
+
+}  // namespace
+
+PilotPanel::PilotPanel(PanelFrame& frame, PanelListener& listener, const StoredPanel* stored)
+    : Panel(PanelKind::Pilots, frame, listener, stored),
+      names_(Automation::create("FrontPanels.clsCellNameInfo")) {
+  names_.call("Initialize", {});
+  for (const PilotSetRow& row : pilotSets()) {
+    const bool on = stored != nullptr && stored->displays ? contains(*stored->displays, row.resultType)
+                                                          : contains(kFirstDisplays, row.resultType);
+    static_cast<void>(receiver_.display(row.resultType, on));
+    if (on) operate(kAddTraceOperation, static_cast<std::int32_t>(row.resultType));
+  }
+  set(kCenterFrequencyParameter, receiver_.tuning(PilotTuning{}).carrierHz);
+  showFirst(stored);
+}
+
+std::vector<std::int32_t> PilotPanel::displays() const {
+  const PilotTuning tuning = receiver_.tuning(PilotTuning{});
+  std::vector<std::int32_t> on;
+  for (const SetRow& row : kSets)
+    if (tuning.*row.on) on.push_back(pilotSet(row.set).resultType);
+  return on;
+}
+
+bool PilotPanel::request(std::int16_t code, std::int16_t index, double value) {
+  return receiver_.request(code, index, value);
+}
+
+bool PilotPanel::requestDisplay(std::int32_t resultType, bool on) {
+  return receiver_.display(static_cast<std::int16_t>(resultType), on);
+}
+
+// The panel hands over its fields; the user's list is the host's to keep, as it was told of each edit.
+void PilotPanel::appendOwn(std::vector<StoredSetting>& settings) const {
+  std::int16_t index = 0;
+  for (const std::int32_t pn : receiver_.tuning(PilotTuning{}).userPns)
+    settings.push_back({CDMA_CODE_OFFSET, index++, static_cast<double>(pn)});
+}
+
+// --- Frames: the last path of a server completes its set.
+
+void PilotPanel::publishLevels(PilotServer server, const PilotLevels& levels) {
+  publish(pathOf(server, 0), static_cast<double>(levels.ioDbm));
+  publish(pathOf(server, 1), std::span<const float>(levels.ecIoDb));
+}
+
+void PilotPanel::publishBars(PilotServer server, const PilotBars& bars) {
+  publish(pathOf(server, 0), static_cast<double>(bars.ioDbm));
+  for (std::size_t i = 0; i < kColumns.size(); ++i) {
+    column_.clear();
+    for (const PilotRecord& pilot : bars.pilots) column_.push_back(pilot.*kColumns[i]);
+    publish(pathOf(server, i + 1), std::span<const float>(column_));
+  }
+}
+
+void PilotPanel::publishCarrier(const CarrierState& carrier) {
+  publish(pathOf(PilotServer::Carrier, 0), carrier.frequencyErrorHz);
+  publish(pathOf(PilotServer::Carrier, 1), carrier.frequencyState);
+  publish(pathOf(PilotServer::Carrier, 2), carrier.onePps);
+}
+
+void PilotPanel::show(const Frame& frame) {
+  if (!frame.pilots) return;
+  shown_ = *frame.pilots;
+  if (shown_.allPilots) publishLevels(PilotServer::AllPilots, *shown_.allPilots);
+  if (shown_.zoomedPilots) publishLevels(PilotServer::ZoomedPilots, *shown_.zoomedPilots);
+  if (shown_.topN) publishBars(PilotServer::TopN, *shown_.topN);
+  if (shown_.userList) publishBars(PilotServer::UserList, *shown_.userList);
+  if (shown_.carrier) publishCarrier(*shown_.carrier);
+}
+
+void PilotPanel::sourceChanged(const DriveSimulator* simulator) {
+  if (simulator == nullptr) return;
+  for (const SiteName& site : simulator->siteNames()) name({site.pnOffset, site.name});
+  showNames();
+}
+
+void PilotPanel::tune(DriveSimulator& simulator) const { simulator.tune(receiver_.tuning(PilotTuning{})); }
+
+// --- Cells
+
+void PilotPanel::name(const CellName& cell) {
+  names_.call("SetCellName", {static_cast<double>(cell.pnOffset), kNoSecondId, cell.name});
+  named_ = true;
+}
+
+void PilotPanel::showNames() {
+  if (!named_) return;
+  automation().put("CellNameInfo", Value(names_.dispatch()));
+  set(kCellNamingParameter, true);
+}
+
+void PilotPanel::addCells(const std::vector<CellName>& cells) {
+  for (const CellName& cell : cells) {
+    const auto index = static_cast<std::int16_t>(receiver_.tuning(PilotTuning{}).userPns.size());
+    if (request(CDMA_CODE_OFFSET, index, cell.pnOffset))
+      set(CDMA_CODE_OFFSET, static_cast<double>(cell.pnOffset), index);
+    if (!cell.name.empty()) name(cell);
+  }
+  showNames();
+}
+
+}  // namespace frontpanels::workbench

@@ -1,0 +1,52 @@
+// The host's part for a pilot panel: its receiver, the frames of pilots in the order of their paths, the
+// names of the cells.
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "pilot/pilot_sets.h"
+#include "sources/pilot_receiver.h"
+#include "workbench/panel.h"
+
+namespace frontpanels::workbench {
+
+struct CellName {
+  std::int32_t pnOffset = 0;
+  std::string name;
+};
+
+class PilotPanel final : public Panel {
+ public:
+  PilotPanel(PanelFrame& frame, PanelListener& listener, const StoredPanel* stored);
+
+  void show(const Frame& frame) override;
+  void sourceChanged(const DriveSimulator* simulator) override;
+  void tune(DriveSimulator& simulator) const override;
+  [[nodiscard]] std::vector<std::int32_t> displays() const override;
+  // As they were shown last.
+  [[nodiscard]] const PilotFrame& shown() const noexcept { return shown_; }
+  // Puts PN offsets at the end of the user's list and names on their cells; a name of nothing only lists.
+  void addCells(const std::vector<CellName>& cells);
+
+ private:
+  bool request(std::int16_t code, std::int16_t index, double value) override;
+  bool requestDisplay(std::int32_t resultType, bool on) override;
+  [[nodiscard]] std::vector<ReceiverSetting> takeAnswers() override { return receiver_.takeAnswers(); }
+  void told(const ReceiverSetting&) override {}
+  void appendOwn(std::vector<StoredSetting>& settings) const override;
+
+  void name(const CellName& cell);
+  void showNames();
+  void publishLevels(PilotServer server, const PilotLevels& levels);
+  void publishBars(PilotServer server, const PilotBars& bars);
+  void publishCarrier(const CarrierState& carrier);
+
+  PilotReceiver receiver_;
+  Automation names_;
+  bool named_ = false;
+  PilotFrame shown_;
+  std::vector<float> column_;
+};
+
+}  // namespace frontpanels::workbench
