@@ -1,5 +1,7 @@
 #include "workbench/panel.h"
 
+#include <utility>
+
 #include "framework/support/host_codes.h"
 #include "platform/win32/utf16.h"
 #include "workbench/failure.h"
@@ -141,16 +143,39 @@ void Panel::save() { operate(QUILL_VFP_SAVE, std::int32_t{0}); }
 
 void Panel::saveSetUp(std::int32_t setUp) { operate(QUILL_VFP_SAVE_SETUP, setUp); }
 
+void Panel::receive(const Frame& frame) {
+  if (!show(frame)) return;
+  received_ = true;
+  restoreMarkers();
+}
+
 // What the panel does not take, of an older version for instance, does not keep it from the rest. The
-// receiver learns what holds now, and tells the panel where that is something else.
+// receiver learns what holds now, and tells the panel where that is something else. Markers stand on values
+// and wait for the first ones.
 void Panel::restore(const std::vector<StoredSetting>& settings) {
+  markers_.clear();
   for (const StoredSetting& setting : settings) {
-    static_cast<void>(
-        panel_->number("vfpSet", {row_.hardwareId, setting.code, setting.index, Value::of(setting.value)}));
-    if (setting.value.isNumeric())
-      static_cast<void>(request(setting.code, setting.index, setting.value.toDouble()));
+    const bool ofMarker = setting.code >= kNewMarkerParameter && setting.code <= kMarkerValueParameter;
+    ofMarker ? markers_.push_back(setting) : restoreOne(setting);
   }
   answer();
+  if (received_) restoreMarkers();
+}
+
+void Panel::restoreOne(const StoredSetting& setting) {
+  static_cast<void>(
+      panel_->number("vfpSet", {row_.hardwareId, setting.code, setting.index, Value::of(setting.value)}));
+  if (setting.value.isNumeric())
+    static_cast<void>(request(setting.code, setting.index, setting.value.toDouble()));
+}
+
+// Those that are there make room: the numbers of markers are theirs alone.
+void Panel::restoreMarkers() {
+  const std::vector<StoredSetting> markers = std::exchange(markers_, {});
+  if (markers.empty()) return;
+  for (const StoredSetting& present : settings())
+    if (present.code == kNewMarkerParameter) panel_->call("deleteMarker", {});
+  for (const StoredSetting& setting : markers) restoreOne(setting);
 }
 
 void Panel::logging(bool on) {

@@ -67,9 +67,11 @@ class Panel : private PanelWindowEvents, private PanelRequests {
   [[nodiscard]] PanelWindow& window() noexcept { return window_; }
 
   // Hands over what the frame has for the panel.
-  virtual void show(const Frame& frame) = 0;
+  void receive(const Frame& frame);
+  // What the source knows beside its frames; null for a recording.
+  virtual void meet(const DriveSimulator* simulator) = 0;
   // Another source: what the panel was tuned to no longer holds.
-  virtual void sourceChanged(const DriveSimulator* simulator) = 0;
+  virtual void forgetTuning() = 0;
   virtual void tune(DriveSimulator& simulator) const = 0;
   // Tells the panel what was set since the last call. True when the receiver delivers something else now.
   bool answer();
@@ -106,6 +108,8 @@ class Panel : private PanelWindowEvents, private PanelRequests {
   // The end of each panel's construction.
   void showFirst(const StoredPanel* stored);
 
+  // False when the frame has nothing for the panel.
+  virtual bool show(const Frame& frame) = 0;
   // A request of the panel; false, and nothing has changed, for what the receiver cannot take.
   virtual bool request(std::int16_t code, std::int16_t index, double value) = 0;
   // Operations 10 and 11: a display of the panel comes or goes.
@@ -128,6 +132,8 @@ class Panel : private PanelWindowEvents, private PanelRequests {
   std::int32_t saveSetup(std::int32_t setUpId, PanelIds ids) override;
 
   void introduce();
+  void restoreOne(const StoredSetting& setting);
+  void restoreMarkers();
   [[nodiscard]] std::vector<StoredSetting> storedSettings(const VARIANT& list) const;
   void close() noexcept;
 
@@ -137,6 +143,8 @@ class Panel : private PanelWindowEvents, private PanelRequests {
   std::optional<HostedControl> control_;
   std::optional<Automation> panel_;
   std::optional<Automation> hub_;
+  std::vector<StoredSetting> markers_;  // to be restored once there is a trace to stand on
+  bool received_ = false;
   bool playback_ = false;
   bool closed_ = false;
 };

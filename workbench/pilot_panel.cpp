@@ -105,17 +105,24 @@ void PilotPanel::publishCarrier(const CarrierState& carrier) {
   publish(pathOf(PilotServer::Carrier, 2), carrier.onePps);
 }
 
-void PilotPanel::show(const Frame& frame) {
-  if (!frame.pilots) return;
+// A set that is switched off stays so, whatever a recording has of it.
+bool PilotPanel::show(const Frame& frame) {
+  if (!frame.pilots) return false;
   shown_ = *frame.pilots;
+  const PilotTuning tuning = receiver_.tuning(PilotTuning{});
+  if (!tuning.allPilots) shown_.allPilots.reset();
+  if (!tuning.zoomedPilots) shown_.zoomedPilots.reset();
+  if (!tuning.topN) shown_.topN.reset();
+  if (!tuning.userList) shown_.userList.reset();
   if (shown_.allPilots) publishLevels(PilotServer::AllPilots, *shown_.allPilots);
   if (shown_.zoomedPilots) publishLevels(PilotServer::ZoomedPilots, *shown_.zoomedPilots);
   if (shown_.topN) publishBars(PilotServer::TopN, *shown_.topN);
   if (shown_.userList) publishBars(PilotServer::UserList, *shown_.userList);
   if (shown_.carrier) publishCarrier(*shown_.carrier);
+  return true;
 }
 
-void PilotPanel::sourceChanged(const DriveSimulator* simulator) {
+void PilotPanel::meet(const DriveSimulator* simulator) {
   if (simulator == nullptr) return;
   for (const SiteName& site : simulator->siteNames()) name({site.pnOffset, site.name});
   showNames();

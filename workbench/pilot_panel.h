@@ -20,8 +20,8 @@ class PilotPanel final : public Panel {
  public:
   PilotPanel(PanelFrame& frame, PanelListener& listener, const StoredPanel* stored);
 
-  void show(const Frame& frame) override;
-  void sourceChanged(const DriveSimulator* simulator) override;
+  void meet(const DriveSimulator* simulator) override;
+  void forgetTuning() override {}
   void tune(DriveSimulator& simulator) const override;
   [[nodiscard]] std::vector<std::int32_t> displays() const override;
   // As they were shown last.
@@ -30,6 +30,7 @@ class PilotPanel final : public Panel {
   void addCells(const std::vector<CellName>& cells);
 
  private:
+  bool show(const Frame& frame) override;
   bool request(std::int16_t code, std::int16_t index, double value) override;
   bool requestDisplay(std::int32_t resultType, bool on) override;
   [[nodiscard]] std::vector<ReceiverSetting> takeAnswers() override { return receiver_.takeAnswers(); }

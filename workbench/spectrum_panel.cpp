@@ -27,20 +27,19 @@ void SpectrumPanel::tell(const ReceiverSetting& setting) {
   told(setting);
 }
 
-void SpectrumPanel::show(const Frame& frame) {
-  if (!frame.sweep) return;
+bool SpectrumPanel::show(const Frame& frame) {
+  if (!frame.sweep) return false;
   shown_ = receiver_.receive(*frame.sweep);
-  if (shown_.count == 0) return;
+  if (shown_.count == 0) return false;
   if (shown_.range.centerHz != told_.centerHz) tell({kCenterFrequencyParameter, shown_.range.centerHz});
   if (shown_.range.spanHz != told_.spanHz) tell({kSpanParameter, shown_.range.spanHz});
   publish(SpectrumView::kSpectrumPath, shown_.shown());
+  return true;
 }
 
-void SpectrumPanel::sourceChanged(const DriveSimulator* simulator) {
-  receiver_.showWholeSweeps();
-  if (simulator == nullptr) return;
-  // What the simulated receiver is set to, where nothing was asked for.
-  tell({kRbwParameter, receiver_.tuning(SpectrumTuning{}).rbwHz});
+// The panel learns what the simulated receiver is set to where nothing was asked for.
+void SpectrumPanel::meet(const DriveSimulator* simulator) {
+  if (simulator != nullptr) tell({kRbwParameter, receiver_.tuning(SpectrumTuning{}).rbwHz});
 }
 
 void SpectrumPanel::tune(DriveSimulator& simulator) const {

@@ -10,14 +10,15 @@ class SpectrumPanel final : public Panel {
  public:
   SpectrumPanel(PanelFrame& frame, PanelListener& listener, const StoredPanel* stored);
 
-  // Retunes the panel when the range is another, and hands it the levels.
-  void show(const Frame& frame) override;
-  void sourceChanged(const DriveSimulator* simulator) override;
+  void meet(const DriveSimulator* simulator) override;
+  void forgetTuning() override { receiver_.showWholeSweeps(); }
   void tune(DriveSimulator& simulator) const override;
   // As it was shown last; without values before the first one.
   [[nodiscard]] const DisplaySweep& shown() const noexcept { return shown_; }
 
  private:
+  // Retunes the panel when the range is another, and hands it the levels.
+  bool show(const Frame& frame) override;
   bool request(std::int16_t code, std::int16_t index, double value) override;
   bool requestDisplay(std::int32_t, bool) override { return false; }
   [[nodiscard]] std::vector<ReceiverSetting> takeAnswers() override { return receiver_.takeAnswers(); }

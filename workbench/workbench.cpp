@@ -294,10 +294,9 @@ void Workbench::openPanel(PanelKind kind) {
   Panel& opened =
       *panels_.emplace_back(workbench::openPanel(kind, window_, *this, stored ? &*stored : nullptr));
   window_.panelsChanged();
-  opened.sourceChanged(simulator_);
+  opened.meet(simulator_);
   if (capture_) opened.logging(true);
-  tune();
-  showFrame();
+  receiveAnew();
   showMessages();
 }
 
@@ -424,13 +423,18 @@ void Workbench::popUpClick(int item) {
 
 void Workbench::showMessages() {
   if (!messages_) return;
-  for (const std::string& message : messages_->takeAll()) report(message);
+  for (std::string& message : messages_->takeAll()) {
+    // What a report goes on with stands on its own line; in the list it is one message.
+    std::replace_if(
+        message.begin(), message.end(), [](char c) { return c == '\r' || c == '\n'; }, ' ');
+    report(message, "Panel");
+  }
 }
 
 // The list comes up by itself, since what it says may be the reason why nothing is seen; whoever has started
 // the program from a console reads it there as well.
-void Workbench::report(const std::string& message) {
-  window_.messages().add("Workbench", message);
+void Workbench::report(const std::string& message, const char* source) {
+  window_.messages().add(source, message);
   window_.status(StatusPart::Message, message.substr(0, message.find_first_of("\r\n")));
   writeError(message);
   if (!options_.exit && !window_.messagesShown()) window_.showMessages(true);

@@ -133,7 +133,7 @@ class Workbench final : private MainWindowEvents, private PanelListener {
   void showMessages();
   void takeScreenshots();
   void showStatus();
-  void report(const std::string& message);
+  void report(const std::string& message, const char* source = "Workbench");
   void about();
   void keys();
   void box(const std::string& message, UINT icon);

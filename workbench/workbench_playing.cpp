@@ -4,7 +4,7 @@
 #include <chrono>
 #include <cstdio>
 
-#include "platform/win32/utf16.h"
+#include "workbench/console.h"
 #include "workbench/failure.h"
 #include "workbench/program_files.h"
 #include "workbench/questions.h"
@@ -92,7 +92,10 @@ void Workbench::open(std::unique_ptr<FrameSource> source, DriveSimulator* simula
   simulator_ = nullptr;
   player_.open(std::move(source));
   simulator_ = simulator;
-  for (const auto& panel : panels_) panel->sourceChanged(simulator_);
+  for (const auto& panel : panels_) {
+    panel->forgetTuning();
+    panel->meet(simulator_);
+  }
   tune();
   applyState();
 }
@@ -157,7 +160,7 @@ void Workbench::single() {
 
 void Workbench::restart() {
   player_.restart();
-  for (const auto& panel : panels_) panel->sourceChanged(simulator_);
+  for (const auto& panel : panels_) panel->forgetTuning();
   tune();
   applyState();
 }
@@ -219,7 +222,7 @@ bool Workbench::takeFrame() {
 
 void Workbench::showFrame() {
   if (player_.frameNumber() == 0) return;
-  for (const auto& panel : panels_) panel->show(player_.frame());
+  for (const auto& panel : panels_) panel->receive(player_.frame());
 }
 
 // --- Recording what is played
@@ -248,6 +251,7 @@ void Workbench::stopRecording() {
   showStatus();
   window_.status(StatusPart::Message, told);
   window_.messages().add("Workbench", told);
+  writeError(told);
 }
 
 // What was recorded until then stays whole; the play goes on.

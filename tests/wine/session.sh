@@ -114,14 +114,15 @@ judge $? "the set-up brings the picture back"
 tell "command:$PILOTS"
 picture pilots_beside
 export_to "$VALUES" 'pilots*.csv' "$out/pilots.csv"
-strongest=$(awk -F, '/^pn/ { bars = 1; next } bars && NF >= 6 { print int($1) }' "$out/pilots.csv" | head -n 5)
+strongest=$(awk -F, '/^# Set:/ { bars = /Top N/ } bars && NF == 8 && $1 ~ /^[0-9]/ { print int($1) }' "$out/pilots.csv" | head -n 5)
+[ -n "$strongest" ]
+judge $? "the exported values have the strongest pilots: "$strongest
 { printf '%s\n' $strongest | awk '{ print $1 ",Cell " NR }'; printf '7,Nowhere\n'; } >"$out/cells.txt"
 tell "command:$IMPORT"
 wine "$teller" '#32770' "file:$(windows_path "$out/cells.txt")" 2>>"$out/teller.txt"
 judge $? "the dialog takes the list"
-tell in:Pilots 'click:User List' 'click:Cell Names'
+tell in:Pilots 'click:&User List' 'click:Cell Names'
 picture imported_cells
-before=
 for order in X History 'Show Value' None Y; do
   tell in:Pilots "choose:$order"
   picture "sorted_by_${order// /_}"
@@ -144,7 +145,8 @@ export_to "$VALUES" 'pilots*.csv' "$out/pilots.csv"
 grep -qE '^# .*881520000' "$out/pilots.csv"
 judge $? "the exported pilots name their carrier"
 tell "command:$RECORD" key:$F7 key:$F7 key:$F7 "command:$RECORD"
-until_there sh -c "ls '$exports'/*.fpcap"
+until_there grep -q '3 frames recorded' "$out/said.txt"
+judge $? "three frames are recorded"
 capture=$(ls "$exports"/*.fpcap)
 mv "$capture" "$out/three.fpcap"
 picture recorded
