@@ -1,5 +1,5 @@
-// Writes what each fuzz target starts from into a folder a target: result buffers as hosts send them, and the
-// same with something wrong.
+// Writes what each fuzz target starts from into a folder a target: result buffers as hosts send them,
+// sessions with a panel, recordings, and the same with something wrong.
 #include <algorithm>
 #include <array>
 #include <bit>
@@ -12,6 +12,7 @@
 
 #include "platform/result_reader.h"
 #include "platform/result_writer.h"
+#include "sources/capture_format.h"
 
 namespace frontpanels::fuzz {
 namespace {
@@ -308,6 +309,62 @@ Seeds entryParserSeeds() {
   return seeds;
 }
 
+// --- Recordings
+
+Frame capturedFrame(std::size_t bins, bool hasPilots) {
+  Frame frame;
+  frame.time = "2020-01-01 00:00:10";
+  frame.sweep.emplace();
+  frame.sweep->startHz = 88e6;
+  frame.sweep->stepHz = 1e4;
+  frame.sweep->levelsDb.assign(bins, -60);
+  if (!hasPilots) return frame;
+  PilotFrame& pilots = frame.pilots.emplace();
+  pilots.allPilots = PilotLevels{-60, {-3, kGap, -12}};
+  pilots.zoomedPilots = PilotLevels{-60, {-3}};
+  pilots.topN = PilotBars{-60, {{12, -3, 1, -2, 0.5F, 1}, {100, -9, 2, -8, 0.5F, 1}}};
+  pilots.userList = PilotBars{-60, {}};
+  pilots.carrier = CarrierState{-12, 2, 1};
+  return frame;
+}
+
+// The first byte is that of capture_fuzz.cpp.
+Seeds captureSeeds() {
+  constexpr std::uint8_t kAsItIs = 0;
+  constexpr std::uint8_t kPutRight = 1;
+  std::vector<char> sweep;
+  std::vector<char> all;
+  if (!encodeFrame(capturedFrame(4, false), sweep) || !encodeFrame(capturedFrame(2, true), all)) return {};
+  const Bytes file = joined(kAsItIs, sweep, all, sweep);
+  Seeds seeds{{"none", joined(kAsItIs)},
+              {"whole", file},
+              {"to_put_right", joined(kPutRight, all, sweep)},
+              {"passed_over", joined(kAsItIs, sweep, std::string("between"), all)}};
+  for (const std::size_t size : {5, 20, 30, 100, 150, 200})
+    seeds.push_back({"cut_at_" + std::to_string(size), Bytes(file.begin(), file.begin() + size)});
+  for (const std::size_t at : {1, 5, 9, 13, 17, 25, 80}) {
+    Bytes damaged = file;
+    damaged[at] ^= 16;
+    seeds.push_back({"damaged_at_" + std::to_string(at), damaged});
+  }
+  return seeds;
+}
+
+Seeds recordingSeeds() {
+  const std::string rtl =
+      "2020-01-01,00:00:10,100,120,10.00,1,-1.5,-2.25\n2020-01-01,00:00:10,120,140,10.00,1,-3,nan\n"
+      "2020-01-01,00:00:20,100,120,10.00,1,-1.5,-2.25,-2.25\n";
+  const std::string hackrf =
+      "2020-01-01, 00:00:10.25, 10000000, 15000000, 2500000.00, 8, -1, -2\r\n"
+      "2020-01-01, 00:00:10.25, 20000000, 25000000, 2500000.00, 8, -1, -2\r\n"
+      "2020-01-01, 00:00:10.50, 10000000, 15000000, 2500000.00, 8, -1, -2\r\n";
+  Seeds seeds;
+  for (const std::string& text : {rtl, hackrf, rtl + hackrf, "heading\n\n" + rtl + "what\n" + rtl,
+                                  rtl.substr(0, 90), "\xef\xbb\xbf" + rtl, std::string("\n")})
+    seeds.push_back({"recording_" + std::to_string(seeds.size()), joined(text)});
+  return seeds;
+}
+
 bool write(const std::filesystem::path& folder, const Seeds& seeds) {
   std::filesystem::create_directories(folder);
   return std::ranges::all_of(seeds, [&folder](const Seed& seed) {
@@ -331,6 +388,8 @@ int main(int argc, char** argv) {
   const bool written = write(corpus / "result_reader_fuzz", resultReaderSeeds()) &&
                        write(corpus / "display_data_fuzz", displayDataSeeds()) &&
                        write(corpus / "entry_points_fuzz", entryPointSeeds()) &&
-                       write(corpus / "entry_parser_fuzz", entryParserSeeds());
+                       write(corpus / "entry_parser_fuzz", entryParserSeeds()) &&
+                       write(corpus / "capture_fuzz", captureSeeds()) &&
+                       write(corpus / "recording_fuzz", recordingSeeds());
   return written ? 0 : 1;
 }

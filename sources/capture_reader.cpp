@@ -45,12 +45,13 @@ void CaptureReader::goTo(const FramePlace& place) {
 // A file that cannot be read further ends here; what came before is kept.
 bool CaptureReader::next(Frame& frame) {
   if (readFailed_) return false;
+  const std::uint64_t atBytes = blocks_->positionBytes();
   try {
     return nextFrame(frame);
   } catch (const RuntimeError& error) {
     readFailed_ = true;
     cutShort_ = true;
-    keepProblem(blocks_->positionBytes(), "the file cannot be read further: " + error.description());
+    keepProblem(atBytes, "the file cannot be read further: " + error.description());
     return false;
   }
 }

@@ -50,6 +50,7 @@ std::unique_ptr<SweepRecording> SweepRecording::open(TextFiles& files, const std
 void SweepRecording::rewind() {
   openAnew();
   cutShort_ = false;
+  mixed_ = false;
   unreadableRows_ = 0;
   rowsOutOfOrder_ = 0;
   problems_.clear();
@@ -160,7 +161,7 @@ SweepRecording::Fit SweepRecording::fitOfRow() const {
     return rowTwice ? Fit::Repeated : Fit::NextSweep;
   }
   // rtl_power's hops rise and carry one time; hackrf_sweep's go forth and back above the lowest.
-  const double floorHz = format_ == SweepFormat::RtlPower ? previousLowHz_ : lowestHz;
+  const double floorHz = sweepFormat_ == SweepFormat::RtlPower ? previousLowHz_ : lowestHz;
   return row_.lowHz < floorHz && row_.time != previousTime_ ? Fit::NextSweep : Fit::SameSweep;
 }
 
@@ -187,10 +188,11 @@ void SweepRecording::placeRow() {
   }
   if (rows_.empty()) {
     if (sweepNumber_ > 0 && row_.time < sweepTime_) noteOutOfOrder("its sweep is older than the one before");
+    noteFormat();
     stepHz_ = row_.stepHz;
     sweepTime_ = row_.time;
     endHz_ = row_.lowHz;
-  } else if (format_ == SweepFormat::RtlPower && row_.lowHz < previousLowHz_) {
+  } else if (sweepFormat_ == SweepFormat::RtlPower && row_.lowHz < previousLowHz_) {
     noteOutOfOrder("out of order: its frequency is below that of the row before");
   }
   rows_.emplace_hint(rows_.end(), row_.lowHz, Placed{levels_.size(), row_.levelsDb.size(), rowLine_});
@@ -198,6 +200,14 @@ void SweepRecording::placeRow() {
   endHz_ = std::max(endHz_, row_.lowHz + stepHz_ * static_cast<double>(row_.levelsDb.size()));
   previousLowHz_ = row_.lowHz;
   previousTime_ = row_.time;
+}
+
+// Files put together may hold both.
+void SweepRecording::noteFormat() {
+  sweepFormat_ = formatOf(row_);
+  if (sweepFormat_ == format_ || mixed_) return;
+  mixed_ = true;
+  keepProblem(rowLine_, std::string("from here on also ") + sweepFormatName(sweepFormat_));
 }
 
 void SweepRecording::startSweep() {
@@ -259,6 +269,7 @@ std::string SweepRecording::problemReport() const {
   };
   if (unreadableRows_ != 0) add(rowsText(unreadableRows_) + " could not be read");
   if (rowsOutOfOrder_ != 0) add(rowsText(rowsOutOfOrder_) + " out of order");
+  if (mixed_) add("of two formats");
   if (cutShort_) add("cut short");
   for (const RowProblem& problem : problems_) report += lineText(problem);
   if (unreadableRows_ + rowsOutOfOrder_ > problems_.size()) report += "\n  ...";

@@ -80,6 +80,7 @@ class SweepRecording {
   [[nodiscard]] bool rowIsPlaced() const;
   [[nodiscard]] bool hasRoomForRow() const;
   void placeRow();
+  void noteFormat();
   void startSweep();
   void distrustLastValue();
   void finishSweep(Sweep& sweep);
@@ -94,6 +95,7 @@ class SweepRecording {
   bool cutShort_ = false;
   SweepFormat format_ = SweepFormat::RtlPower;
   bool lastBinTwice_ = false;
+  bool mixed_ = false;  // with rows of the other format
 
   TextLine line_;
   FramePlace linePlace_;
@@ -107,6 +109,7 @@ class SweepRecording {
   std::map<double, Placed> rows_;  // by low frequency
   std::vector<float> levels_;
   std::string sweepTime_;
+  SweepFormat sweepFormat_ = SweepFormat::RtlPower;
   double stepHz_ = 0;
   double endHz_ = 0;
   double previousLowHz_ = 0;

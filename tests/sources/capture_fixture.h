@@ -41,7 +41,7 @@ class CaptureFixture : public ::testing::Test {
   }
 
   // Three frames: of a sweep, of all that there can be, of nothing but a time.
-  [[nodiscard]] std::string threeFrames() const {
+  std::string threeFrames() const {
     fs::remove(native());
     CaptureWriter writer(path());
     writer.append(sweepFrame("one", {-1, -2, -3}));
