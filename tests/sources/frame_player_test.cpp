@@ -106,6 +106,15 @@ TEST_F(FramePlayerTest, DoesWhatTheKeysOfARecorderDo) {
   }
 }
 
+TEST_F(FramePlayerTest, StaysAtTheEndOfTheOnlyFrameWhenThereIsNoneBefore) {
+  files.contents["one.csv"] = "2020-01-01,00:00:10,100,120,10.00,1,-1,-2\n";
+  player.open(openRecording(files, "one.csv"));
+  EXPECT_TRUE(player.step());
+  EXPECT_FALSE(player.step());
+  player.stepBack();
+  EXPECT_EQ(now(), "ended 1");
+}
+
 TEST_F(FramePlayerTest, ShowsTheFrameAndHowFarItIs) {
   EXPECT_EQ(player.percent(), 0);
   EXPECT_EQ(player.frameCount(), 3U);

@@ -2,10 +2,12 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <array>
 #include <filesystem>
 
 #include "sources/capture_format.h"
 #include "sources/crc32c.h"
+#include "sources/watched_files.h"
 #include "tests/sources/capture_fixture.h"
 
 namespace frontpanels {
@@ -108,6 +110,18 @@ TEST_F(RecordingTest, TellsHowFarItIsWithinOneHugeFrameTooAndCanBeEnded) {
   }
 }
 
+TEST_F(RecordingTest, TellsNoLessWhenAPartIsReadAgain) {
+  files.contents["a"] = std::string(100, 'x');
+  std::vector<int> heard;
+  WatchedFiles watched(files, [&](int percent) { return heard.push_back(percent), true; });
+  const auto reader = watched.openBytes("a");
+  std::array<char, 60> bytes{};
+  EXPECT_EQ(reader->read(bytes), 60U);
+  reader->goTo(0);
+  EXPECT_EQ(reader->read({bytes.data(), 10}), 10U);
+  EXPECT_EQ(heard, (std::vector<int>{60, 60}));
+}
+
 TEST_F(RecordingTest, ThatHasChangedPlaysWhatItHoldsAndSaysSo) {
   const std::string capture = threeFrames();
   const auto source = open(capture);
@@ -119,7 +133,8 @@ TEST_F(RecordingTest, ThatHasChangedPlaysWhatItHoldsAndSaysSo) {
   } kCases[] = {{"as it was", capture, kFirst + second() + third()},
                 {"longer", capture + capture.substr(16), kFirst + second() + third()},
                 {"cut", capture.substr(0, capture.size() - 1), kFirst + second()},
-                {"moved", capture.substr(0, 16) + "x" + capture.substr(16), kFirst + second() + third()},
+                {"moved by half a marker", capture.substr(0, 16) + "x\xb7" + capture.substr(16),
+                 kFirst + second() + third()},
                 {"another kind", kSweeps, ""}};
   for (const auto& testCase : kCases) {
     const auto changing = open(capture);
