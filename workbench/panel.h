@@ -145,6 +145,7 @@ class Panel : private PanelWindowEvents, private PanelRequests {
   std::optional<Automation> hub_;
   std::vector<StoredSetting> markers_;  // to be restored once there is a trace to stand on
   bool received_ = false;
+  bool measurementShown_ = true;  // before it logged
   bool playback_ = false;
   bool closed_ = false;
 };
