@@ -22,7 +22,7 @@ double wrapped(double chips) { return chips - kShortCodeChips * std::floor(chips
 }  // namespace
 
 CodeProfile::CodeProfile(std::uint64_t seed)
-    : seed_(seed), correlation_(codeCorrelation()), noise_(kShortCodeChips), levels_(kShortCodeChips) {
+    : seed_(seed), correlation_(codeCorrelation()), noises_(kShortCodeChips), levels_(kShortCodeChips) {
   for (std::size_t i = 0; i < kDirections; ++i)
     units_.emplace_back(portableTurn(static_cast<double>(i) / static_cast<double>(kDirections)));
 }
@@ -30,19 +30,8 @@ CodeProfile::CodeProfile(std::uint64_t seed)
 void CodeProfile::begin(std::uint64_t frame, std::span<const CodeRay> rays, double noise) {
   frame_ = frame;
   rays_ = rays;
-  noiseAmplitude_ = static_cast<float>(std::sqrt(noise));
+  noise_ = static_cast<float>(noise);
   filled_.reset();
-}
-
-// A ray of a chip's width: between whole chips the correlation is straight.
-std::complex<float> CodeProfile::signal(const CodeRay& ray, double chips) const {
-  const double away = wrapped(chips - ray.chips);
-  const double whole = std::floor(away);
-  const auto part = static_cast<float>(away - whole);
-  const std::size_t lag = static_cast<std::size_t>(whole) % kShortCodeChips;
-  const std::complex<float> from = correlation_[lag];
-  const std::complex<float> to = correlation_[(lag + 1) % kShortCodeChips];
-  return ray.amplitude * (from * (1 - part) + to * part);
 }
 
 bool CodeProfile::reaches(const CodeRay& ray, double fromChips, double toChips) const {
@@ -51,40 +40,74 @@ bool CodeProfile::reaches(const CodeRay& ray, double fromChips, double toChips) 
   return power >= kNearByOnly && wrapped(ray.chips - fromChips + 1) <= toChips - fromChips + 2;
 }
 
+// At chips one behind the other. A ray is as wide as a chip: between whole chips the correlation is straight.
+// Real numbers, as the product of complex ones looks for infinities.
+void CodeProfile::addSignal(const CodeRay& ray, double firstChips,
+                            std::span<std::complex<float>> sums) const {
+  const double away = wrapped(firstChips - ray.chips);
+  const double whole = std::floor(away);
+  const auto part = static_cast<float>(away - whole);
+  const float real = ray.amplitude.real();
+  const float imaginary = ray.amplitude.imag();
+  std::size_t lag = static_cast<std::size_t>(whole) % kShortCodeChips;
+  std::complex<float> from = correlation_[lag];
+  for (std::complex<float>& sum : sums) {
+    lag = (lag + 1) % kShortCodeChips;
+    const std::complex<float> to = correlation_[lag];
+    const float x = from.real() + part * (to.real() - from.real());
+    const float y = from.imag() + part * (to.imag() - from.imag());
+    sum += std::complex<float>(real * x - imaginary * y, real * y + imaginary * x);
+    from = to;
+  }
+}
+
+// The passes add up to one that has all of the signal and to others that have none of it.
+float CodeProfile::level(std::complex<float> signal, const Noise& noise) const {
+  const float real = signal.real() + std::sqrt(noise_ / kPasses) * noise.amplitude.real();
+  const float imaginary = signal.imag() + std::sqrt(noise_ / kPasses) * noise.amplitude.imag();
+  return std::min(real * real + imaginary * imaginary + noise_ / kPasses * noise.power, 1.0F);
+}
+
 void CodeProfile::fill(std::size_t block) {
   Random random(seed_, kNoisePurpose, frame_, block);
   const std::size_t first = block * kBlock;
   std::array<std::complex<float>, kBlock> sums{};
-  for (const CodeRay& ray : rays_) {
-    if (!reaches(ray, static_cast<double>(first), static_cast<double>(first + kBlock))) continue;
-    for (std::size_t i = 0; i < kBlock; ++i) sums[i] += signal(ray, static_cast<double>(first + i));
-  }
+  for (const CodeRay& ray : rays_)
+    if (reaches(ray, static_cast<double>(first), static_cast<double>(first + kBlock)))
+      addSignal(ray, static_cast<double>(first), sums);
   for (std::size_t i = 0; i < kBlock; ++i) {
     const auto length = static_cast<float>(std::sqrt(random.exponential()));
-    noise_[first + i] = noiseAmplitude_ * length * units_[random.bits() % kDirections];
-    levels_[first + i] = std::norm(sums[i] + noise_[first + i]);
+    const std::complex<float> direction = units_[random.bits() % kDirections];
+    Noise& noise = noises_[first + i];
+    noise.amplitude = {length * direction.real(), length * direction.imag()};
+    noise.power = static_cast<float>(random.gamma(kPasses - 1));
+    levels_[first + i] = level(sums[i], noise);
   }
   filled_.set(block);
 }
 
-std::complex<float> CodeProfile::noiseAt(std::int32_t chip) {
-  const std::size_t index = static_cast<std::size_t>(chip) % kShortCodeChips;
+const CodeProfile::Noise& CodeProfile::noiseAt(std::size_t chip) {
+  const std::size_t index = chip % kShortCodeChips;
   if (!filled_.test(index / kBlock)) fill(index / kBlock);
-  return noise_[index];
+  return noises_[index];
 }
 
 // Noise is as strong between the chips.
 float CodeProfile::level(double chips) {
   const double at = wrapped(chips);
-  const auto chip = static_cast<std::int32_t>(at);
-  const auto part = static_cast<float>(at - chip);
-  const std::complex<float> from = noiseAt(chip);
-  const std::complex<float> to = noiseAt(chip + 1);
-  std::complex<float> sum =
-      (from * (1 - part) + to * part) / std::sqrt((1 - part) * (1 - part) + part * part);
+  const auto chip = static_cast<std::size_t>(at);
+  const auto part = static_cast<float>(at - std::floor(at));
+  const Noise& from = noiseAt(chip);
+  const Noise& to = noiseAt(chip + 1);
+  const float rest = 1 - part;
+  const float length = std::sqrt(rest * rest + part * part);
+  const Noise between{{(from.amplitude.real() * rest + to.amplitude.real() * part) / length,
+                       (from.amplitude.imag() * rest + to.amplitude.imag() * part) / length},
+                      from.power * rest + to.power * part};
+  std::complex<float> sum;
   for (const CodeRay& ray : rays_)
-    if (reaches(ray, at, at)) sum += signal(ray, at);
-  return std::min(std::norm(sum), 1.0F);
+    if (reaches(ray, at, at)) addSignal(ray, at, {&sum, 1});
+  return level(sum, between);
 }
 
 CodeProfile::Peak CodeProfile::peak(double fromChips, double toChips) {
@@ -95,7 +118,7 @@ CodeProfile::Peak CodeProfile::peak(double fromChips, double toChips) {
   const auto end = static_cast<std::size_t>(std::clamp(std::ceil(toChips), 0.0, double{kShortCodeChips}));
   for (auto chip = static_cast<std::size_t>(std::max(std::ceil(fromChips), 0.0)); chip < end; ++chip) {
     if (!filled_.test(chip / kBlock)) fill(chip / kBlock);
-    take(static_cast<double>(chip), std::min(levels_[chip], 1.0F));
+    take(static_cast<double>(chip), levels_[chip]);
   }
   for (const CodeRay& ray : rays_)
     if (ray.chips >= fromChips && ray.chips < toChips && std::norm(ray.amplitude) >= kNearByOnly)

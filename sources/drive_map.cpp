@@ -16,15 +16,15 @@ constexpr std::uint64_t kPlacePurpose = 1;
 constexpr std::uint64_t kShadowPurpose = 2;
 
 constexpr double kSpeedMPerS = 14;
-constexpr double kLapM = 12000;
-constexpr MapPoint kRoadRadii{2200, 1600};
+constexpr double kLapM = 9000;
+constexpr MapPoint kRoadRadii{1700, 1150};
 
 struct Obstacle {
   double fromM;
   double toM;
   double roofDb;
 };
-constexpr Obstacle kObstacles[] = {{3000, 3420, 25}, {8200, 8270, 3}};
+constexpr Obstacle kObstacles[] = {{2600, 3020, 25}, {6900, 6970, 3}};
 
 constexpr const char* kNames[kSites] = {"Harbour",     "Old Mill", "Station",     "Brewery",
                                         "Water Tower", "Quarry",   "Town Hall",   "Orchard",
@@ -38,11 +38,11 @@ constexpr double kShadowDb = 7;
 constexpr auto kShadowSteps = static_cast<std::size_t>(kLapM / kShadowStepM);
 
 constexpr double kMastM = 30;
-// Free space to 100 m, from there by the power 3.5 of the distance; houses and the car's roof.
+// Free space to 100 m, from there by the power 3.2 of the distance; houses and the car's roof.
 constexpr double kFreeSpaceDb = 12.45;  // at 100 m and 1 MHz
-constexpr double kDbPerDecade = 35;
-constexpr double kClutterDb = 12;
-constexpr double kFrontToBackDb = 25;
+constexpr double kDbPerDecade = 32;
+constexpr double kClutterDb = 18;
+constexpr double kFrontToBackDb = 20;
 constexpr double kPatternDb = 18.66;  // 12 dB at 65 degrees, by 1 less the cosine
 
 double decades(double ratio) noexcept { return toDecibels(ratio) / 10; }

@@ -30,7 +30,8 @@ constexpr Raster kRasters[] = {
     {{Ofdm, Network, 751e6, 9e6, 52, 0, 0, 1, 1}, 0, 1},
     // Cellular uplink: telephones on the channels of the downlink, 45 MHz below it.
     {{NarrowFm, Mobile, 825.45e6, 16e3, -78, 300, 12, 0.4, 1}, 630e3, 10},
-    {{Cdma, Mobile, 832.26e6, kCdmaWidthHz, -88, 0, 15, 0.7, 1}, 1.23e6, 5},
+    {{Cdma, Mobile, 832.26e6, kCdmaWidthHz, -88, 0, 15, 0.7, 1}, 1.23e6, 2},
+    {{Cdma, Mobile, 836.52e6, kCdmaWidthHz, -88, 0, 15, 0.7, 1}, 1.23e6, 3},
     {{Gsm, Mobile, 844.2e6, 200e3, -76, 0, 9, 0.5, 0.125}, 800e3, 5},
     // Cellular downlink.
     {{NarrowFm, Site, 870.45e6, 16e3, 44, 300, 12, 0.7, 1}, 630e3, 10},

@@ -19,10 +19,10 @@ constexpr std::uint64_t kErrorPurpose = 31;
 constexpr std::uint64_t kErrorNoisePurpose = 32;
 
 constexpr double kSpeedOfLightMPerS = 299792458;
-constexpr double kRadiatedDbm = 55;                    // of a sector, with its antenna
-constexpr double kPilotShare = 0.2;                    // of what a sector radiates
-constexpr double kDelayDecay = 2;                      // chips in which paths lose 4.3 dB
-constexpr double kDetected = 14.0 / kCorrelatedChips;  // Ec/Io; noise comes so far once in a million chips
+constexpr double kRadiatedDbm = 55;                   // of a sector, with its antenna
+constexpr double kPilotShare = 0.2;                   // of what a sector radiates
+constexpr double kDelayDecay = 2;                     // chips in which paths lose 4.3 dB
+constexpr double kDetected = 5.3 / kCorrelatedChips;  // Ec/Io; noise comes so far once in a million chips
 
 float decibels(double ratio) { return static_cast<float>(toDecibels(ratio)); }
 
@@ -130,6 +130,7 @@ void PilotSimulator::receive(double timeS) {
 void PilotSimulator::measure(std::uint64_t frame, double timeS, PilotFrame& pilots) {
   receive(timeS);
   profile_.begin(frame, rays_, (1 - pilotsMw_ / ioMw_) / kCorrelatedChips);
+  peaks_.assign(kPnOffsets, std::nullopt);
   pilots = {};
   if (tuning_.allPilots) pilots.allPilots = allPilots();
   if (tuning_.zoomedPilots) pilots.zoomedPilots = zoomedPilots();
@@ -138,8 +139,10 @@ void PilotSimulator::measure(std::uint64_t frame, double timeS, PilotFrame& pilo
   pilots.carrier = carrier(frame, timeS);
 }
 
-CodeProfile::Peak PilotSimulator::peakOf(std::int32_t pn) {
-  return profile_.peak(pn * kChipsPerOffset, (pn + 1) * kChipsPerOffset);
+const CodeProfile::Peak& PilotSimulator::peakOf(std::int32_t pn) {
+  std::optional<CodeProfile::Peak>& peak = peaks_[static_cast<std::size_t>(pn)];
+  if (!peak) peak = profile_.peak(pn * kChipsPerOffset, (pn + 1) * kChipsPerOffset);
+  return *peak;
 }
 
 PilotLevels PilotSimulator::allPilots() {

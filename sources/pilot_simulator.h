@@ -4,6 +4,7 @@
 #include <array>
 #include <complex>
 #include <cstdint>
+#include <optional>
 #include <vector>
 
 #include "sources/code_profile.h"
@@ -49,7 +50,7 @@ class PilotSimulator {
   [[nodiscard]] PilotBars topN();
   [[nodiscard]] PilotBars userList();
   [[nodiscard]] PilotRecord record(std::int32_t pn, const CodeProfile::Peak& peak);
-  [[nodiscard]] CodeProfile::Peak peakOf(std::int32_t pn);
+  [[nodiscard]] const CodeProfile::Peak& peakOf(std::int32_t pn);
   [[nodiscard]] CarrierState carrier(std::uint64_t frame, double timeS) const;
 
   std::uint64_t seed_;
@@ -62,6 +63,7 @@ class PilotSimulator {
   CodeProfile profile_;
   // Of one frame
   std::vector<CodeRay> rays_;
+  std::vector<std::optional<CodeProfile::Peak>> peaks_;  // by PN offset, as far as they were asked for
   double ioMw_ = 0;
   double pilotsMw_ = 0;
   bool heard_ = false;

@@ -1,7 +1,8 @@
 #include "sources/portable_math.h"
 
+#include <array>
 #include <cmath>
-#include <iterator>
+#include <cstddef>
 
 namespace frontpanels {
 namespace {
@@ -14,15 +15,28 @@ constexpr double kLn2Low = 1.90821492927058770e-10;
 constexpr double kLeastExponent = -700;
 constexpr double kLeastRatio = 1e-30;
 
-// The Taylor series of exp, cos and sin, by the power of their variable.
-constexpr int kExpTerms = 14;
-constexpr int kTurnTerms = 9;
+// Coefficients of series, by the power of their variable: divisions would take most of the time.
+constexpr std::size_t kTerms = 15;
+constexpr std::array<double, kTerms> kOddReciprocals = [] {
+  std::array<double, kTerms> values{};
+  for (std::size_t i = 0; i < kTerms; ++i) values[i] = 1.0 / static_cast<double>(2 * i + 1);
+  return values;
+}();
+constexpr std::array<double, 2 * kTerms> kFactorialReciprocals = [] {
+  std::array<double, 2 * kTerms> values{};
+  double factorial = 1;
+  for (std::size_t i = 0; i < values.size(); ++i) {
+    values[i] = 1 / factorial;
+    factorial *= static_cast<double>(i + 1);
+  }
+  return values;
+}();
 
 }  // namespace
 
 // ln(m * 2^k) = k ln 2 + 2 artanh((m - 1) / (m + 1)), m within a factor of sqrt(2) of 1.
 double portableLog(double value) noexcept {
-  constexpr int kTerms = 11;
+  constexpr std::size_t kUsed = 11;
   int exponent = 0;
   double mantissa = std::frexp(value, &exponent);
   if (mantissa < kSqrtHalf) {
@@ -32,7 +46,7 @@ double portableLog(double value) noexcept {
   const double s = (mantissa - 1) / (mantissa + 1);
   const double square = s * s;
   double sum = 0;
-  for (int term = kTerms - 1; term >= 0; --term) sum = sum * square + 1.0 / (2 * term + 1);
+  for (std::size_t term = kUsed; term-- > 0;) sum = sum * square + kOddReciprocals[term];
   return exponent * kLn2High + (exponent * kLn2Low + 2 * s * sum);
 }
 
@@ -40,8 +54,9 @@ double portableExp(double value) noexcept {
   if (!(value > kLeastExponent)) return 0;
   const double twos = std::nearbyint(value / (kLn2High + kLn2Low));
   const double rest = (value - twos * kLn2High) - twos * kLn2Low;
-  double sum = 1;
-  for (int term = kExpTerms; term >= 1; --term) sum = 1 + sum * rest / term;
+  constexpr std::size_t kUsed = 14;
+  double sum = 0;
+  for (std::size_t term = kUsed; term-- > 0;) sum = sum * rest + kFactorialReciprocals[term];
   return std::ldexp(sum, static_cast<int>(twos));
 }
 
@@ -49,11 +64,12 @@ std::complex<double> portableTurn(double turns) noexcept {
   const double quarters = std::nearbyint(turns * 4);
   const double x = (turns * 4 - quarters) * (kPi / 2);
   const double square = x * x;
-  double cosine = 1;
-  double sine = 1;
-  for (int term = kTurnTerms; term >= 1; --term) {
-    cosine = 1 - cosine * square / ((2 * term - 1) * (2 * term));
-    sine = 1 - sine * square / ((2 * term) * (2 * term + 1));
+  constexpr std::size_t kUsed = 9;
+  double cosine = 0;
+  double sine = 0;
+  for (std::size_t term = kUsed; term-- > 0;) {
+    cosine = kFactorialReciprocals[2 * term] - square * cosine;
+    sine = kFactorialReciprocals[2 * term + 1] - square * sine;
   }
   sine *= x;
   const double quarter = quarters - 4 * std::floor(quarters / 4);
