@@ -47,7 +47,10 @@ constexpr double kPatternDb = 18.66;  // 12 dB at 65 degrees, by 1 less the cosi
 
 double decades(double ratio) noexcept { return toDecibels(ratio) / 10; }
 
-double lapM(double drivenM) noexcept { return drivenM - kLapM * std::floor(drivenM / kLapM); }
+// Of a way too long to be told to the metre somewhere on the loop.
+double lapM(double drivenM) noexcept {
+  return std::clamp(drivenM - kLapM * std::floor(drivenM / kLapM), 0.0, kLapM);
+}
 
 // Neighbours are correlated by exp(-distance / 50 m), round the loop: the first lap only runs it in.
 std::vector<float> shadowAlong(std::uint64_t seed, std::uint64_t site) {

@@ -81,8 +81,14 @@ void SpectrumSimulator::tune(const SpectrumTuning& tuning) {
   for (std::size_t i = 0; i < emitters_.size(); ++i) {
     Footprint footprint{i, 0, {}};
     place(footprint, emitters_[i].centerHz);
-    if (!footprint.gains.empty() || emitters_[i].driftHz > 0) footprints_.push_back(std::move(footprint));
+    if (!footprint.gains.empty() || moves(emitters_[i])) footprints_.push_back(std::move(footprint));
   }
+}
+
+// So far that it is to be seen.
+bool SpectrumSimulator::moves(const Emitter& emitter) const noexcept {
+  constexpr double kSeen = 0.05;
+  return emitter.driftHz > kSeen * filterHz_;
 }
 
 // The filter passes by, and the cell keeps the largest of what it shows on its way: what is narrower than a
@@ -192,7 +198,7 @@ void SpectrumSimulator::measure(std::uint64_t frame, double timeS, Sweep& sweep)
   std::fill(noiseMw_.begin(), noiseMw_.end(), floorMw);
   for (Footprint& footprint : footprints_) {
     const Emitter& emitter = emitters_[footprint.emitter];
-    if (emitter.driftHz > 0) {
+    if (moves(emitter)) {
       const double phase = Random(seed_, kEmitterPurpose, footprint.emitter, 1).uniform();
       place(footprint, emitter.centerHz + emitter.driftHz * portableTurn(timeS / kDriftS + phase).imag());
     }

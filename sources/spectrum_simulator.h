@@ -34,6 +34,7 @@ class SpectrumSimulator {
     std::size_t firstCell = 0;
     std::vector<double> gains;
   };
+  [[nodiscard]] bool moves(const Emitter& emitter) const noexcept;
   void place(Footprint& footprint, double centerHz) const;
   [[nodiscard]] double gain(const SpectrumShape& shape, double offsetHz) const;
   [[nodiscard]] bool isPresent(std::size_t emitter, double timeS) const;
@@ -44,8 +45,8 @@ class SpectrumSimulator {
   std::uint64_t seed_;
   const DriveMap& map_;
   std::vector<Emitter> emitters_;
-  std::vector<SpectrumShape> shapes_;  // by modulation and width, see emitterShapes_
-  std::vector<std::size_t> emitterShapes_;
+  std::vector<SpectrumShape> shapes_;
+  std::vector<std::size_t> emitterShapes_;  // by emitter, its shape
 
   double startHz_ = 0;
   double stepHz_ = 1;
