@@ -103,8 +103,8 @@ void SpectrumSimulator::place(Footprint& footprint, double centerHz) const {
   footprint.gains.clear();
   if (!(first <= last)) return;
   footprint.firstCell = static_cast<std::size_t>(first);
-  for (double cell = first; cell <= last; ++cell) {
-    const double awayHz = std::fabs(startHz_ + cell * stepHz_ - centerHz);
+  for (std::size_t cell = footprint.firstCell; cell <= static_cast<std::size_t>(last); ++cell) {
+    const double awayHz = std::fabs(startHz_ + static_cast<double>(cell) * stepHz_ - centerHz);
     footprint.gains.push_back(gain(shape, std::max(awayHz - stepHz_ / 2, 0.0)));
   }
 }
