@@ -19,11 +19,11 @@ namespace fs = std::filesystem;
 
 class CaptureFixture : public ::testing::Test {
  protected:
-  CaptureFixture() {
+  void SetUp() override {
     fs::remove_all(folder_);
     fs::create_directories(folder_);
   }
-  ~CaptureFixture() override { fs::remove_all(folder_); }
+  void TearDown() override { fs::remove_all(folder_); }
 
   // Its name is not ASCII.
   [[nodiscard]] fs::path native() const { return folder_ / u8"Gr\u00F6\u00DFe.capture"; }
