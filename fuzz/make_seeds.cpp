@@ -10,6 +10,7 @@
 #include <type_traits>
 #include <vector>
 
+#include "hosting/settings_file.h"
 #include "platform/result_reader.h"
 #include "platform/result_writer.h"
 #include "sources/capture_format.h"
@@ -365,6 +366,34 @@ Seeds recordingSeeds() {
   return seeds;
 }
 
+// What a host writes, what people make of it, and what each may be damaged to.
+Seeds settingsSeeds() {
+  SettingsFile file;
+  SettingsSection& window = file.section("window");
+  window.set("left", 0.1);
+  window.set("path = #[1]", "C:\\100%\n\x1b");
+  file.section("spectrum set-up 3")
+      .settings({{13, 0, 881.5e6},
+                 {740, -1, std::int16_t{1}},
+                 {314, 0, "a \"b\""},
+                 {7, 0, Variant::null()},
+                 {8, 0, Variant::Singles{0.5F, 1}},
+                 {9, 0, DateValue{1.5}},
+                 {10, 0, true},
+                 {11, 0, 0.1F}});
+  const std::string text = file.text();
+  const std::string whole[] = {text,
+                               "\xEF\xBB\xBF" + text,
+                               text + "\r\n",
+                               SettingsFile().text(),
+                               text.substr(0, text.size() / 2),
+                               text.substr(1)};
+  Seeds seeds;
+  for (const std::string& one : whole)
+    seeds.push_back({"settings_" + std::to_string(seeds.size()), Bytes(one.begin(), one.end())});
+  return seeds;
+}
+
 bool write(const std::filesystem::path& folder, const Seeds& seeds) {
   std::filesystem::create_directories(folder);
   return std::ranges::all_of(seeds, [&folder](const Seed& seed) {
@@ -390,6 +419,7 @@ int main(int argc, char** argv) {
                        write(corpus / "entry_points_fuzz", entryPointSeeds()) &&
                        write(corpus / "entry_parser_fuzz", entryParserSeeds()) &&
                        write(corpus / "capture_fuzz", captureSeeds()) &&
-                       write(corpus / "recording_fuzz", recordingSeeds());
+                       write(corpus / "recording_fuzz", recordingSeeds()) &&
+                       write(corpus / "settings_fuzz", settingsSeeds());
   return written ? 0 : 1;
 }

@@ -107,8 +107,8 @@ std::string sweepCsv(const ExportHeader& header, const DisplaySweep& sweep) {
   const std::size_t last = sweep.count - 2;  // the value behind it lies beyond the right edge
   const double startHz = sweep.range.centerHz - sweep.range.spanHz / 2;
   for (std::size_t i = 0; i <= last; ++i) {
-    const double place = static_cast<double>(i) / static_cast<double>(last);
-    addRow(csv, field(startHz + sweep.range.spanHz * place), field(sweep.values[i]));
+    const double offsetHz = sweep.range.spanHz * static_cast<double>(i) / static_cast<double>(last);
+    addRow(csv, field(startHz + offsetHz), field(sweep.values[i]));
   }
   return csv;
 }

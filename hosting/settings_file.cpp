@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <array>
 #include <charconv>
+#include <set>
 
 #include "framework/support/utf8.h"
 #include "hosting/file_text.h"
@@ -85,6 +86,8 @@ auto valueOf(Values& values, std::string_view name) noexcept {
                       [name](const SettingsSection::Value& value) { return value.first == name; });
 }
 
+}  // namespace
+
 // --- Reading
 
 class SettingsParser {
@@ -154,16 +157,17 @@ class SettingsParser {
     if (name.empty()) fail("no name before the =");
     if (beginsANumber(name)) return readSetting(name, value);
     const std::string plainName = unescaped(name);
-    if (section_->get<std::string>(plainName)) fail("\"" + plainName + "\" comes twice in this section");
-    section_->set(plainName, value);
+    if (!names_.insert(plainName).second) fail("\"" + plainName + "\" comes twice in this section");
+    section_->values_.emplace_back(plainName, value);
   }
 
   void readSection(std::string_view line, SettingsFile& file) {
     if (!line.ends_with(']')) fail("no ] behind the name of the section");
     const std::string name = unescaped(trimmedLine(line.substr(1, line.size() - 2)));
     if (name.empty()) fail("a section without a name");
-    if (file.find(name) != nullptr) fail("the section [" + name + "] comes twice");
-    section_ = &file.section(name);
+    if (!sectionNames_.insert(name).second) fail("the section [" + name + "] comes twice");
+    section_ = &file.sections_.emplace_back(name);
+    names_.clear();
   }
 
   // CODE or CODE,INDEX
@@ -175,9 +179,7 @@ class SettingsParser {
     if (!code || !index) fail("\"" + std::string(name) + "\" is no code of a setting");
     std::optional<Variant> parsed = parseSettingValue(value);
     if (!parsed) fail("\"" + value + "\" is no value of a setting");
-    std::vector<StoredSetting> settings = section_->settings();
-    settings.push_back({*code, *index, std::move(*parsed)});
-    section_->settings(std::move(settings));
+    section_->settings_.push_back({*code, *index, std::move(*parsed)});
   }
 
   [[nodiscard]] std::string unescaped(std::string_view text) const {
@@ -188,9 +190,13 @@ class SettingsParser {
 
   std::size_t number_ = 0;
   SettingsSection* section_ = nullptr;
+  std::set<std::string> names_;  // in that section
+  std::set<std::string> sectionNames_;
 };
 
 // --- Writing
+
+namespace {
 
 std::string settingLine(const StoredSetting& setting, std::optional<PanelKind> panel) {
   std::string line = exactText(setting.code);

@@ -47,6 +47,8 @@ class SettingsSection {
   friend bool operator==(const SettingsSection&, const SettingsSection&) = default;
 
  private:
+  friend class SettingsParser;
+
   std::string name_;
   std::vector<Value> values_;
   std::vector<StoredSetting> settings_;
@@ -84,6 +86,8 @@ class SettingsFile {
   friend bool operator==(const SettingsFile& a, const SettingsFile& b) { return a.sections_ == b.sections_; }
 
  private:
+  friend class SettingsParser;
+
   std::list<SettingsSection> sections_;
   bool changedByHand_ = false;
 };

@@ -16,8 +16,8 @@ namespace {
 namespace fs = std::filesystem;
 
 constexpr int kPathFileAccessError = 75;
-// Thousands of times what a host keeps.
-constexpr std::size_t kMaxBytes = 16U << 20U;
+// Many times what a host keeps.
+constexpr std::size_t kMaxBytes = 1U << 20U;
 constexpr int kMaxKept = 999;
 
 [[noreturn]] void raiseFor(const std::error_code& error) {
@@ -38,7 +38,7 @@ std::optional<std::string> readText(const fs::path& path) {
   file.read(text.data(), static_cast<std::streamsize>(text.size()));
   if (file.bad()) raiseDeviceIoError();
   text.resize(static_cast<std::size_t>(file.gcount()));
-  if (text.size() > kMaxBytes) throw RuntimeError(kPathFileAccessError, "the file is larger than 16 MB");
+  if (text.size() > kMaxBytes) throw RuntimeError(kPathFileAccessError, "the file is larger than 1 MB");
   return text;
 }
 
