@@ -6,6 +6,7 @@
 
 #include "framework/support/guard.h"
 #include "hosting/settings_file.h"
+#include "hosting/taken_file.h"
 #include "hosting/whole_file.h"
 #include "platform/file_path.h"
 #include "platform/runtime_error.h"
@@ -20,20 +21,24 @@ constexpr int kPathFileAccessError = 75;
 constexpr std::size_t kMaxBytes = 1U << 20U;
 constexpr int kMaxKept = 999;
 
-[[noreturn]] void raiseFor(const std::error_code& error) {
-  throw RuntimeError(kPathFileAccessError, error.message());
+// Leaves `file` closed where there is none.
+std::error_code openFile(const fs::path& path, std::ifstream& file) {
+  std::error_code error;
+  const fs::file_status status = fs::status(path, error);
+  if (status.type() == fs::file_type::not_found) return {};
+  if (error) return error;
+  if (!fs::is_regular_file(status)) throw RuntimeError(kPathFileAccessError, "this is no file");
+  errno = 0;
+  file.open(path, std::ios::binary);
+  return file.is_open() ? std::error_code() : std::error_code(errno, std::generic_category());
 }
 
 // Nothing where there is no file.
 std::optional<std::string> readText(const fs::path& path) {
-  std::error_code error;
-  const fs::file_status status = fs::status(path, error);
-  if (status.type() == fs::file_type::not_found) return std::nullopt;
-  if (error) raiseFor(error);
-  if (!fs::is_regular_file(status)) throw RuntimeError(kPathFileAccessError, "this is no file");
-  errno = 0;
-  std::ifstream file(path, std::ios::binary);
-  if (!file) raiseFor({errno, std::generic_category()});
+  std::ifstream file;
+  const std::error_code error = onceFree([&] { return openFile(path, file); });
+  if (error) throw RuntimeError(kPathFileAccessError, error.message());
+  if (!file.is_open()) return std::nullopt;
   std::string text(kMaxBytes + 1, '\0');
   file.read(text.data(), static_cast<std::streamsize>(text.size()));
   if (file.bad()) raiseDeviceIoError();

@@ -4,13 +4,11 @@
 
 #include <algorithm>
 #include <cerrno>
-#include <chrono>
 #include <filesystem>
-#include <limits>
 #include <system_error>
-#include <thread>
 #include <utility>
 
+#include "hosting/taken_file.h"
 #include "platform/file_path.h"
 #include "platform/runtime_error.h"
 
@@ -30,16 +28,11 @@ namespace {
 namespace fs = std::filesystem;
 
 constexpr int kPathFileAccessError = 75;
-// Another program that saves the same file, or looks through it, is given so long.
-constexpr int kAttempts = 200;
-constexpr std::chrono::milliseconds kBetweenAttempts(10);
 
 std::error_code lastError() noexcept { return {errno, std::generic_category()}; }
 
 // What the two systems word differently: a file of one's own, open for writing and empty.
 #ifdef _WIN32
-bool isTaken(const std::error_code& error) noexcept { return error == std::errc::permission_denied; }
-
 int openOwn(const fs::path& path) noexcept {
   // Shared with nobody: a second program cannot open it before this one is through.
   return _wsopen(path.c_str(), _O_CREAT | _O_TRUNC | _O_WRONLY | _O_BINARY | _O_NOINHERIT, _SH_DENYRW,
@@ -54,8 +47,6 @@ void bringNameToDisk(const fs::path&) noexcept {}
 // An open file cannot be renamed here.
 constexpr bool kCloseBeforeRename = true;
 #else
-bool isTaken(const std::error_code& error) noexcept { return error == std::errc::operation_would_block; }
-
 // A lock on a file that was renamed away meanwhile is none on this path: that file must not be emptied.
 bool isAt(const fs::path& path, int file) noexcept {
   struct stat opened {};
@@ -94,16 +85,6 @@ void bringNameToDisk(const fs::path& path) noexcept {
 constexpr bool kCloseBeforeRename = false;
 #endif
 
-// Tries again while another program has the file.
-template <class Step>
-std::error_code onceFree(const Step& step) {
-  for (int attempt = 1;; ++attempt) {
-    const std::error_code error = step();
-    if (!isTaken(error) || attempt == kAttempts) return error;
-    std::this_thread::sleep_for(kBetweenAttempts);
-  }
-}
-
 // The file aside; its name goes with it unless it was renamed.
 class AsideFile {
  public:
@@ -118,13 +99,10 @@ class AsideFile {
   AsideFile(const AsideFile&) = delete;
   AsideFile& operator=(const AsideFile&) = delete;
 
-  std::error_code openFile() {
-    const std::error_code error = onceFree([this] {
-      file_ = openOwn(path_);
-      return file_ >= 0 ? std::error_code() : lastError();
-    });
-    own_ = !error;
-    return error;
+  std::error_code openFile() noexcept {
+    file_ = openOwn(path_);
+    own_ = file_ >= 0;
+    return own_ ? std::error_code() : lastError();
   }
 
   std::error_code fill(std::span<const std::uint8_t> bytes) noexcept {
@@ -144,11 +122,7 @@ class AsideFile {
     if (const fs::file_status old = fs::status(path, error); fs::exists(old))
       fs::permissions(path_, old.permissions(), error);
     if (kCloseBeforeRename && shut() != 0) return lastError();
-    error = onceFree([&] {
-      std::error_code refused;
-      fs::rename(path_, path, refused);
-      return refused;
-    });
+    fs::rename(path_, path, error);
     if (error) return error;
     own_ = false;
     bringNameToDisk(path);
@@ -163,19 +137,25 @@ class AsideFile {
   bool own_ = false;
 };
 
+std::error_code saveOnce(const fs::path& path, std::span<const std::uint8_t> bytes) {
+  fs::path aside = path;
+  aside += ".part";
+  AsideFile file(std::move(aside));
+  std::error_code error = file.openFile();
+  if (!error) error = file.fill(bytes);
+  if (!error) error = file.rename(path);
+  return error;
+}
+
 std::error_code save(fs::path path, std::span<const std::uint8_t> bytes) {
   std::error_code error;
   if (fs::is_symlink(path, error)) {
     path = fs::canonical(path, error);
     if (error) return error;
   }
-  fs::path aside = path;
-  aside += ".part";
-  AsideFile file(std::move(aside));
-  error = file.openFile();
-  if (!error) error = file.fill(bytes);
-  if (!error) error = file.rename(path);
-  return error;
+  // From its beginning each time: where a file is closed before it is renamed, another program may have taken
+  // it.
+  return onceFree([&] { return saveOnce(path, bytes); });
 }
 
 }  // namespace

@@ -82,8 +82,9 @@ TEST(SettingsFileTest, AnyNameAndAnyTextSurvive) {
   for (const std::string& text : texts) {
     SettingsSection& section = file.section("section " + text);
     section.set("name " + text, text);
+    section.set("text", text);
     section.set(text + "!", "by that name");
-    section.settings({{314, 0, text}});
+    section.settings({{314, 0, text}, {-1, 0, 1.0}});
   }
   EXPECT_EQ(SettingsFile::parse(file.text()), file);
 }
@@ -212,6 +213,7 @@ TEST(SettingsFileTest, SaysInWhichLineAndWhyATextIsDamaged) {
       {"[a]\n13 =", "line 3: \"\" is no value of a setting"},
       {"[a]\nx = \xE4", "line 3: this is no UTF-8"},
       {"[a]\nx = "s + '\0', "line 3: a control character (0)"},
+      {"# checksum 000000000, end of the settings\nx", "line 3: a value before the first section"},
       {"# checksum 00000000, end of the settings\n[a]", "line 3: something follows the end of the settings"}};
   for (const auto& row : rows)
     EXPECT_EQ(problemOf("# Front Panels settings, format 1\n" + row.lines + kEnd), row.problem);
