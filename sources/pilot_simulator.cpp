@@ -244,7 +244,9 @@ CarrierState PilotSimulator::carrier(std::uint64_t frame, double timeS) const {
   const double onePps = sky.hidden ? 0 : 1;
   if (!heard_ || elapsedS < kSearchS) return {initialHz + driftHz + kSearchNoiseHz * noise, 0, onePps};
   const double errorHz = initialHz * portableExp(-(elapsedS - kSearchS) / kSettlingS) + driftHz;
-  return {errorHz + kNoiseHz * noise, std::fabs(errorHz) > kLockedHz ? 1 : 2, onePps};
+  // The receiver counts tenths of a hertz.
+  const double countedHz = std::nearbyint((errorHz + kNoiseHz * noise) * 10) / 10;
+  return {countedHz, std::fabs(errorHz) > kLockedHz ? 1 : 2, onePps};
 }
 
 }  // namespace frontpanels
