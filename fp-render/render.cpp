@@ -5,194 +5,252 @@
 #include <iomanip>
 #include <sstream>
 #include <string>
-#include <system_error>
-#include <vector>
 
-#include "fp-render/headless_panel.h"
+#include "fp-render/console.h"
 #include "fp-render/options.h"
+#include "fp-render/panel_picture.h"
+#include "fp-render/panel_setup.h"
+#include "fp-render/picture_file.h"
 #include "framework/support/error_handler.h"
-#include "framework/support/guard.h"
-#include "hosting/whole_file.h"
-#include "platform/file_path.h"
-#include "platform/raster/png.h"
+#include "framework/support/host_codes.h"
 #include "platform/runtime_error.h"
-#include "sources/resample.h"
-#include "sources/sweep_recording.h"
-#include "sources/vertical_scale.h"
+#include "sources/frame_source.h"
 
 namespace frontpanels {
 namespace {
 
 namespace fs = std::filesystem;
 
-constexpr int kPathFileAccessError = 75;
-
-// What a first walk through the recording tells: all pictures have one scale, whichever of them are drawn.
-struct Survey {
-  std::uint64_t sweeps = 0;
-  LevelRange levels;
-};
-
-Survey survey(SweepRecording& recording) {
-  Survey result;
-  DisplaySweep display;
-  for (Sweep sweep; recording.next(sweep); ++result.sweeps) {
-    resample(sweep, display);
-    result.levels.add(display.shown());
-  }
-  return result;
-}
+constexpr int kIllegalCall = 5;
 
 std::string counted(std::uint64_t count, const char* thing) {
   return std::to_string(count) + " " + thing + (count == 1 ? "" : "s");
 }
 
-std::string pictureName(const std::string& recording, std::uint64_t number) {
-  std::ostringstream name;
-  name << fs::path(recording).stem().string() << "-sweep-" << std::setfill('0') << std::setw(4) << number
-       << ".png";
-  return name.str();
+bool holds(const Frame& frame, PanelKind panel) {
+  return panel == PanelKind::Spectrum ? frame.sweep.has_value() : frame.pilots.has_value();
 }
 
-std::string captionOf(const std::string& recording, const Sweep& sweep, std::uint64_t sweeps) {
-  return fs::path(recording).filename().string() + "   sweep " + std::to_string(sweep.number) + " of " +
-         std::to_string(sweeps) + "   " + sweep.time;
-}
-
-std::string pictureLine(const fs::path& path, const Sweep& sweep) {
+std::string wordsOf(const Sweep& sweep) {
   constexpr double kMega = 1e6;
   const double stopHz = sweep.startHz + sweep.stepHz * static_cast<double>(sweep.levelsDb.size());
-  std::ostringstream line;
-  line << path.string() << "  " << sweep.time << "  " << std::setprecision(10) << sweep.startHz / kMega
-       << " to " << stopHz / kMega << " MHz, " << counted(sweep.levelsDb.size(), "bin");
-  return line.str();
+  std::ostringstream words;
+  words << std::setprecision(10) << sweep.startHz / kMega << " to " << stopHz / kMega << " MHz, "
+        << counted(sweep.levelsDb.size(), "bin");
+  return words.str();
 }
 
-void createFolder(const std::string& folder) {
-  std::error_code error;
-  fs::create_directories(folder, error);
-  if (!error && !fs::is_directory(folder)) error = std::make_error_code(std::errc::not_a_directory);
-  if (error) throw RuntimeError(kPathFileAccessError, folder + ": cannot be created: " + error.message());
+std::string wordsOf(const PilotFrame& frame) {
+  std::string words;
+  const auto add = [&words](const char* set, const auto& data, auto sizeOf) {
+    if (data) words += (words.empty() ? "" : ", ") + std::string(set) + " " + std::to_string(sizeOf(*data));
+  };
+  const auto levels = [](const PilotLevels& data) { return data.ecIoDb.size(); };
+  const auto pilots = [](const PilotBars& data) { return data.pilots.size(); };
+  add("all", frame.allPilots, levels);
+  add("zoomed", frame.zoomedPilots, levels);
+  add("top", frame.topN, pilots);
+  add("list", frame.userList, pilots);
+  return words;
 }
 
-// Runs `body` and says what ended it, if anything did.
-template <class Body>
-void sayFailure(std::ostream& errors, const Body& body) noexcept {
-  try {
-    body();
-  } catch (...) {
-    errors << "fp-render: " << describeCurrentException() << '\n';
-  }
-}
-
-// What the panel had to report; its lines end with a carriage return.
-void sayMessages(std::ostream& errors) {
-  for (std::string message : messageLog().messages()) {
-    std::replace(message.begin(), message.end(), '\r', ' ');
-    errors << "fp-render: the panel reports: " << message << '\n';
-  }
+// Markers in the panel's unit; the options are those that problemWith has passed.
+WantedMarkers markersOf(const RenderOptions& options, PanelKind panel) {
+  const auto placeOf = [panel](const std::string& text) {
+    return panel == PanelKind::Spectrum ? frequencyHzOf(text) : pnOffsetOf(text);
+  };
+  WantedMarkers wanted{{}, options.peak};
+  for (const MarkerPlace& marker : options.markers)
+    wanted.at.push_back(
+        {placeOf(marker.place).value(), marker.delta ? placeOf(*marker.delta) : std::nullopt});
+  return wanted;
 }
 
 class Renderer {
  public:
-  Renderer(const RenderOptions& options, SweepRecording& recording, std::ostream& output,
-           std::ostream& errors)
-      : options_(options), recording_(recording), output_(output), errors_(errors) {}
+  // `frames` is how many the source has.
+  Renderer(const RenderOptions& options, FrameSource& source, std::uint64_t frames, Console& console)
+      : options_(options),
+        source_(source),
+        frames_(frames),
+        panel_(options.panel.value_or(source.hasSweeps() ? PanelKind::Spectrum : PanelKind::Pilots)),
+        console_(console),
+        pictures_(options.directory, options.overwrite) {}
 
   // The number of pictures drawn.
   std::uint64_t run() {
-    survey_ = survey(recording_);
-    const std::string problems = recording_.problemReport();
-    if (!problems.empty()) errors_ << problems << '\n';
-    if (options_.sweep && *options_.sweep > survey_.sweeps) {
-      errors_ << recording_.path() << ": has " << counted(survey_.sweeps, "sweep") << ", no sweep "
-              << *options_.sweep << '\n';
-      return 0;
-    }
-    if (survey_.levels.isEmpty()) {
-      errors_ << recording_.path() << ": every level is missing, there is nothing to draw\n";
-      return 0;
-    }
+    if (const std::string problem = problemWith(options_, panel_); !problem.empty())
+      throw UsageError(problem);
+    if (panel_ == PanelKind::Spectrum ? !source_.hasSweeps() : !source_.hasPilots())
+      return nothing(std::string("holds no ") + (panel_ == PanelKind::Spectrum ? "sweeps" : "pilots"));
+    if (options_.range.first > frames_)
+      return nothing("has " + counted(frames_, thing()) + ", no " + thing() + " " +
+                     std::to_string(options_.range.first));
+    makePicture();
+    survey();
+    if (!picture_->hasLevels()) return nothing(picture_->missingLevels() + ", there is nothing to draw");
+    picture_->fitScale(options_.topDb, options_.dbPerDivision);
+    picture_->markers(markersOf(options_, panel_));
     createFolder(options_.directory);
-    sayFailure(errors_, [this] { drawAll(); });  // the pictures made before stay and count
-    sayMessages(errors_);
+    console_.run([this] { drawAll(); });  // the pictures made before stay and count
+    console_.reportsOfPanel();
     return drawn_;
   }
 
  private:
-  void drawAll() {
-    HeadlessPanel panel(verticalScaleFor(survey_.levels));
-    DisplaySweep display;
-    recording_.rewind();
-    for (Sweep sweep; recording_.next(sweep);) {
-      if (options_.sweep && sweep.number < *options_.sweep) continue;
-      resample(sweep, display);
-      draw(panel, sweep, display);
-      if (options_.sweep) return;
+  [[nodiscard]] const char* thing() const { return panel_ == PanelKind::Spectrum ? "sweep" : "frame"; }
+
+  std::uint64_t nothing(const std::string& why) {
+    console_.problem(source_.name() + ": " + why);
+    return 0;
+  }
+  void problem(const Frame& frame, const std::string& what) {
+    console_.problem(source_.name() + ": " + thing() + " " + std::to_string(frame.number) + ": " + what);
+  }
+
+  template <class Each>
+  void forEach(std::uint64_t first, std::uint64_t last, Each each) {
+    source_.seek(first);
+    for (Frame frame; frame.number < last && source_.next(frame);)
+      if (holds(frame, panel_)) each(frame);
+  }
+
+  void makePicture() {
+    const PictureLook look{options_.sizePx, options_.dpi, options_.fields, options_.caption != ""};
+    picture_ = panel_ == PanelKind::Spectrum ? makeSpectrumPicture(look)
+                                             : makePilotPicture(look, options_.sets.value_or(setsHeld()));
+    if (!options_.settingsFile.empty()) applyFile();
+    if (options_.centerHz) apply({kCenterFrequencyParameter, 0, *options_.centerHz});
+    if (options_.spanHz) apply({kSpanParameter, 0, *options_.spanHz});
+    for (const StoredSetting& setting : options_.settings) apply(setting);
+  }
+
+  void apply(const StoredSetting& setting) {
+    if (picture_->set(setting)) return;
+    console_.reportsOfPanel();
+    throw UsageError(cannotUse(setting));
+  }
+
+  // One setting that the panel has no use for does not cost the others.
+  void applyFile() {
+    for (const StoredSetting& setting : readPanelSetup(options_.settingsFile, panel_, options_.setUp)) {
+      if (picture_->set(setting)) continue;
+      console_.reportsOfPanel();
+      console_.problem(options_.settingsFile + ": " + cannotUse(setting));
     }
   }
 
-  void draw(HeadlessPanel& panel, const Sweep& sweep, const DisplaySweep& display) {
-    if (!sweep.hasLevels()) {
-      errors_ << recording_.path() << ": sweep " << sweep.number << ": every level is missing, no picture\n";
-      return;
+  [[nodiscard]] static std::string cannotUse(const StoredSetting& setting) {
+    return "the panel cannot use " + settingValueText(setting.value) + " for code " +
+           std::to_string(setting.code);
+  }
+
+  [[nodiscard]] ShownSets setsHeld() {
+    ShownSets held{};
+    source_.seek(1);
+    for (Frame frame; frame.number < frames_ && source_.next(frame);) {
+      if (!frame.pilots) continue;
+      const bool inFrame[] = {frame.pilots->allPilots.has_value(), frame.pilots->zoomedPilots.has_value(),
+                              frame.pilots->topN.has_value(), frame.pilots->userList.has_value()};
+      for (std::size_t set = 0; set < kPilotSets; ++set) held[set] = held[set] || inFrame[set];
+      if (std::all_of(held.begin(), held.end(), [](bool set) { return set; })) break;
     }
-    panel.show(display, captionOf(recording_.path(), sweep, survey_.sweeps));
-    const fs::path path = fs::path(options_.directory) / pictureName(recording_.path(), sweep.number);
-    std::string problem;
-    if (!encodePng(panel.picture(), png_, problem))
-      throw RuntimeError(kPathFileAccessError, path.string() + ": " + problem);
-    saveWhole(utf8FromPath(path), png_);
+    return held;
+  }
+
+  void survey() {
+    forEach(1, frames_, [this](const Frame& frame) { picture_->survey(frame); });
+    if (const std::string problems = source_.problemReport(); !problems.empty()) console_.problem(problems);
+  }
+
+  void drawAll() {
+    const std::uint64_t last = std::min(options_.range.last.value_or(frames_), frames_);
+    forEach(options_.range.first, last, [this](const Frame& frame) {
+      if ((frame.number - options_.range.first) % options_.every == 0) draw(frame);
+    });
+    if (drawn_ == 0 && console_.problems() == 0)
+      throw RuntimeError(kIllegalCall, source_.name() + ": none of these frames has anything for this panel");
+  }
+
+  void draw(const Frame& frame) {
+    if (!picture_->show(frame)) return problem(frame, picture_->missingLevels() + ", no picture");
+    for (const std::string& place : picture_->markersLeftOut())
+      problem(frame, "the marker at " + place + " lies outside of the graph and is left out");
+    const PixelView picture = picture_->picture(options_.caption.value_or(captionOf(frame)));
+    const std::string path = pictures_.save(nameOf(frame), picture);
     ++drawn_;
-    output_ << pictureLine(path, sweep) << '\n';
+    console_.say(path + "  " + frame.time + "  " +
+                 (panel_ == PanelKind::Spectrum ? wordsOf(*frame.sweep) : wordsOf(*frame.pilots)));
+    for (const std::string& reading : picture_->markerReadings()) console_.say("  " + reading);
+  }
+
+  [[nodiscard]] std::string captionOf(const Frame& frame) const {
+    return fs::path(source_.name()).filename().string() + "   " + thing() + " " +
+           std::to_string(frame.number) + " of " + std::to_string(frames_) + "   " + frame.time;
+  }
+
+  [[nodiscard]] std::string nameOf(const Frame& frame) const {
+    std::ostringstream name;
+    if (!options_.name.empty())
+      name << options_.name;
+    else if (options_.seed)
+      name << "simulation-" << *options_.seed;
+    else
+      name << fs::path(options_.recording).stem().string();
+    name << (panel_ == PanelKind::Spectrum ? "-sweep-" : "-pilots-") << std::setfill('0') << std::setw(4)
+         << frame.number << ".png";
+    return name.str();
   }
 
   const RenderOptions& options_;
-  SweepRecording& recording_;
-  std::ostream& output_;
-  std::ostream& errors_;
-  Survey survey_;
-  std::vector<std::uint8_t> png_;
+  FrameSource& source_;
+  std::uint64_t frames_;
+  PanelKind panel_;
+  Console& console_;
+  PictureFiles pictures_;
+  std::unique_ptr<PanelPicture> picture_;
   std::uint64_t drawn_ = 0;
 };
 
-int renderRecording(const RenderOptions& options, TextFiles& files, std::ostream& output,
-                    std::ostream& errors) {
-  const auto recording = SweepRecording::open(files, options.recording);
-  Renderer renderer(options, *recording, output, errors);
-  const std::uint64_t drawn = renderer.run();
+int renderFrames(const RenderOptions& options, TextFiles& files, Console& console) {
+  const std::unique_ptr<FrameSource> source = openRecording(files, options.recording);
+  const std::uint64_t drawn = Renderer(options, *source, source->frameCount().value_or(1), console).run();
   if (drawn == 0) return kNothingDrawn;
-  output << counted(drawn, "picture") << " of a recording of " << sweepFormatName(recording->format())
-         << '\n';
-  return kDrawn;
+  console.say(counted(drawn, "picture") + " of a recording of " + source->formatName());
+  console.finish();
+  return console.problems() == 0 ? kDrawn : kDrawnWithProblems;
 }
 
-int renderCommand(std::span<const char* const> arguments, TextFiles& files, std::ostream& output,
-                  std::ostream& errors) {
+int renderCommand(std::span<const char* const> arguments, TextFiles& files, Console& console) {
   RenderOptions options;
   std::string problem;
-  if (!parseOptions(arguments, options, problem)) {
-    errors << "fp-render: " << problem << "\n\n" << kRenderUsage;
-    return kWrongUsage;
-  }
+  if (!parseOptions(arguments, options, problem)) throw UsageError(problem);
   if (options.help) {
-    output << kRenderUsage;
+    console.say(renderUsage());
     return kDrawn;
   }
   if (options.version) {
-    output << "fp-render " << FRONTPANELS_VERSION << '\n';
+    console.say("fp-render " FRONTPANELS_VERSION);
     return kDrawn;
   }
-  return renderRecording(options, files, output, errors);
+  return renderFrames(options, files, console);
 }
 
 }  // namespace
 
 int render(std::span<const char* const> arguments, TextFiles& files, std::ostream& output,
            std::ostream& errors) noexcept {
-  messageLog().clear();
   int exitCode = kNothingDrawn;
-  sayFailure(errors, [&] { exitCode = renderCommand(arguments, files, output, errors); });
+  guard("fp-render", [&] {
+    messageLog().clear();
+    Console console(output, errors);
+    try {
+      console.run([&] { exitCode = renderCommand(arguments, files, console); });
+    } catch (const UsageError& error) {
+      console.problem("fp-render: " + error.text() + "\n\"fp-render --help\" explains the command line");
+      exitCode = kWrongUsage;
+    }
+  });
   return exitCode;
 }
 

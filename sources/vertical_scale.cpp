@@ -14,11 +14,21 @@ void LevelRange::add(std::span<const float> levelsDb) noexcept {
 }
 
 VerticalScale verticalScaleFor(const LevelRange& range) noexcept {
-  if (range.isEmpty()) return {};
+  return verticalScaleFor(range, std::nullopt, std::nullopt);
+}
+
+VerticalScale verticalScaleFor(const LevelRange& range, std::optional<double> topDb,
+                               std::optional<double> dbPerDivision) noexcept {
+  constexpr VerticalScale kUsual;
+  if (range.isEmpty()) return {topDb.value_or(kUsual.topDb), dbPerDivision.value_or(kUsual.dbPerDivision)};
+  const auto topFor = [&](double step) {
+    return topDb.value_or((std::floor(static_cast<double>(range.highestDb) / step) + 1) * step);
+  };
+  if (dbPerDivision) return {topFor(*dbPerDivision), *dbPerDivision};
   for (double decade = 1;; decade *= 10) {
     for (const double unit : {1.0, 2.0, 5.0}) {
       const double step = unit * decade;
-      const double top = (std::floor(static_cast<double>(range.highestDb) / step) + 1) * step;
+      const double top = topFor(step);
       if (top - kVerticalDivisions * step <= static_cast<double>(range.lowestDb)) return {top, step};
     }
   }

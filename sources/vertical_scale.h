@@ -2,6 +2,7 @@
 #pragma once
 
 #include <limits>
+#include <optional>
 #include <span>
 
 namespace frontpanels {
@@ -27,5 +28,9 @@ struct VerticalScale {
 // divisions and above all levels, so that ten divisions hold them all. What to show nothing on is ten
 // divisions of 10 dB below 0.
 [[nodiscard]] VerticalScale verticalScaleFor(const LevelRange& range) noexcept;
+// What is given stays, the other is the smallest, or the lowest, with which the lower end holds all levels.
+// `dbPerDivision` is above 0.
+[[nodiscard]] VerticalScale verticalScaleFor(const LevelRange& range, std::optional<double> topDb,
+                                             std::optional<double> dbPerDivision) noexcept;
 
 }  // namespace frontpanels

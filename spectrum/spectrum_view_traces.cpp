@@ -54,16 +54,17 @@ std::size_t SpectrumView::readSweep(std::int32_t index) {
 }
 
 // A marker keeps its point; where there is another number of points it keeps its frequency as well as it can.
+// One that was restored ahead of the first sweep has none yet.
 void SpectrumView::showSweep(clsMultiTracePainter& painter, std::span<const float> levels) {
   const auto points = static_cast<std::int32_t>(levels.size());
-  const bool otherPoints = points != painter.numberOfMeasurements();
+  const std::int32_t pointsBefore = painter.numberOfMeasurements();
   painter.numberOfMeasurements(points);
   painter.dataChanged(true);
   painter.span(fields_.frequency.span.value());
   painter.trace(levels);
   painter.traceSize(points);
   painter.offset(0);
-  if (otherPoints && points > 1 && painter.span() != 0) painter.ResetMarkers();
+  if (pointsBefore > 0 && points != pointsBefore && points > 1 && painter.span() != 0) painter.ResetMarkers();
 }
 
 clsMultiTracePainter* SpectrumView::findPainter() {

@@ -10,6 +10,7 @@
 #include <sstream>
 #include <vector>
 
+#include "hosting/settings_file.h"
 #include "tests/support/memory_text_files.h"
 
 namespace frontpanels {
@@ -79,8 +80,70 @@ TEST_F(RenderTest, DrawsAPictureASweepIntoAFolderThatItMakes) {
   EXPECT_EQ(bytes("a-sweep-0002.png"), second);
 }
 
+TEST_F(RenderTest, DrawsTheSweepsOfARangeAndOfThoseEveryNth) {
+  std::string seven;
+  for (const char second : {'1', '2', '3', '4', '5', '6', '7'})
+    seven += std::string("2020-01-01,00:00:0") + second + ",100000000,102000000,1000000.00,1,-60,-20\n";
+  const struct {
+    std::vector<const char*> options;
+    const char* numbers;
+  } kCases[] = {{{"--sweeps", "3-5"}, "345"}, {{"--sweeps", "6-"}, "67"},
+                {{"--sweeps", "-2"}, "12"},   {{"--sweeps", "7-99"}, "7"},
+                {{"--every", "3"}, "147"},    {{"--sweeps", "2-6", "--every", "2"}, "246"},
+                {{"--sweep", "4"}, "4"}};
+  for (const auto& testCase : kCases) {
+    EXPECT_EQ(draw(seven, testCase.options), 0);
+    std::string expected;
+    for (const char number : std::string(testCase.numbers))
+      expected += std::string("a-sweep-000") + number + ".png ";
+    EXPECT_EQ(pictures(), expected);
+    fs::remove_all(out);
+  }
+}
+
+TEST_F(RenderTest, LeavesPicturesThatAreThereUnlessItMayOverwriteThem) {
+  EXPECT_EQ(draw(kTwoSweeps, {"--sweep", "2"}), 0);
+  const std::string first = bytes("a-sweep-0002.png");
+  EXPECT_EQ(draw(kTwoSweeps, {"--top", "0"}), 3);
+  EXPECT_EQ(errors.str(),
+            "fp-render: " + out + "/a-sweep-0002.png: is there already; --overwrite replaces it\n");
+  EXPECT_EQ(bytes("a-sweep-0002.png"), first);
+  EXPECT_EQ(draw(kTwoSweeps, {"--top", "0", "--overwrite"}), 0);
+  EXPECT_NE(bytes("a-sweep-0002.png"), first);
+  EXPECT_EQ(draw(kTwoSweeps, {"--name", "other", "--sweep", "1"}), 0);
+  EXPECT_EQ(pictures(), "a-sweep-0001.png a-sweep-0002.png other-sweep-0001.png ");
+}
+
+TEST_F(RenderTest, SetsThePanelUpAsASettingsFileAndTheCommandLineSayTheLatterLast) {
+  SettingsFile settings;
+  settings.section("spectrum").settings({{716, 0, 20.0}, {717, 0, 10.0}});
+  settings.section("spectrum set-up 3").settings({{716, 0, 7.0}, {9999, 0, 1.0}});
+  const std::string path = (folder / "settings").string();
+  saveSettings(path, settings);
+  EXPECT_EQ(draw(kTwoSweeps, {"--sweep", "1", "--settings", path.c_str()}), 0);
+  const std::string set = bytes("a-sweep-0001.png");
+  const auto again = [&](std::vector<const char*> options, int exitCode) {
+    options.insert(options.end(), {"--sweep", "1", "--overwrite"});
+    EXPECT_EQ(draw(kTwoSweeps, options), exitCode) << errors.str();
+    return bytes("a-sweep-0001.png");
+  };
+  EXPECT_EQ(again({"--set", "716=20", "--set", "717=10"}, 0), set);
+  EXPECT_EQ(again({"--top", "10", "--per-division", "20"}, 0), set);
+  EXPECT_NE(again({"--settings", path.c_str(), "--set", "716=10"}, 0), set);
+  again({"--settings", path.c_str(), "--set-up", "3"}, 3);
+  EXPECT_EQ(errors.str(),
+            "fp-render: the panel reports: SpectrumView::vfpSet() ... unhandled parameterType = 9999 \n" +
+                path + ": the panel cannot use 1 for code 9999\n");
+  again({"--settings", path.c_str(), "--set-up", "4"}, 1);
+  EXPECT_EQ(errors.str(), "fp-render: " + path + ": has no section [spectrum set-up 4]\n");
+  std::ofstream(path) << "what is this";
+  again({"--settings", path.c_str()}, 1);
+  EXPECT_TRUE(errors.str().starts_with("fp-render: " + path + ": "));
+  EXPECT_EQ(std::distance(fs::directory_iterator(folder), {}), 2) << "the file stays where it is";
+}
+
 TEST_F(RenderTest, KeepsTheGoodRowsNamesTheBadOnesAndDrawsNothingForASweepWithoutLevels) {
-  EXPECT_EQ(draw(std::string(kAllMissing) + "what is this\n" + kTwoSweeps + kAllMissing), 0);
+  EXPECT_EQ(draw(std::string(kAllMissing) + "what is this\n" + kTwoSweeps + kAllMissing), 3);
   EXPECT_EQ(pictures(), "a-sweep-0002.png a-sweep-0003.png ");
   EXPECT_EQ(errors.str(),
             "van/a.csv: 1 row could not be read, 1 row out of order\n"
@@ -97,14 +160,25 @@ TEST_F(RenderTest, AnswersOneAndSaysWhyWhenNothingCanBeDrawn) {
   EXPECT_EQ(errors.str(), "fp-render: van/a.csv: the file is empty\n");
   EXPECT_EQ(draw(kAllMissing), 1);
   EXPECT_EQ(errors.str(), "van/a.csv: every level is missing, there is nothing to draw\n");
-  EXPECT_EQ(draw(kTwoSweeps, {"--sweep", "3"}), 1);
-  EXPECT_EQ(errors.str(), "van/a.csv: has 2 sweeps, no sweep 3\n");
+  const struct {
+    std::vector<const char*> options;
+    const char* problem;
+  } kCases[] = {
+      {{"--sweep", "3"}, "van/a.csv: has 2 sweeps, no sweep 3\n"},
+      {{"--panel", "pilots"}, "van/a.csv: holds no pilots\n"},
+      {{"--center", "200M", "--span", "1M"},
+       "van/a.csv: every level from 199.5 MHz to 200.5 MHz is missing, there is nothing to draw\n"},
+  };
+  for (const auto& testCase : kCases) {
+    EXPECT_EQ(draw(kTwoSweeps, testCase.options), 1);
+    EXPECT_EQ(errors.str(), testCase.problem);
+  }
   EXPECT_FALSE(fs::exists(out));
 }
 
 TEST_F(RenderTest, LeavesNoHalfPictureWhereItCannotWrite) {
   fs::create_directories(out + "/a-sweep-0001.png/in the way");
-  EXPECT_EQ(draw(kTwoSweeps), 1);
+  EXPECT_EQ(draw(kTwoSweeps, {"--overwrite"}), 1);
   EXPECT_EQ(pictures(), "a-sweep-0001.png ");
   EXPECT_EQ(errors.str(), "fp-render: " + out + "/a-sweep-0001.png: cannot be written: Is a directory\n");
   fs::remove_all(out);
@@ -113,14 +187,42 @@ TEST_F(RenderTest, LeavesNoHalfPictureWhereItCannotWrite) {
   EXPECT_EQ(errors.str(), "fp-render: " + out + ": cannot be created: Not a directory\n");
 }
 
+TEST_F(RenderTest, SaysWhatMarkersReadAndWhichOnesAreLeftOut) {
+  EXPECT_EQ(draw(kTwoSweeps, {"--sweep", "2", "--marker", "101M", "--marker", "99M"}), 3);
+  EXPECT_EQ(output.str(), out + "/a-sweep-0002.png  2020-01-01 00:00:11  100 to 103 MHz, 3 bins\n" +
+                              "  Marker 1: 101 MHz, -21 dBm\n1 picture of a recording of rtl_power\n");
+  EXPECT_EQ(errors.str(),
+            "van/a.csv: sweep 2: the marker at 99 MHz lies outside of the graph and is left out\n");
+}
+
+TEST_F(RenderTest, ReportsResultsThatNobodyReceives) {
+  output.setstate(std::ios::badbit);
+  files.contents["a.csv"] = kTwoSweeps;
+  EXPECT_EQ(render(std::vector<const char*>{"a.csv", "-o", out.c_str()}, files, output, errors), 3);
+  EXPECT_EQ(errors.str(), "fp-render: standard output: cannot be written\n");
+}
+
+TEST_F(RenderTest, AnswersTwoForWhatThePanelCannotUse) {
+  EXPECT_EQ(draw(kTwoSweeps, {"--set", "740=x"}), 2);
+  EXPECT_EQ(errors.str(),
+            "fp-render: the panel reports: clsBaseVFP::vfpSet() ...  Type mismatch\n"
+            "fp-render: the panel cannot use \"x\" for code 740\n"
+            "\"fp-render --help\" explains the command line\n");
+  EXPECT_EQ(draw(kTwoSweeps, {"--sets", "all"}), 2);
+  EXPECT_EQ(errors.str(),
+            "fp-render: --sets is for pilots\n\"fp-render --help\" explains the command line\n");
+  EXPECT_FALSE(fs::exists(out));
+}
+
 TEST_F(RenderTest, ExplainsItself) {
   EXPECT_EQ(run({"--version"}), 0);
   EXPECT_EQ(output.str(), "fp-render " FRONTPANELS_VERSION "\n");
   EXPECT_EQ(run({"--help"}), 0);
-  EXPECT_TRUE(output.str().starts_with("usage: fp-render RECORDING [-o DIR] [--sweep N]\n"));
+  EXPECT_TRUE(output.str().starts_with("usage: fp-render RECORDING [OPTION]...\n"));
   EXPECT_EQ(run({"--sweep", "none", "a.csv"}), 2);
-  EXPECT_TRUE(
-      errors.str().starts_with("fp-render: --sweep needs a number from 1 on, not \"none\"\n\nusage: "));
+  EXPECT_EQ(errors.str(),
+            "fp-render: --sweep needs a number from 1 on, not \"none\"\n"
+            "\"fp-render --help\" explains the command line\n");
 }
 
 }  // namespace
