@@ -13,15 +13,12 @@
 #include "fp-render/picture_file.h"
 #include "framework/support/error_handler.h"
 #include "framework/support/host_codes.h"
-#include "platform/runtime_error.h"
 #include "sources/frame_source.h"
 
 namespace frontpanels {
 namespace {
 
 namespace fs = std::filesystem;
-
-constexpr int kIllegalCall = 5;
 
 std::string counted(std::uint64_t count, const char* thing) {
   return std::to_string(count) + " " + thing + (count == 1 ? "" : "s");
@@ -168,11 +165,11 @@ class Renderer {
     forEach(options_.range.first, last, [this](const Frame& frame) {
       if ((frame.number - options_.range.first) % options_.every == 0) draw(frame);
     });
-    if (drawn_ == 0 && console_.problems() == 0)
-      throw RuntimeError(kIllegalCall, source_.name() + ": none of these frames has anything for this panel");
+    if (seen_ == 0) nothing("none of these frames has anything for this panel");
   }
 
   void draw(const Frame& frame) {
+    ++seen_;
     if (!picture_->show(frame)) return problem(frame, picture_->missingLevels() + ", no picture");
     for (const std::string& place : picture_->markersLeftOut())
       problem(frame, "the marker at " + place + " lies outside of the graph and is left out");
@@ -209,6 +206,7 @@ class Renderer {
   Console& console_;
   PictureFiles pictures_;
   std::unique_ptr<PanelPicture> picture_;
+  std::uint64_t seen_ = 0;  // frames that have something for the panel
   std::uint64_t drawn_ = 0;
 };
 

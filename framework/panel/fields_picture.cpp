@@ -10,11 +10,14 @@
 namespace frontpanels {
 namespace {
 
-constexpr std::int32_t kEdgePx = 2;
+constexpr std::int32_t kEdgePx = 2;  // at any scale
+// At 96 dots an inch.
+constexpr std::int32_t kUsualDpi = 96;
 constexpr std::int32_t kTextInsetPx = 4;
 constexpr std::int32_t kCaptionInsetPx = 8;  // of a frame
 constexpr std::int32_t kMarkPx = 13;         // box or ring before a caption
 constexpr std::int32_t kMarkGapPx = 4;
+constexpr std::int32_t kTickPx = 2;
 constexpr std::int32_t kArrowPx = 16;  // button of a list that drops down
 
 Rect shrunk(Rect rect, std::int32_t px) {
@@ -59,6 +62,7 @@ class FieldsPicture {
   };
   enum class Align : std::uint8_t { Left, Middle, Right };
 
+  [[nodiscard]] std::int32_t scaled(std::int32_t px) const { return px * dpi_ / kUsualDpi; }
   [[nodiscard]] Place placeOf(const Control& control) const;
   void fill(Rect rect, SystemColor color) { gdi_.fillRect(dc_, rect, gdi_.sysColorBrush(color)); }
   void line(std::initializer_list<Point> points, SystemColor color);
@@ -167,8 +171,8 @@ void FieldsPicture::paintFrame(const Control& control, const Place& place) {
   ring(1, SystemColor::ButtonHighlight);
   ring(0, SystemColor::ButtonShadow);
   if (title.empty()) return;
-  const Rect gap{all.left + kCaptionInsetPx, all.top, all.left + kCaptionInsetPx + size.width + 2,
-                 all.top + size.height};
+  const std::int32_t left = all.left + scaled(kCaptionInsetPx);
+  const Rect gap{left, all.top, left + size.width + 2, all.top + size.height};
   fill(gap, SystemColor::ButtonFace);
   caption(control, {gap.left + 1, gap.top, std::min(gap.right, all.right), gap.bottom});
 }
@@ -183,10 +187,10 @@ void FieldsPicture::paintList(const ItemList& list, const Place& place) {
   sunkenField(place);
   Rect inner = shrunk(place.all, kEdgePx);
   if (list.kind() == ControlKind::ComboBox) {
-    const std::int32_t left = std::max(inner.right - kArrowPx, inner.left);
+    const std::int32_t left = std::max(inner.right - scaled(kArrowPx), inner.left);
     arrow({left, inner.top, inner.right, inner.bottom}, false);
-    text(list, list.Text(), {inner.left + kTextInsetPx - kEdgePx, inner.top, left, inner.bottom}, Align::Left,
-         SystemColor::WindowText);
+    text(list, list.Text(), {inner.left + scaled(kTextInsetPx) - kEdgePx, inner.top, left, inner.bottom},
+         Align::Left, SystemColor::WindowText);
     return;
   }
   const SelectedFont font(gdi_, dc_, fontOf_(list));
@@ -198,11 +202,12 @@ void FieldsPicture::paintList(const ItemList& list, const Place& place) {
 }
 
 void FieldsPicture::paintMark(const Control& control, const Place& place, bool round, bool chosen) {
-  const std::int32_t top = (place.all.top + place.all.bottom - kMarkPx) / 2;
-  const Rect mark{place.all.left, top, place.all.left + kMarkPx, top + kMarkPx};
-  const Rect in = shrunk(mark, round ? 4 : 3);
+  const std::int32_t px = scaled(kMarkPx);
+  const std::int32_t top = (place.all.top + place.all.bottom - px) / 2;
+  const Rect mark{place.all.left, top, place.all.left + px, top + px};
+  const Rect in = shrunk(mark, scaled(round ? 4 : 3));
   if (round) {
-    const std::int32_t third = kMarkPx / 3;
+    const std::int32_t third = px / 3;
     line({{mark.left + third, mark.top},
           {mark.right - third, mark.top},
           {mark.right, mark.top + third},
@@ -217,11 +222,14 @@ void FieldsPicture::paintMark(const Control& control, const Place& place, bool r
   } else {
     sunkenField({mark, mark});
     const std::int32_t foot = in.left + in.width() / 3;
-    for (std::int32_t below = 0; chosen && below < 2; ++below)
-      line({{in.left, in.top + 2 + below}, {foot, in.bottom - 2 + below}, {in.right, in.top - 1 + below}},
+    const std::int32_t tick = scaled(kTickPx);
+    for (std::int32_t below = 0; chosen && below < tick; ++below)
+      line({{in.left, in.top + tick + below},
+            {foot, in.bottom - tick + below},
+            {in.right, in.top - 1 + below}},
            SystemColor::WindowText);
   }
-  caption(control, {mark.right + kMarkGapPx, place.all.top, place.all.right, place.all.bottom});
+  caption(control, {mark.right + scaled(kMarkGapPx), place.all.top, place.all.right, place.all.bottom});
 }
 
 bool FieldsPicture::isStepped(const Control& box) const {
@@ -249,7 +257,8 @@ void FieldsPicture::paint(const Control& control) {
       return caption(control, place.all);
     case ControlKind::TextBox:
       sunkenField(place);
-      return text(control, static_cast<const TextBox&>(control).Text(), shrunk(place.all, kTextInsetPx - 1),
+      return text(control, static_cast<const TextBox&>(control).Text(),
+                  shrunk(place.all, scaled(kTextInsetPx) - 1),
                   isStepped(control) ? Align::Right : Align::Left, SystemColor::WindowText);
     case ControlKind::SpinButton:
       return paintSpin(place);

@@ -147,11 +147,12 @@ TEST_F(SpectrumPictureTest, PutsMarkersWhereTheyWereWantedAndOneOnThePeakOfEachS
   const WantedMarkers wanted{{{150e6, 199.9e6}, {250e6, {}}}, true};
   ASSERT_TRUE(draw(*panel, sweepWithPeak(900), {}, wanted));
   EXPECT_EQ(panel->markersLeftOut(), std::vector<std::string>{"250 MHz"});
+  // 512 cells lie 100 / 511 MHz apart: the nearest are those at 150.098, 199.804 and 190.02 MHz.
   EXPECT_EQ(panel->markerReadings(),
-            (std::vector<std::string>{"Marker 1: 150 MHz, -90 dBm", "Delta marker 1: +49.9 MHz, +0 dB",
+            (std::vector<std::string>{"Marker 1: 150.1 MHz, -90 dBm", "Delta marker 1: +49.7 MHz, +0 dB",
                                       "Marker 3: 190 MHz, -10 dBm"}));
   const Color ink = rgb(0, 0, 0);
-  const Rect above{kPlotLeft + 624, kPlotTop + 36, kPlotLeft + 636, kPlotTop + 50};
+  const Rect above{kPlotLeft + 624, kPlotTop + 22, kPlotLeft + 636, kPlotTop + 38};
   EXPECT_TRUE(hasInk(picture(), above, ink)) << "its number";
   ASSERT_TRUE(panel->show(sweepWithPeak(250)));
   EXPECT_EQ(panel->markerReadings().back(), "Marker 3: 125 MHz, -10 dBm");

@@ -11,6 +11,8 @@
 #include <vector>
 
 #include "hosting/settings_file.h"
+#include "sources/capture_writer.h"
+#include "sources/frame_source.h"
 #include "tests/support/memory_text_files.h"
 
 namespace frontpanels {
@@ -185,6 +187,40 @@ TEST_F(RenderTest, LeavesNoHalfPictureWhereItCannotWrite) {
   std::ofstream(out) << "a file, not a folder";
   EXPECT_EQ(draw(kTwoSweeps), 1);
   EXPECT_EQ(errors.str(), "fp-render: " + out + ": cannot be created: Not a directory\n");
+}
+
+// Frame 1 with a sweep alone, 2 and 3 with pilots as well, 4 with pilots that were not heard.
+TEST_F(RenderTest, DrawsBothPanelsOfACaptureEachItsOwnFrames) {
+  const std::string path = (folder / "drive").string();
+  CaptureWriter capture(path);
+  for (const int number : {1, 2, 3, 4}) {
+    Frame frame;
+    frame.time = "12:00:0" + std::to_string(number);
+    if (number < 4) frame.sweep = Sweep{0, frame.time, 100e6, 1e6, {-60, -20, -50}};
+    if (number > 1) frame.pilots.emplace();
+    if (number == 2) frame.pilots->topN = PilotBars{-70, {{12, -5}, {168, -9}}};
+    if (number == 3) frame.pilots->allPilots = PilotLevels{-70, std::vector<float>(512, -20.0F)};
+    capture.append(frame);
+  }
+  const auto drawn = [&](std::vector<const char*> options) {
+    options.insert(options.begin(), {path.c_str(), "-o", out.c_str()});
+    return render(options, systemTextFiles(), output, errors);
+  };
+  EXPECT_EQ(drawn({}), 0);
+  EXPECT_EQ(pictures(), "drive-sweep-0001.png drive-sweep-0002.png drive-sweep-0003.png ");
+  output.str("");
+  EXPECT_EQ(drawn({"--panel", "pilots"}), 3);
+  EXPECT_EQ(output.str(), out + "/drive-pilots-0002.png  12:00:02  top 2\n" + out +
+                              "/drive-pilots-0003.png  12:00:03  all 512\n2 pictures of a recording of " +
+                              openRecording(systemTextFiles(), path)->formatName() + "\n");
+  EXPECT_EQ(errors.str(), path + ": frame 4: every level is missing, no picture\n");
+  errors.str("");
+  EXPECT_EQ(drawn({"--panel", "pilots", "--sweep", "1"}), 1);
+  EXPECT_EQ(errors.str(), path + ": none of these frames has anything for this panel\n");
+  fs::resize_file(path, fs::file_size(path) - 1);
+  fs::remove_all(out);
+  EXPECT_EQ(drawn({"--panel", "pilots", "--sets", "all,list", "--sweeps", "-3"}), 3) << "frame 4 is cut off";
+  EXPECT_EQ(pictures(), "drive-pilots-0003.png ");
 }
 
 TEST_F(RenderTest, SaysWhatMarkersReadAndWhichOnesAreLeftOut) {

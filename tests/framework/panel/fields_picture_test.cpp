@@ -30,9 +30,9 @@ class FieldsPictureTest : public ::testing::Test {
     EXPECT_EQ(gdi.violations(), std::vector<std::string>{});
     EXPECT_EQ(gdi.clip(gdi.viewDc()), std::nullopt);
   }
-  void paint(Size viewPx = {400, 300}) {
+  void paint(Size viewPx = {400, 300}, std::int32_t dpi = 96) {
     gdi.clear();
-    paintFields(gdi, gdi.viewDc(), set, viewPx, 96, [this](const Control&) { return font; });
+    paintFields(gdi, gdi.viewDc(), set, viewPx, dpi, [this](const Control&) { return font; });
   }
   [[nodiscard]] const Call* textOf(std::string_view text) {
     texts = gdi.texts();
@@ -112,6 +112,13 @@ TEST_F(FieldsPictureTest, StatesAreSeen) {
 }
 
 // --- Another scale
+
+// The box is 13 dots at 96 an inch, its caption 4 behind it.
+TEST_F(FieldsPictureTest, MarksGrowWithTheScale) {
+  paint({800, 600}, 192);
+  EXPECT_TRUE(edged({220, 87, 246, 113}, kEdgeSunken));
+  EXPECT_EQ(textOf("Auto & more")->points[0].x, 246 + 8);
+}
 
 class RescaledPanelTest : public SpectrumViewTest {};
 
