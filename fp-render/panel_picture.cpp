@@ -55,7 +55,9 @@ bool PanelPicture::set(const StoredSetting& setting) {
       panel().vfpSet(kHardwareId, setting.code, setting.index, setting.value, nullptr);
   if (!fields_ && (setting.code == kRightPanelParameter || setting.code == kBottomPanelParameter))
     setOwn(setting.code, false);
-  return status == kStatusDone && messageLog().count() == reports;
+  if (status != kStatusDone || messageLog().count() != reports) return false;
+  if (setting.value.isNumeric()) numbersSet_[setting.code] = setting.value.toDouble();
+  return true;
 }
 
 void PanelPicture::setOwn(std::int16_t code, const Variant& value) {

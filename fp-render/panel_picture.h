@@ -13,6 +13,7 @@
 #include "framework/panel/field_panel.h"
 #include "painters/multi_trace_painter.h"
 #include "platform/data_server.h"
+#include "sources/drive_simulator.h"
 #include "sources/frame.h"
 #include "sources/vertical_scale.h"
 
@@ -41,6 +42,8 @@ class PanelPicture {
 
   // False when the panel cannot use it; it has then reported why.
   [[nodiscard]] virtual bool set(const StoredSetting& setting);
+  // The receiver of a simulated drive is set as the panel asks for it.
+  virtual void tune(DriveSimulator& drive) = 0;
   virtual void survey(const Frame& frame) = 0;
   // Whether a frame that was surveyed has a level to show.
   [[nodiscard]] bool hasLevels() const;
@@ -76,6 +79,8 @@ class PanelPicture {
   void open();
   void setOwn(std::int16_t code, const Variant& value);  // raises a run-time error when it is refused
   void levels(std::int16_t resultType, std::span<const float> levelsDb, float addedDb = 0);
+  // The numbers that came as settings, by their codes.
+  [[nodiscard]] const std::map<std::int16_t, double>& numbersSet() const noexcept { return numbersSet_; }
   // What is shown has moved: markers go to where they belong.
   void placeMarkers();
 
@@ -95,6 +100,7 @@ class PanelPicture {
   PictureSurface surface_;
   HeadlessWindowing windowing_;
   bool fields_;
+  std::map<std::int16_t, double> numbersSet_;
   std::map<std::int16_t, VerticalScale> scales_;  // by result type: as the panel had them of its own
   std::map<std::int16_t, LevelRange> levels_;
   std::vector<Marker> markers_;  // each delta marker behind its partner

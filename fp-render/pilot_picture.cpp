@@ -4,6 +4,7 @@
 #include "fp-render/panel_picture.h"
 #include "framework/support/host_codes.h"
 #include "framework/support/utility.h"
+#include "pilot/cell_name_info.h"
 #include "pilot/tarvex.h"
 #include "platform/locale.h"
 
@@ -72,6 +73,26 @@ class PilotPicture final : public PanelPicture {
     for (const PilotServerRow& row : pilotServers())
       paths_[static_cast<std::size_t>(row.server)] = pathsOf(row.server);
     open();
+  }
+
+  // Without a carrier of its own the panel goes by the receiver's.
+  void tune(DriveSimulator& drive) override {
+    PilotFields& fields = panel_.fields();
+    PilotTuning tuning;
+    if (numbersSet().contains(kCenterFrequencyParameter))
+      tuning.carrierHz = fields.carrierFrequency.value();
+    else
+      setOwn(kCenterFrequencyParameter, tuning.carrierHz);
+    tuning.codeFormat = fields.code.format();
+    tuning.codeStart = fields.code.start.value();
+    tuning.codeSpan = fields.code.span.value();
+    tuning.pnIncrement = fields.code.pnIncrement.value();
+    for (std::int32_t i = 0; i < fields.userPnList.count(); ++i)
+      tuning.userPns.push_back(fields.userPnList.pn(i));
+    drive.tune(tuning);
+    const auto names = std::make_shared<clsCellNameInfo>();
+    for (const SiteName& site : drive.siteNames()) names->SetCellName(site.pnOffset, 0, site.name);
+    panel_.CellNameInfo(names);
   }
 
   void survey(const Frame& frame) override {

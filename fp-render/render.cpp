@@ -13,6 +13,7 @@
 #include "fp-render/picture_file.h"
 #include "framework/support/error_handler.h"
 #include "framework/support/host_codes.h"
+#include "sources/drive_simulator.h"
 #include "sources/frame_source.h"
 
 namespace frontpanels {
@@ -65,11 +66,13 @@ WantedMarkers markersOf(const RenderOptions& options, PanelKind panel) {
 
 class Renderer {
  public:
-  // `frames` is how many the source has.
-  Renderer(const RenderOptions& options, FrameSource& source, std::uint64_t frames, Console& console)
+  // `frames` is how many the source has, `drive` the source itself where that is a simulated one.
+  Renderer(const RenderOptions& options, FrameSource& source, std::uint64_t frames, DriveSimulator* drive,
+           Console& console)
       : options_(options),
         source_(source),
         frames_(frames),
+        drive_(drive),
         panel_(options.panel.value_or(source.hasSweeps() ? PanelKind::Spectrum : PanelKind::Pilots)),
         console_(console),
         pictures_(options.directory, options.overwrite) {}
@@ -113,13 +116,16 @@ class Renderer {
   }
 
   void makePicture() {
+    if (!options_.settingsFile.empty())
+      fromFile_ = readPanelSetup(options_.settingsFile, panel_, options_.setUp);
     const PictureLook look{options_.sizePx, options_.dpi, options_.fields, options_.caption != ""};
-    picture_ = panel_ == PanelKind::Spectrum ? makeSpectrumPicture(look)
-                                             : makePilotPicture(look, options_.sets.value_or(setsHeld()));
-    if (!options_.settingsFile.empty()) applyFile();
+    picture_ =
+        panel_ == PanelKind::Spectrum ? makeSpectrumPicture(look) : makePilotPicture(look, setsToShow());
+    applyFile();
     if (options_.centerHz) apply({kCenterFrequencyParameter, 0, *options_.centerHz});
     if (options_.spanHz) apply({kSpanParameter, 0, *options_.spanHz});
     for (const StoredSetting& setting : options_.settings) apply(setting);
+    if (drive_ != nullptr) picture_->tune(*drive_);
   }
 
   void apply(const StoredSetting& setting) {
@@ -130,7 +136,7 @@ class Renderer {
 
   // One setting that the panel has no use for does not cost the others.
   void applyFile() {
-    for (const StoredSetting& setting : readPanelSetup(options_.settingsFile, panel_, options_.setUp)) {
+    for (const StoredSetting& setting : fromFile_) {
       if (picture_->set(setting)) continue;
       console_.reportsOfPanel();
       console_.problem(options_.settingsFile + ": " + cannotUse(setting));
@@ -140,6 +146,24 @@ class Renderer {
   [[nodiscard]] static std::string cannotUse(const StoredSetting& setting) {
     return "the panel cannot use " + settingValueText(setting.value) + " for code " +
            std::to_string(setting.code);
+  }
+
+  [[nodiscard]] ShownSets setsToShow() {
+    if (options_.sets) return *options_.sets;
+    return drive_ == nullptr ? setsHeld() : setsWorthShowing();
+  }
+
+  // A drive has whatever set is asked for: a window of the code, a list, once settings say which.
+  [[nodiscard]] ShownSets setsWorthShowing() const {
+    const auto isSet = [this](std::initializer_list<std::int16_t> codes) {
+      const auto listed = [codes](const StoredSetting& setting) {
+        return std::find(codes.begin(), codes.end(), setting.code) != codes.end();
+      };
+      return std::any_of(fromFile_.begin(), fromFile_.end(), listed) ||
+             std::any_of(options_.settings.begin(), options_.settings.end(), listed);
+    };
+    return {true, isSet({kCodeCenterParameter, kCodeStartParameter, kCodeSpanParameter}), true,
+            isSet({CDMA_CODE_OFFSET})};
   }
 
   [[nodiscard]] ShownSets setsHeld() {
@@ -202,19 +226,30 @@ class Renderer {
   const RenderOptions& options_;
   FrameSource& source_;
   std::uint64_t frames_;
+  DriveSimulator* drive_;
   PanelKind panel_;
   Console& console_;
   PictureFiles pictures_;
+  std::vector<StoredSetting> fromFile_;
   std::unique_ptr<PanelPicture> picture_;
   std::uint64_t seen_ = 0;  // frames that have something for the panel
   std::uint64_t drawn_ = 0;
 };
 
 int renderFrames(const RenderOptions& options, TextFiles& files, Console& console) {
-  const std::unique_ptr<FrameSource> source = openRecording(files, options.recording);
-  const std::uint64_t drawn = Renderer(options, *source, source->frameCount().value_or(1), console).run();
+  std::optional<DriveSimulator> drive;
+  std::unique_ptr<FrameSource> recording;
+  if (options.seed)
+    drive.emplace(*options.seed);
+  else
+    recording = openRecording(files, options.recording);
+  FrameSource& source = drive ? static_cast<FrameSource&>(*drive) : *recording;
+  const std::uint64_t drivenFrames = options.frames.value_or(options.range.last.value_or(1));
+  const std::uint64_t frames = source.frameCount().value_or(drivenFrames);
+  const std::uint64_t drawn = Renderer(options, source, frames, drive ? &*drive : nullptr, console).run();
   if (drawn == 0) return kNothingDrawn;
-  console.say(counted(drawn, "picture") + " of a recording of " + source->formatName());
+  console.say(counted(drawn, "picture") + " of " +
+              (drive ? source.name() : std::string("a recording of ") + source.formatName()));
   console.finish();
   return console.problems() == 0 ? kDrawn : kDrawnWithProblems;
 }

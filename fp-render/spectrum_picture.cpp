@@ -2,6 +2,7 @@
 #include "entry/host_record_list.h"
 #include "fp-render/panel_picture.h"
 #include "framework/support/host_codes.h"
+#include "sources/receiver.h"
 #include "sources/resample.h"
 #include "spectrum/spectrum_view.h"
 
@@ -20,11 +21,10 @@ class SpectrumPicture final : public PanelPicture {
     open();
   }
 
-  bool set(const StoredSetting& setting) override {
-    if (!PanelPicture::set(setting)) return false;
-    centerGiven_ = centerGiven_ || setting.code == kCenterFrequencyParameter;
-    spanGiven_ = spanGiven_ || setting.code == kSpanParameter;
-    return true;
+  void tune(DriveSimulator& drive) override {
+    Receiver receiver;
+    for (const auto& [code, value] : numbersSet()) static_cast<void>(receiver.request(code, value));
+    drive.tune(receiver.tuning({}));
   }
 
   void survey(const Frame& frame) override {
@@ -34,7 +34,7 @@ class SpectrumPicture final : public PanelPicture {
   }
 
   std::string missingLevels() override {
-    if (!centerGiven_ && !spanGiven_) return PanelPicture::missingLevels();
+    if (!given(kCenterFrequencyParameter) && !given(kSpanParameter)) return PanelPicture::missingLevels();
     const FrequencyEntries& tuned = panel_.fields().frequency;
     return "every level from " + tuned.start.text() + " to " + tuned.stop.text() + " is missing";
   }
@@ -61,6 +61,8 @@ class SpectrumPicture final : public PanelPicture {
   }
 
  private:
+  [[nodiscard]] bool given(std::int16_t code) const { return numbersSet().contains(code); }
+
   void open() {
     const HostRecordList limits({{0, 0.0, kHighestHz}});
     for (const std::int16_t code : {kCenterFrequencyParameter, kSpanParameter})
@@ -73,17 +75,16 @@ class SpectrumPicture final : public PanelPicture {
   // The panel is tuned to the sweep, as far as no setting has tuned it.
   void resample(const Sweep& sweep) {
     const FrequencyRange whole = rangeOf(sweep);
-    if (!centerGiven_) setOwn(kCenterFrequencyParameter, whole.centerHz);
-    if (!spanGiven_) setOwn(kSpanParameter, whole.spanHz);
-    if (!centerGiven_ && !spanGiven_) return frontpanels::resample(sweep, display_);
+    if (!given(kCenterFrequencyParameter)) setOwn(kCenterFrequencyParameter, whole.centerHz);
+    if (!given(kSpanParameter)) setOwn(kSpanParameter, whole.spanHz);
+    if (!given(kCenterFrequencyParameter) && !given(kSpanParameter))
+      return frontpanels::resample(sweep, display_);
     const FrequencyEntries& tuned = panel_.fields().frequency;
     frontpanels::resample(sweep, {tuned.center.value(), tuned.span.value()}, display_);
   }
 
   SpectrumView panel_;
   DisplaySweep display_;
-  bool centerGiven_ = false;
-  bool spanGiven_ = false;
 };
 
 }  // namespace
