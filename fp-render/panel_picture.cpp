@@ -56,8 +56,13 @@ bool PanelPicture::set(const StoredSetting& setting) {
   if (!fields_ && (setting.code == kRightPanelParameter || setting.code == kBottomPanelParameter))
     setOwn(setting.code, false);
   if (status != kStatusDone || messageLog().count() != reports) return false;
-  if (setting.value.isNumeric()) numbersSet_[setting.code] = setting.value.toDouble();
+  settings_.push_back(setting);
   return true;
+}
+
+bool PanelPicture::isSet(std::int16_t code) const {
+  return std::any_of(settings_.begin(), settings_.end(),
+                     [code](const StoredSetting& setting) { return setting.code == code; });
 }
 
 void PanelPicture::setOwn(std::int16_t code, const Variant& value) {

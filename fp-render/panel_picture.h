@@ -79,8 +79,9 @@ class PanelPicture {
   void open();
   void setOwn(std::int16_t code, const Variant& value);  // raises a run-time error when it is refused
   void levels(std::int16_t resultType, std::span<const float> levelsDb, float addedDb = 0);
-  // The numbers that came as settings, by their codes.
-  [[nodiscard]] const std::map<std::int16_t, double>& numbersSet() const noexcept { return numbersSet_; }
+  // The settings that the panel took.
+  [[nodiscard]] const std::vector<StoredSetting>& settings() const noexcept { return settings_; }
+  [[nodiscard]] bool isSet(std::int16_t code) const;
   // What is shown has moved: markers go to where they belong.
   void placeMarkers();
 
@@ -100,7 +101,7 @@ class PanelPicture {
   PictureSurface surface_;
   HeadlessWindowing windowing_;
   bool fields_;
-  std::map<std::int16_t, double> numbersSet_;
+  std::vector<StoredSetting> settings_;
   std::map<std::int16_t, VerticalScale> scales_;  // by result type: as the panel had them of its own
   std::map<std::int16_t, LevelRange> levels_;
   std::vector<Marker> markers_;  // each delta marker behind its partner

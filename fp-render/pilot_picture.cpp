@@ -5,8 +5,10 @@
 #include "framework/support/host_codes.h"
 #include "framework/support/utility.h"
 #include "pilot/cell_name_info.h"
+#include "pilot/code_units.h"
 #include "pilot/tarvex.h"
 #include "platform/locale.h"
+#include "sources/pilot_receiver.h"
 
 namespace frontpanels {
 namespace {
@@ -77,19 +79,13 @@ class PilotPicture final : public PanelPicture {
 
   // Without a carrier of its own the panel goes by the receiver's.
   void tune(DriveSimulator& drive) override {
-    PilotFields& fields = panel_.fields();
-    PilotTuning tuning;
-    if (numbersSet().contains(kCenterFrequencyParameter))
-      tuning.carrierHz = fields.carrierFrequency.value();
-    else
-      setOwn(kCenterFrequencyParameter, tuning.carrierHz);
-    tuning.codeFormat = fields.code.format();
-    tuning.codeStart = fields.code.start.value();
-    tuning.codeSpan = fields.code.span.value();
-    tuning.pnIncrement = fields.code.pnIncrement.value();
-    for (std::int32_t i = 0; i < fields.userPnList.count(); ++i)
-      tuning.userPns.push_back(fields.userPnList.pn(i));
+    PilotReceiver receiver;
+    for (const StoredSetting& setting : settings())
+      if (setting.value.isNumeric())
+        static_cast<void>(receiver.request(setting.code, setting.index, setting.value.toDouble()));
+    const PilotTuning tuning = receiver.tuning({});
     drive.tune(tuning);
+    setOwn(kCenterFrequencyParameter, tuning.carrierHz);
     const auto names = std::make_shared<clsCellNameInfo>();
     for (const SiteName& site : drive.siteNames()) names->SetCellName(site.pnOffset, 0, site.name);
     panel_.CellNameInfo(names);
@@ -157,6 +153,20 @@ class PilotPicture final : public PanelPicture {
     if (levels != nullptr) column_ = levels->ecIoDb;
     column_.resize(std::min(points_[static_cast<std::size_t>(row.set)] + 1, Tarvex::kMaxPoints), kGap);
     hub_.publish(paths(row.set)[1], std::span<const float>(column_));
+    if (row.set == PilotSet::ZoomedPilots) spreadOverWindow();
+  }
+
+  // Once a window of the code is set the levels lie evenly in it, from its start to its stop.
+  void spreadOverWindow() {
+    const bool window =
+        isSet(kCodeStartParameter) || isSet(kCodeSpanParameter) || isSet(kCodeCenterParameter);
+    auto* const trace = dynamic_cast<clsMultiTracePainter*>(
+        panel_.base().traceManager().find(pilotSet(PilotSet::ZoomedPilots).traceId));
+    if (!window || trace == nullptr || column_.size() <= 2) return;
+    const CodeEntries& code = panel_.fields().code;
+    trace->xPerPoint(code.span.value() / chipsPerPn(code.format()) /
+                     (static_cast<double>(column_.size()) - 2));
+    trace->updateXAxisLabels();
   }
 
   void publishBars(const PilotSetRow& row, const PilotBars* bars) {

@@ -23,7 +23,9 @@ class SpectrumPicture final : public PanelPicture {
 
   void tune(DriveSimulator& drive) override {
     Receiver receiver;
-    for (const auto& [code, value] : numbersSet()) static_cast<void>(receiver.request(code, value));
+    for (const StoredSetting& setting : settings())
+      if (setting.value.isNumeric())
+        static_cast<void>(receiver.request(setting.code, setting.value.toDouble()));
     drive.tune(receiver.tuning({}));
   }
 
@@ -34,7 +36,7 @@ class SpectrumPicture final : public PanelPicture {
   }
 
   std::string missingLevels() override {
-    if (!given(kCenterFrequencyParameter) && !given(kSpanParameter)) return PanelPicture::missingLevels();
+    if (!isSet(kCenterFrequencyParameter) && !isSet(kSpanParameter)) return PanelPicture::missingLevels();
     const FrequencyEntries& tuned = panel_.fields().frequency;
     return "every level from " + tuned.start.text() + " to " + tuned.stop.text() + " is missing";
   }
@@ -61,8 +63,6 @@ class SpectrumPicture final : public PanelPicture {
   }
 
  private:
-  [[nodiscard]] bool given(std::int16_t code) const { return numbersSet().contains(code); }
-
   void open() {
     const HostRecordList limits({{0, 0.0, kHighestHz}});
     for (const std::int16_t code : {kCenterFrequencyParameter, kSpanParameter})
@@ -75,9 +75,9 @@ class SpectrumPicture final : public PanelPicture {
   // The panel is tuned to the sweep, as far as no setting has tuned it.
   void resample(const Sweep& sweep) {
     const FrequencyRange whole = rangeOf(sweep);
-    if (!given(kCenterFrequencyParameter)) setOwn(kCenterFrequencyParameter, whole.centerHz);
-    if (!given(kSpanParameter)) setOwn(kSpanParameter, whole.spanHz);
-    if (!given(kCenterFrequencyParameter) && !given(kSpanParameter))
+    if (!isSet(kCenterFrequencyParameter)) setOwn(kCenterFrequencyParameter, whole.centerHz);
+    if (!isSet(kSpanParameter)) setOwn(kSpanParameter, whole.spanHz);
+    if (!isSet(kCenterFrequencyParameter) && !isSet(kSpanParameter))
       return frontpanels::resample(sweep, display_);
     const FrequencyEntries& tuned = panel_.fields().frequency;
     frontpanels::resample(sweep, {tuned.center.value(), tuned.span.value()}, display_);

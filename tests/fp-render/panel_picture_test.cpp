@@ -282,6 +282,21 @@ TEST(PilotPicture, ShowsWhatItsFrameHoldsAndNothingOfTheOneBefore) {
   EXPECT_FALSE(panel->show(Frame()));
 }
 
+// 1024 chips from chip 10240 on are PN 160 to 176: 17 levels lie an offset apart.
+TEST(PilotPicture, SpreadsTheZoomedPilotsOverTheWindowOfTheCode) {
+  const auto panel = makePilotPicture({}, {false, true, false, false});
+  Frame frame;
+  frame.pilots.emplace();
+  frame.pilots->zoomedPilots = PilotLevels{-70, std::vector<float>(17, -20.0F)};
+  frame.pilots->zoomedPilots->ecIoDb[12] = -5;
+  ASSERT_TRUE(draw(*panel, frame, {{803, 0, 10240.0}, {804, 0, 1024.0}}, {{{161, {}}}, true}, {0, 3}));
+  EXPECT_EQ(panel->markerReadings(),
+            (std::vector<std::string>{"Marker 1: 161 PN, -20 dB", "Marker 2: 172 PN, -5 dB"}));
+  EXPECT_NE(placeOf("176 PN", panel->picture("")), kNowhere);
+  // Highest is the left corner of the peak's marker, 4 pixels beside its point.
+  EXPECT_EQ(highestOfTrace(panel->picture("")).x, kPlotLeft + kPlotWidth * 12 / 16 - 4);
+}
+
 TEST(PilotPicture, HasNoPlaceForMarkersAmongBars) {
   const auto panel = makePilotPicture({}, kTopAlone);
   EXPECT_EQ(testing::raised([&] {

@@ -223,6 +223,27 @@ TEST_F(RenderTest, DrawsBothPanelsOfACaptureEachItsOwnFrames) {
   EXPECT_EQ(pictures(), "drive-pilots-0003.png ");
 }
 
+TEST_F(RenderTest, DrawsASimulatedDriveTheSameForTheSameSeed) {
+  const auto drive = [&](std::vector<const char*> options) {
+    options.insert(options.end(), {"-o", out.c_str(), "--overwrite"});
+    EXPECT_EQ(run(options), 0) << errors.str();
+  };
+  drive({"--simulate", "7"});
+  EXPECT_EQ(pictures(), "simulation-7-sweep-0001.png ");
+  EXPECT_TRUE(output.str().ends_with("1 picture of Simulated drive, seed 7\n"));
+  drive({"--simulate", "7", "--sweep", "2", "--center", "1950M", "--span", "20M"});
+  EXPECT_NE(output.str().find("  1940 to 1960"), std::string::npos) << "the receiver is tuned";
+  drive({"--simulate", "7", "--panel", "pilots", "--frames", "3", "--every", "2"});
+  EXPECT_EQ(pictures(),
+            "simulation-7-pilots-0001.png simulation-7-pilots-0003.png simulation-7-sweep-0001.png "
+            "simulation-7-sweep-0002.png ");
+  const std::string third = bytes("simulation-7-pilots-0003.png");
+  drive({"--simulate", "7", "--panel", "pilots", "--sweep", "3"});
+  EXPECT_EQ(bytes("simulation-7-pilots-0003.png"), third);
+  drive({"--simulate", "7", "--panel", "pilots", "--sweep", "3", "--set", "230,0=12"});
+  EXPECT_NE(output.str().find("list 1"), std::string::npos);
+}
+
 TEST_F(RenderTest, SaysWhatMarkersReadAndWhichOnesAreLeftOut) {
   EXPECT_EQ(draw(kTwoSweeps, {"--sweep", "2", "--marker", "101M", "--marker", "99M"}), 3);
   EXPECT_EQ(output.str(), out + "/a-sweep-0002.png  2020-01-01 00:00:11  100 to 103 MHz, 3 bins\n" +
