@@ -144,12 +144,13 @@ TEST_F(SpectrumPictureTest, ShowsReceiversBeyondTheLimitsOfThePanelsFields) {
 }
 
 TEST_F(SpectrumPictureTest, PutsMarkersWhereTheyWereWantedAndOneOnThePeakOfEachSweep) {
-  const WantedMarkers wanted{{{150e6, 199.9e6}, {250e6, {}}}, true};
+  const WantedMarkers wanted{{{150e6, 200.09e6}, {200.1e6, {}}}, true};
   ASSERT_TRUE(draw(*panel, sweepWithPeak(900), {}, wanted));
-  EXPECT_EQ(panel->markersLeftOut(), std::vector<std::string>{"250 MHz"});
-  // 512 cells lie 100 / 511 MHz apart: the nearest are those at 150.098, 199.804 and 190.02 MHz.
+  EXPECT_EQ(panel->markersLeftOut(), std::vector<std::string>{"200.1 MHz"});
+  // 512 cells lie 100 / 511 MHz apart: the nearest are those at 150.098, 200 and 190.02 MHz. The last one
+  // reaches half of that over the edge.
   EXPECT_EQ(panel->markerReadings(),
-            (std::vector<std::string>{"Marker 1: 150.1 MHz, -90 dBm", "Delta marker 1: +49.7 MHz, +0 dB",
+            (std::vector<std::string>{"Marker 1: 150.1 MHz, -90 dBm", "Delta marker 1: +49.9 MHz, +0 dB",
                                       "Marker 3: 190 MHz, -10 dBm"}));
   const Color ink = rgb(0, 0, 0);
   const Rect above{kPlotLeft + 624, kPlotTop + 22, kPlotLeft + 636, kPlotTop + 38};
@@ -249,7 +250,7 @@ TEST(PilotPicture, FitsAScaleOnlyWhereThePanelsOwnDoesNotHoldTheLevels) {
     float lowestDb;
     const char* top;
     const char* bottom;
-  } kCases[] = {{{}, -30, "0", "-30"},
+  } kCases[] = {{{}, -30, "-3", "-27"},
                 {{}, -31, "-5", "-55"},  // 5 dB a division hold what 2 cannot; -9 is the highest
                 {{{728, 0, 1.0}}, -16, "-78", "-88"}};  // with Io, -70 dBm: -79 to -86
   for (const auto& testCase : kCases) {

@@ -233,13 +233,13 @@ TEST_F(RenderTest, DrawsASimulatedDriveTheSameForTheSameSeed) {
   EXPECT_TRUE(output.str().ends_with("1 picture of Simulated drive, seed 7\n"));
   drive({"--simulate", "7", "--sweep", "2", "--center", "1950M", "--span", "20M"});
   EXPECT_NE(output.str().find("  1940 to 1960"), std::string::npos) << "the receiver is tuned";
+  const std::string second = bytes("simulation-7-sweep-0002.png");
+  drive({"--simulate", "7", "--sweeps", "1-2", "--center", "1950M", "--span", "20M"});
+  EXPECT_EQ(bytes("simulation-7-sweep-0002.png"), second);
   drive({"--simulate", "7", "--panel", "pilots", "--frames", "3", "--every", "2"});
   EXPECT_EQ(pictures(),
             "simulation-7-pilots-0001.png simulation-7-pilots-0003.png simulation-7-sweep-0001.png "
             "simulation-7-sweep-0002.png ");
-  const std::string third = bytes("simulation-7-pilots-0003.png");
-  drive({"--simulate", "7", "--panel", "pilots", "--sweep", "3"});
-  EXPECT_EQ(bytes("simulation-7-pilots-0003.png"), third);
   drive({"--simulate", "7", "--panel", "pilots", "--sweep", "3", "--set", "230,0=12"});
   EXPECT_NE(output.str().find("list 1"), std::string::npos);
 }
