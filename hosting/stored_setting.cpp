@@ -43,7 +43,7 @@ MaybeVariant readError(std::string_view text) {
 
 // Words that say the type of what follows them.
 template <class T>
-inline constexpr std::string_view kTypeWord = "";
+inline constexpr std::string_view kTypeWord = {};
 template <>
 inline constexpr std::string_view kTypeWord<std::uint8_t> = "byte";
 template <>
