@@ -44,9 +44,9 @@ std::optional<FrameRange> oneFrame(std::string_view text) {
   return FrameRange{*number, *number};
 }
 std::optional<std::int32_t> dotsOf(std::string_view text) {
-  const auto dots = countOf(text);
-  if (dots != 96U && dots != 144U && dots != 192U) return std::nullopt;
-  return static_cast<std::int32_t>(*dots);
+  for (const std::int32_t dpi : {96, 144, 192})
+    if (text == std::to_string(dpi)) return dpi;
+  return std::nullopt;
 }
 std::optional<double> above0(std::optional<double> number) {
   return number && *number > 0 ? number : std::nullopt;
