@@ -68,16 +68,6 @@ HRESULT ControlSite::GetWindow(HWND* window) {
   });
 }
 
-HRESULT ControlSite::OnUIActivate() {
-  uiActive_ = true;
-  return S_OK;
-}
-
-HRESULT ControlSite::OnUIDeactivate(BOOL) {
-  uiActive_ = false;
-  return S_OK;
-}
-
 HRESULT ControlSite::GetWindowContext(IOleInPlaceFrame** frame, IOleInPlaceUIWindow** document, LPRECT place,
                                       LPRECT clip, LPOLEINPLACEFRAMEINFO info) {
   return comBarrier([&]() -> HRESULT {

@@ -18,7 +18,6 @@ class ControlSite final : public ComObject<IOleClientSite, IOleInPlaceSite, IOle
   ControlSite(ControlOwner& owner, const std::wstring& name);
   // Also detaches its frame and its extender.
   void detach() noexcept;
-  [[nodiscard]] bool uiActive() const noexcept { return uiActive_; }
 
   // IOleClientSite
   HRESULT STDMETHODCALLTYPE SaveObject() override { return E_NOTIMPL; }
@@ -33,11 +32,11 @@ class ControlSite final : public ComObject<IOleClientSite, IOleInPlaceSite, IOle
   HRESULT STDMETHODCALLTYPE ContextSensitiveHelp(BOOL) override { return E_NOTIMPL; }
   HRESULT STDMETHODCALLTYPE CanInPlaceActivate() override { return S_OK; }
   HRESULT STDMETHODCALLTYPE OnInPlaceActivate() override { return S_OK; }
-  HRESULT STDMETHODCALLTYPE OnUIActivate() override;
+  HRESULT STDMETHODCALLTYPE OnUIActivate() override { return S_OK; }
   HRESULT STDMETHODCALLTYPE GetWindowContext(IOleInPlaceFrame** frame, IOleInPlaceUIWindow** document,
                                              LPRECT place, LPRECT clip, LPOLEINPLACEFRAMEINFO info) override;
   HRESULT STDMETHODCALLTYPE Scroll(SIZE) override { return S_FALSE; }
-  HRESULT STDMETHODCALLTYPE OnUIDeactivate(BOOL) override;
+  HRESULT STDMETHODCALLTYPE OnUIDeactivate(BOOL) override { return S_OK; }
   HRESULT STDMETHODCALLTYPE OnInPlaceDeactivate() override { return S_OK; }
   HRESULT STDMETHODCALLTYPE DiscardUndoState() override { return E_NOTIMPL; }
   HRESULT STDMETHODCALLTYPE DeactivateAndUndo() override { return E_NOTIMPL; }
@@ -69,7 +68,6 @@ class ControlSite final : public ComObject<IOleClientSite, IOleInPlaceSite, IOle
   std::wstring name_;
   ComPointer<ControlFrame> frame_;
   ComPointer<Extender> extender_;
-  bool uiActive_ = false;
 };
 
 }  // namespace frontpanels::workbench

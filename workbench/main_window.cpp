@@ -240,7 +240,7 @@ void MainWindow::placePanels() {
   if (arrangement_ == Arrangement::ByUser || IsIconic(window_)) return;
   std::vector<HWND> windows = panelWindows();
   std::erase_if(windows, [](HWND window) { return IsIconic(window) || !PanelWindow::of(window)->visible(); });
-  if (windows.empty() || IsZoomed(windows.front())) return;
+  if (windows.empty() || std::any_of(windows.begin(), windows.end(), IsZoomed)) return;
   RECT room{};
   GetClientRect(client_, &room);
   const auto count = static_cast<LONG>(windows.size());
@@ -312,9 +312,11 @@ LRESULT MainWindow::handle(UINT message, WPARAM wide, LPARAM extra) {
       reinterpret_cast<MINMAXINFO*>(extra)->ptMinTrackSize = {scaled(kMinimumWidth), scaled(kMinimumHeight)};
       return 0;
     case WM_CLOSE:
-    case WM_QUERYENDSESSION:
       events_.command(IDM_FILE_EXIT);
-      return message == WM_QUERYENDSESSION;
+      return 0;
+    case WM_ENDSESSION:
+      if (wide != 0) events_.command(IDM_FILE_EXIT);
+      return 0;
     case WM_NCDESTROY:
       SetWindowLongPtrW(window_, GWLP_USERDATA, 0);
       return DefFrameProcW(std::exchange(window_, nullptr), client_, message, wide, extra);

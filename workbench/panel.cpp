@@ -76,7 +76,8 @@ void Panel::showFirst(const StoredPanel* stored) {
     set(kWidthParameter, static_cast<std::int32_t>(place.right - place.left));
     set(kHeightParameter, static_cast<std::int32_t>(place.bottom - place.top));
   }
-  if (stored != nullptr) restore(stored->settings);
+  ready_ = true;
+  if (stored != nullptr) restore(*stored);
   operate(kShowOperation, std::int32_t{0});
 }
 
@@ -95,9 +96,10 @@ void Panel::publish(std::string_view path, const Value& value) { hub_->call("Pub
 // --- Requests of the panel. It is still inside its own event: it is answered after that.
 
 std::int32_t Panel::frontPanelOp(PanelIds, std::int16_t operation, std::int32_t argument) {
-  if (closed_) return kStatusDone;
+  if (!answers()) return kStatusDone;
   if (operation == kAddTraceOperation || operation == kRemoveTraceOperation) {
     if (!requestDisplay(argument, operation == kAddTraceOperation)) return kStatusUnusableParameter;
+    changed_ = true;
     listener_.answerWanted(kind());
     return kStatusDone;
   }
@@ -113,18 +115,21 @@ std::int32_t Panel::frontPanelOp(PanelIds, std::int16_t operation, std::int32_t 
 }
 
 std::int32_t Panel::frontPanelSet(PanelIds, std::int16_t parameterType, std::int16_t index, double value) {
-  if (closed_) return kStatusDone;
+  if (!answers()) return kStatusDone;
   const bool taken = request(parameterType, index, value);
+  changed_ = changed_ || taken;
   listener_.answerWanted(kind());
   return taken ? kStatusDone : kStatusUnusableParameter;
 }
 
 std::int32_t Panel::saveDisplaySettings(PanelIds, const VARIANT& list) {
+  if (!answers()) return kStatusDone;
   listener_.settingsHanded(kind(), std::nullopt, storedSettings(list));
   return kStatusDone;
 }
 
 std::int32_t Panel::saveSetup(std::int32_t setUpId, PanelIds) {
+  if (!answers()) return kStatusDone;
   listener_.settingsHanded(kind(), setUpId, settings());
   return kStatusDone;
 }
@@ -135,7 +140,7 @@ bool Panel::answer() {
     set(setting.code, setting.value);
     told(setting);
   }
-  return !answers.empty();
+  return std::exchange(changed_, false) || !answers.empty();
 }
 
 // --- Operations of the host
@@ -153,12 +158,14 @@ void Panel::receive(const Frame& frame) {
 // What the panel does not take, of an older version for instance, does not keep it from the rest. The
 // receiver learns what holds now, and tells the panel where that is something else. Markers stand on values
 // and wait for the first ones.
-void Panel::restore(const std::vector<StoredSetting>& settings) {
+void Panel::restore(const StoredPanel& stored) {
   markers_.clear();
-  for (const StoredSetting& setting : settings) {
+  forgetOwn();
+  for (const StoredSetting& setting : stored.settings) {
     const bool ofMarker = setting.code >= kNewMarkerParameter && setting.code <= kMarkerValueParameter;
     ofMarker ? markers_.push_back(setting) : restoreOne(setting);
   }
+  restoreOwn(stored);
   answer();
   if (received_) restoreMarkers();
 }
@@ -181,6 +188,8 @@ void Panel::restoreMarkers() {
 
 // A panel that logs puts its measurement controls away; they come back to where they were.
 void Panel::logging(bool on) {
+  if (on == logging_) return;
+  logging_ = on;
   if (on) measurementShown_ = panel_->flag("MeasurementPanelVisible");
   set(PARM_LOGGING_FLAG, on);
   if (on) operate(kLoggingOnOperation, std::int32_t{0});
@@ -219,6 +228,9 @@ std::vector<StoredSetting> Panel::storedSettings(const VARIANT& list) const {
   if (flat.size() % 2 != 0) throw HostFailure("The panel's list of settings ends with a code");
   std::vector<StoredSetting> stored;
   for (std::size_t i = 0; i < flat.size(); i += 2) stored.push_back({flat[i].toInt16(), 0, flat[i + 1]});
+  // What logging has put away for a while is not to be kept away.
+  for (StoredSetting& setting : stored)
+    if (logging_ && setting.code == kBottomPanelParameter) setting.value = measurementShown_;
   appendOwn(stored);
   return stored;
 }

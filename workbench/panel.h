@@ -41,6 +41,11 @@ class PanelListener {
   ~PanelListener() = default;
 };
 
+struct CellName {
+  std::int32_t pnOffset = 0;
+  std::string name;
+};
+
 // What is kept for a panel from one run to the next.
 struct StoredPanel {
   Properties properties;
@@ -48,6 +53,7 @@ struct StoredPanel {
   std::optional<RECT> boundsTwips;
   // Result types of the displays that were on, of a panel with several.
   std::optional<std::vector<std::int32_t>> displays;
+  std::vector<CellName> cells;
 };
 
 struct PopUpItem {
@@ -73,13 +79,13 @@ class Panel : private PanelWindowEvents, private PanelRequests {
   // Another source: what the panel was tuned to no longer holds.
   virtual void forgetTuning() = 0;
   virtual void tune(DriveSimulator& simulator) const = 0;
-  // Tells the panel what was set since the last call. True when the receiver delivers something else now.
+  // Tells the panel what was set since the last call. True when something was.
   bool answer();
 
   // Operations of the host
   void save();
   void saveSetUp(std::int32_t setUp);
-  void restore(const std::vector<StoredSetting>& settings);
+  void restore(const StoredPanel& stored);
   void logging(bool on);
   void playback();
   [[nodiscard]] bool isPlayback() const noexcept { return playback_; }
@@ -91,6 +97,9 @@ class Panel : private PanelWindowEvents, private PanelRequests {
   [[nodiscard]] Properties properties() const { return control_->properties(); }
   [[nodiscard]] RECT boundsTwips();
   [[nodiscard]] virtual std::vector<std::int32_t> displays() const { return {}; }
+  [[nodiscard]] virtual std::vector<CellName> cells() const { return {}; }
+  // Whether the panel was tuned by its user, rather than following its source.
+  [[nodiscard]] virtual bool tuned() const { return false; }
   // Read from the panel, with what the host knows besides.
   [[nodiscard]] std::vector<StoredSetting> settings();
   // What the graph shows, as PNG.
@@ -117,7 +126,9 @@ class Panel : private PanelWindowEvents, private PanelRequests {
   [[nodiscard]] virtual std::vector<ReceiverSetting> takeAnswers() = 0;
   // The panel was told a setting of its receiver.
   virtual void told(const ReceiverSetting& setting) = 0;
-  // What the host keeps beside what the panel hands over; it is restored after that.
+  // What the host keeps beside what the panel hands over; it is restored after that, and forgotten before.
+  virtual void forgetOwn() {}
+  virtual void restoreOwn(const StoredPanel&) {}
   virtual void appendOwn(std::vector<StoredSetting>& settings) const = 0;
 
  private:
@@ -136,6 +147,7 @@ class Panel : private PanelWindowEvents, private PanelRequests {
   void restoreMarkers();
   [[nodiscard]] std::vector<StoredSetting> storedSettings(const VARIANT& list) const;
   void close() noexcept;
+  [[nodiscard]] bool answers() const noexcept { return ready_ && !closed_; }
 
   const PanelKindRow& row_;
   PanelListener& listener_;
@@ -147,6 +159,9 @@ class Panel : private PanelWindowEvents, private PanelRequests {
   bool received_ = false;
   bool measurementShown_ = true;  // before it logged
   bool playback_ = false;
+  bool logging_ = false;
+  bool changed_ = false;  // asked for since the last answer
+  bool ready_ = false;    // whole: requests can be dealt with
   bool closed_ = false;
 };
 

@@ -37,25 +37,14 @@ constexpr SetRow kSets[] = {
 };
 
 // Result types of what a new panel shows: all pilots, and the strongest of them.
-constexpr std::array<std::int32_t, 2> kFirstDisplays = {14, 201};
-
-template <class List>
-bool contains(const List& list, std::int32_t value) {
-  return std::find(list.begin(), list.end(), value) != list.end();
-}
+const std::vector<std::int32_t> kFirstDisplays = {14, 201};
 
 }  // namespace
 
 PilotPanel::PilotPanel(PanelFrame& frame, PanelListener& listener, const StoredPanel* stored)
     : Panel(PanelKind::Pilots, frame, listener, stored),
       names_(Automation::create("FrontPanels.clsCellNameInfo")) {
-  names_.call("Initialize", {});
-  for (const PilotSetRow& row : pilotSets()) {
-    const bool on = stored != nullptr && stored->displays ? contains(*stored->displays, row.resultType)
-                                                          : contains(kFirstDisplays, row.resultType);
-    static_cast<void>(receiver_.display(row.resultType, on));
-    if (on) operate(kAddTraceOperation, static_cast<std::int32_t>(row.resultType));
-  }
+  showDisplays(stored != nullptr && stored->displays ? *stored->displays : kFirstDisplays);
   set(kCenterFrequencyParameter, receiver_.tuning(PilotTuning{}).carrierHz);
   showFirst(stored);
 }
@@ -66,6 +55,37 @@ std::vector<std::int32_t> PilotPanel::displays() const {
   for (const SetRow& row : kSets)
     if (tuning.*row.on) on.push_back(pilotSet(row.set).resultType);
   return on;
+}
+
+// Those that are named, and no others.
+void PilotPanel::showDisplays(const std::vector<std::int32_t>& resultTypes) {
+  const std::vector<std::int32_t> before = shownOnce_ ? displays() : std::vector<std::int32_t>{};
+  const auto isIn = [](const std::vector<std::int32_t>& list, std::int32_t value) {
+    return std::find(list.begin(), list.end(), value) != list.end();
+  };
+  for (const PilotSetRow& row : pilotSets()) {
+    const bool on = isIn(resultTypes, row.resultType);
+    static_cast<void>(receiver_.display(row.resultType, on));
+    if (on == isIn(before, row.resultType)) continue;
+    operate(on ? kAddTraceOperation : kRemoveTraceOperation, static_cast<std::int32_t>(row.resultType));
+  }
+  shownOnce_ = true;
+}
+
+void PilotPanel::restoreOwn(const StoredPanel& stored) {
+  if (stored.displays) showDisplays(*stored.displays);
+  if (stored.cells.empty()) return;
+  ownNames_ = stored.cells;
+  showNames();
+}
+
+// The last first: -1 takes the first one out, -2 the second.
+void PilotPanel::forgetOwn() {
+  const std::vector<std::int32_t> pns = receiver_.tuning(PilotTuning{}).userPns;
+  for (std::size_t i = pns.size(); i-- > 0;) {
+    const auto index = static_cast<std::int16_t>(-1 - static_cast<std::int32_t>(i));
+    if (request(CDMA_CODE_OFFSET, index, pns[i])) set(CDMA_CODE_OFFSET, static_cast<double>(pns[i]), index);
+  }
 }
 
 bool PilotPanel::request(std::int16_t code, std::int16_t index, double value) {
@@ -123,8 +143,9 @@ bool PilotPanel::show(const Frame& frame) {
 }
 
 void PilotPanel::meet(const DriveSimulator* simulator) {
-  if (simulator == nullptr) return;
-  for (const SiteName& site : simulator->siteNames()) name({site.pnOffset, site.name});
+  sourceNames_.clear();
+  if (simulator != nullptr)
+    for (const SiteName& site : simulator->siteNames()) sourceNames_.push_back({site.pnOffset, site.name});
   showNames();
 }
 
@@ -132,25 +153,29 @@ void PilotPanel::tune(DriveSimulator& simulator) const { simulator.tune(receiver
 
 // --- Cells
 
-void PilotPanel::name(const CellName& cell) {
-  names_.call("SetCellName", {static_cast<double>(cell.pnOffset), kNoSecondId, cell.name});
-  named_ = true;
-}
-
 void PilotPanel::showNames() {
-  if (!named_) return;
-  automation().put("CellNameInfo", Value(names_.dispatch()));
-  set(kCellNamingParameter, true);
+  names_.call("Initialize", {});
+  for (const std::vector<CellName>* const list : {&sourceNames_, &ownNames_})
+    for (const CellName& cell : *list)
+      names_.call("SetCellName", {static_cast<double>(cell.pnOffset), kNoSecondId, cell.name});
+  const bool any = !sourceNames_.empty() || !ownNames_.empty();
+  if (any) automation().put("CellNameInfo", Value(names_.dispatch()));
+  set(kCellNamingParameter, any);
 }
 
-void PilotPanel::addCells(const std::vector<CellName>& cells) {
+std::size_t PilotPanel::addCells(const std::vector<CellName>& cells) {
+  std::size_t taken = 0;
   for (const CellName& cell : cells) {
     const auto index = static_cast<std::int16_t>(receiver_.tuning(PilotTuning{}).userPns.size());
-    if (request(CDMA_CODE_OFFSET, index, cell.pnOffset))
-      set(CDMA_CODE_OFFSET, static_cast<double>(cell.pnOffset), index);
-    if (!cell.name.empty()) name(cell);
+    if (!request(CDMA_CODE_OFFSET, index, cell.pnOffset)) continue;
+    set(CDMA_CODE_OFFSET, static_cast<double>(cell.pnOffset), index);
+    ++taken;
+    if (cell.name.empty()) continue;
+    std::erase_if(ownNames_, [&cell](const CellName& own) { return own.pnOffset == cell.pnOffset; });
+    ownNames_.push_back(cell);
   }
   showNames();
+  return taken;
 }
 
 }  // namespace frontpanels::workbench

@@ -11,11 +11,6 @@
 
 namespace frontpanels::workbench {
 
-struct CellName {
-  std::int32_t pnOffset = 0;
-  std::string name;
-};
-
 class PilotPanel final : public Panel {
  public:
   PilotPanel(PanelFrame& frame, PanelListener& listener, const StoredPanel* stored);
@@ -27,7 +22,9 @@ class PilotPanel final : public Panel {
   // As they were shown last.
   [[nodiscard]] const PilotFrame& shown() const noexcept { return shown_; }
   // Puts PN offsets at the end of the user's list and names on their cells; a name of nothing only lists.
-  void addCells(const std::vector<CellName>& cells);
+  // Answers how many were taken.
+  std::size_t addCells(const std::vector<CellName>& cells);
+  [[nodiscard]] std::vector<CellName> cells() const override { return ownNames_; }
 
  private:
   bool show(const Frame& frame) override;
@@ -37,7 +34,9 @@ class PilotPanel final : public Panel {
   void told(const ReceiverSetting&) override {}
   void appendOwn(std::vector<StoredSetting>& settings) const override;
 
-  void name(const CellName& cell);
+  void forgetOwn() override;
+  void restoreOwn(const StoredPanel& stored) override;
+  void showDisplays(const std::vector<std::int32_t>& resultTypes);
   void showNames();
   void publishLevels(PilotServer server, const PilotLevels& levels);
   void publishBars(PilotServer server, const PilotBars& bars);
@@ -45,7 +44,9 @@ class PilotPanel final : public Panel {
 
   PilotReceiver receiver_;
   Automation names_;
-  bool named_ = false;
+  std::vector<CellName> sourceNames_;
+  std::vector<CellName> ownNames_;  // imported; they stand before those of the source
+  bool shownOnce_ = false;          // the displays were chosen
   PilotFrame shown_;
   std::vector<float> column_;
 };

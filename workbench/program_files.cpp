@@ -40,6 +40,12 @@ std::string fileName(const std::string& path) {
   return utf8(std::filesystem::path(toUtf16(path)).filename());
 }
 
+std::string wholePath(const std::string& path) {
+  std::error_code error;
+  const std::filesystem::path whole = std::filesystem::absolute(toUtf16(path), error);
+  return error ? path : utf8(whole.lexically_normal());
+}
+
 std::string fileIn(const std::string& folder, const std::string& name) {
   const std::filesystem::path place = std::filesystem::absolute(toUtf16(folder));
   std::error_code error;

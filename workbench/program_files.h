@@ -11,6 +11,8 @@ namespace frontpanels::workbench {
 [[nodiscard]] std::string usersSettingsFile();
 // The last part of a path.
 [[nodiscard]] std::string fileName(const std::string& path);
+// As it is found from any folder.
+[[nodiscard]] std::string wholePath(const std::string& path);
 // FOLDER/NAME, the folder made where it is not there. Raises a failure that names the folder.
 [[nodiscard]] std::string fileIn(const std::string& folder, const std::string& name);
 // "2024-05-01 13-30-00" by the user's clock: for the names of files.

@@ -40,12 +40,14 @@ std::optional<std::string> askForFileToOpen(HWND owner, const wchar_t* title, Fi
 }
 
 std::optional<std::string> askForFileToSave(HWND owner, const wchar_t* title, FileFilter filter,
-                                            const wchar_t* extension, const std::string& proposed) {
+                                            const wchar_t* extension, const std::string& proposed,
+                                            SavedFile file) {
   std::wstring path;
   OPENFILENAMEW question = questionFor(owner, title, filter, path);
   toUtf16(proposed).copy(path.data(), kLongestPath - 1);
   question.lpstrDefExt = extension;
-  question.Flags |= OFN_OVERWRITEPROMPT | OFN_PATHMUSTEXIST;
+  question.Flags |= OFN_PATHMUSTEXIST;
+  if (file == SavedFile::Replaced) question.Flags |= OFN_OVERWRITEPROMPT;
   return answerOf(GetSaveFileNameW(&question), path, "Asking for a file to save to");
 }
 

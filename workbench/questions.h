@@ -14,9 +14,11 @@ using FileFilter = const wchar_t*;
 // Paths are UTF-8. Nothing when the user has cancelled; raise a failure when the system has.
 [[nodiscard]] std::optional<std::string> askForFileToOpen(HWND owner, const wchar_t* title,
                                                           FileFilter filter);
+enum class SavedFile { Replaced, Continued };
 // A name without an extension gets `extension`; the user is asked before a file is replaced.
 [[nodiscard]] std::optional<std::string> askForFileToSave(HWND owner, const wchar_t* title, FileFilter filter,
                                                           const wchar_t* extension,
-                                                          const std::string& proposed);
+                                                          const std::string& proposed,
+                                                          SavedFile file = SavedFile::Replaced);
 
 }  // namespace frontpanels::workbench

@@ -12,6 +12,7 @@ class SpectrumPanel final : public Panel {
 
   void meet(const DriveSimulator* simulator) override;
   void forgetTuning() override { receiver_.showWholeSweeps(); }
+  [[nodiscard]] bool tuned() const override { return receiver_.tuned(); }
   void tune(DriveSimulator& simulator) const override;
   // As it was shown last; without values before the first one.
   [[nodiscard]] const DisplaySweep& shown() const noexcept { return shown_; }

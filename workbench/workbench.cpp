@@ -4,9 +4,11 @@
 
 #include <algorithm>
 #include <iterator>
+#include <utility>
 
 #include "framework/support/host_codes.h"
 #include "frontpanels_version.h"
+#include "hosting/number_text.h"
 #include "platform/win32/utf16.h"
 #include "workbench/console.h"
 #include "workbench/failure.h"
@@ -20,7 +22,9 @@ const char* const kHelp =
     "Ctrl+O opens a recording, Ctrl+D a simulated drive.\n"
     "F5 plays, F6 pauses, F7 takes one frame, Shift+F7 goes one back, F8 begins anew, Ctrl+G goes to the "
     "slider, Ctrl+L plays in a loop.\n"
-    "F9 records what is played.\n\n"
+    "F9 records what is played. Ctrl+E exports the picture of a panel, Ctrl+Shift+E its values, Ctrl+W the "
+    "picture "
+    "of the window, Ctrl+R a report; Ctrl+Shift+D begins another simulated drive.\n\n"
     "Ctrl+1 and Ctrl+2 open and close the panels, Ctrl+F6 goes to the next one, Ctrl+F4 closes it, Alt+- "
     "opens "
     "the menu of its window, Ctrl+P its own menu.\n"
@@ -189,35 +193,32 @@ Workbench::~Workbench() { panels_.clear(); }
 ExitCode Workbench::run(int showCommand) {
   loadSettings();
   placeWindow();
-  window_.show(showCommand);
+  window_.show(showMaximised_ && showCommand != SW_SHOWMINNOACTIVE ? SW_SHOWMAXIMIZED : showCommand);
   showStatus();
   const bool started = start();
   if (options_.exit && !started) return exitCode_;
   return static_cast<ExitCode>(window_.runMessageLoop());
 }
 
+void Workbench::attempt(const std::function<void()>& body) {
+  try {
+    body();
+  } catch (const NotRegistered&) {
+    exitCode_ = ExitCode::NotRegistered;
+    report(currentFailure());
+  } catch (...) {
+    if (exitCode_ == ExitCode::Done) exitCode_ = ExitCode::Failed;
+    report(currentFailure());
+  }
+}
+
 // Each step by itself: without a panel a recording can still be opened, and the other way round.
 bool Workbench::start() {
-  bool whole = true;
-  const auto attempt = [&](auto&& step) {
-    try {
-      step();
-    } catch (const NotRegistered&) {
-      whole = false;
-      exitCode_ = ExitCode::NotRegistered;
-      report(currentFailure());
-    } catch (...) {
-      whole = false;
-      if (exitCode_ == ExitCode::Done) exitCode_ = ExitCode::Failed;
-      report(currentFailure());
-    }
-  };
   attempt([this] { openFirstSource(); });
   for (const PanelKind kind : firstPanels())
     if (exitCode_ != ExitCode::NotRegistered) attempt([this, kind] { openPanel(kind); });
-  attempt([this] {
-    if (!options_.record.empty()) record(options_.record);
-  });
+  if (!options_.record.empty()) attempt([this] { record(options_.record); });
+  const bool whole = exitCode_ == ExitCode::Done;
   if (whole) attempt([this] { play(); });
   return whole;
 }
@@ -238,20 +239,26 @@ std::vector<PanelKind> Workbench::firstPanels() const {
   return panels;
 }
 
+// What is remembered may be gone: there is always the recording that the program carries.
 void Workbench::openFirstSource() {
   if (options_.simulate) return simulate(*options_.simulate);
-  if (!options_.recording.empty()) return openRecording(options_.recording);
+  if (!options_.recording.empty()) return static_cast<void>(openRecording(options_.recording));
   if (const SettingsSection* const source = settings_.find("source")) {
-    if (const auto seed = source->get<std::int32_t>("simulated drive"); seed && *seed >= 0)
-      return simulate(static_cast<std::uint64_t>(*seed));
-    if (const auto recording = source->get<std::string>("recording")) return openRecording(*recording);
+    const auto seed = exactNumber<std::uint64_t>(source->get<std::string>("simulated drive").value_or(""));
+    // Unattended, a drive without an end would be one.
+    if (seed && (!options_.exit || options_.sweeps)) return simulate(*seed);
+    const auto recording = source->get<std::string>("recording");
+    bool opened = false;
+    if (recording) attempt([&] { opened = openRecording(*recording); });
+    if (opened) return;
   }
   openRecording(carriedRecording());
 }
 
+// Whatever cannot be saved is named; the program ends all the same.
 void Workbench::quit() {
   stopRecording();
-  saveSettings();
+  attempt([this] { saveSettings(); });
   end(exitCode_);
 }
 
@@ -295,17 +302,23 @@ void Workbench::openPanel(PanelKind kind) {
       *panels_.emplace_back(workbench::openPanel(kind, window_, *this, stored ? &*stored : nullptr));
   window_.panelsChanged();
   opened.meet(simulator_);
+  // Where another source was tuned to says nothing of this one.
+  if (!stored || !sourceIsKept()) opened.forgetTuning();
   if (capture_) opened.logging(true);
   receiveAnew();
   showMessages();
 }
 
+// One that cannot say what is to be kept goes all the same.
 void Workbench::closePanel(PanelKind kind) {
-  Panel* const closed = panel(kind);
-  if (closed == nullptr) return;
-  keepPanel(*closed);
-  if (SettingsSection* const kept = settings_.find(panelWord(kind))) kept->set("open", false);
-  std::erase_if(panels_, [closed](const auto& panel) { return panel.get() == closed; });
+  const auto found = std::find_if(panels_.begin(), panels_.end(),
+                                  [kind](const auto& panel) { return panel->kind() == kind; });
+  if (found == panels_.end()) return;
+  attempt([&] { keepPanel(**found); });
+  settings_.section(panelWord(kind)).set("open", false);
+  // Nobody finds it among the others while it goes.
+  const std::unique_ptr<Panel> closed = std::move(*found);
+  panels_.erase(found);
   window_.panelsChanged();
 }
 
@@ -336,9 +349,10 @@ void Workbench::later(std::function<void()> work) {
     raiseLastError("Putting off what a panel asked for");
 }
 
+// Each by itself: a failure of one is no reason for the others to be lost.
 void Workbench::doLater() {
   const std::vector<std::function<void()>> works = std::exchange(later_, {});
-  for (const auto& work : works) work();
+  for (const auto& work : works) attempt(work);
 }
 
 void Workbench::closeAsked(PanelKind kind) {
@@ -440,11 +454,14 @@ void Workbench::report(const std::string& message, const char* source) {
   if (!options_.exit && !window_.messagesShown()) window_.showMessages(true);
 }
 
-// A play that fails once would fail at every tick.
+// A play that fails once would fail at every tick; anything else that fails leaves it alone.
 void Workbench::failed(const std::string& message) noexcept {
+  const bool play = std::exchange(ticking_, false);
   try {
-    player_.pause();
-    window_.stopTicking();
+    if (play) {
+      player_.pause();
+      window_.stopTicking();
+    }
     showStatus();
     report(message);
   } catch (...) {

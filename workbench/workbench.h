@@ -81,7 +81,8 @@ class Workbench final : private MainWindowEvents, private PanelListener {
 
   // Sources and playing
   void askForRecording();
-  void openRecording(const std::string& path);
+  // False when the user has cancelled.
+  bool openRecording(const std::string& path);
   void simulate(std::uint64_t seed);
   void simulateAgain();
   void simulateOther();
@@ -98,24 +99,31 @@ class Workbench final : private MainWindowEvents, private PanelListener {
   void goTo();
   void rate(int index);
   void applyState();
+  void playOn();
   bool takeFrame();
   void showFrame();
   void toggleRecording();
   void record(const std::string& path);
   void stopRecording();
+  void tellLogging(bool on);
+  void reportProblems();
   void appendToCapture();
 
   // What is kept
   void loadSettings();
-  void saveSettings();
+  // False where there is no file that may be written.
+  bool saveSettings();
   void saveSettingsNow();
   void restoreSettings();
   void saveSetUp(int number);
   void restoreSetUp(int number);
   [[nodiscard]] bool hasSetUp(int number) const;
   [[nodiscard]] std::optional<StoredPanel> storedPanel(PanelKind kind) const;
+  [[nodiscard]] std::optional<StoredPanel> storedPanel(const std::string& section) const;
+  [[nodiscard]] bool sourceIsKept() const;
   void keepPanel(Panel& panel);
   void keepWindow();
+  void keepSource();
   void placeWindow();
   void importCells();
 
@@ -137,6 +145,8 @@ class Workbench final : private MainWindowEvents, private PanelListener {
   void about();
   void keys();
   void box(const std::string& message, UINT icon);
+  // Runs what may fail without keeping the rest from being done.
+  void attempt(const std::function<void()>& body);
   // After the event or message that is being dealt with.
   void later(std::function<void()> work);
   void doLater();
@@ -150,6 +160,9 @@ class Workbench final : private MainWindowEvents, private PanelListener {
   std::size_t rate_ = kFirstRate;
   std::uint64_t framesTaken_ = 0;
   std::string openedPath_;
+  std::string problemsTold_;
+  bool showMaximised_ = false;
+  bool ticking_ = false;
   bool reading_ = false;  // a long recording; nothing else is begun meanwhile
   bool cancelled_ = false;
   ExitCode exitCode_ = ExitCode::Done;

@@ -3,10 +3,12 @@
 
 #include <algorithm>
 #include <array>
+#include <cmath>
 #include <filesystem>
 #include <sstream>
 
 #include "framework/support/host_codes.h"
+#include "hosting/number_text.h"
 #include "hosting/report_page.h"
 #include "hosting/whole_file.h"
 #include "pilot/import_list_parser.h"
@@ -32,6 +34,7 @@ constexpr std::array<const char*, 4> kSides = {"left", "top", "right", "bottom"}
 constexpr std::array<LONG RECT::*, 4> kRectSides = {&RECT::left, &RECT::top, &RECT::right, &RECT::bottom};
 constexpr std::array<const char*, 3> kArrangements = {"side by side", "stacked", "by user"};
 constexpr std::string_view kPropertyPrefix = "property ";
+constexpr std::string_view kCellPrefix = "cell ";
 
 void keep(SettingsSection& section, const RECT& place) {
   for (std::size_t i = 0; i < kSides.size(); ++i)
@@ -58,6 +61,12 @@ std::vector<std::int32_t> numbersOf(const std::string& text) {
   return numbers;
 }
 
+std::string textOf(const std::vector<std::int32_t>& numbers) {
+  std::string text;
+  for (const std::int32_t number : numbers) text += (text.empty() ? "" : " ") + std::to_string(number);
+  return text;
+}
+
 std::string setUpName(PanelKind kind, int number) {
   return std::string(panelWord(kind)) + " set-up " + std::to_string(number);
 }
@@ -77,16 +86,18 @@ void Workbench::loadSettings() {
   if (!loaded.problem.empty()) report(loaded.problem);
 }
 
-void Workbench::saveSettings() {
-  if (settingsPath_.empty() || !settingsMayBeReplaced_) return;
+bool Workbench::saveSettings() {
+  if (settingsPath_.empty() || !settingsMayBeReplaced_) return false;
   keepWindow();
-  for (const auto& panel : panels_) keepPanel(*panel);
+  keepSource();
+  for (const auto& panel : panels_) attempt([&] { keepPanel(*panel); });
   frontpanels::saveSettings(settingsPath_, settings_);
+  return true;
 }
 
 void Workbench::saveSettingsNow() {
-  saveSettings();
-  if (!settingsPath_.empty()) window_.status(StatusPart::Message, "Settings saved");
+  window_.status(StatusPart::Message,
+                 saveSettings() ? "Settings saved" : "Settings are not kept in this run");
 }
 
 void Workbench::keepWindow() {
@@ -95,16 +106,23 @@ void Workbench::keepWindow() {
   GetWindowPlacement(window_.handle(), &placement);
   SettingsSection& section = settings_.section("window");
   keep(section, placement.rcNormalPosition);
-  section.set("maximised", placement.showCmd == SW_SHOWMAXIMIZED);
+  section.set("maximised",
+              placement.showCmd == SW_SHOWMAXIMIZED ||
+                  (placement.showCmd == SW_SHOWMINIMIZED && placement.flags == WPF_RESTORETOMAXIMIZED));
   section.set("panels", kArrangements[static_cast<std::size_t>(window_.arrangement())]);
   section.set("messages", window_.messagesShown());
+}
+
+// Without a source the one that is remembered stays so: it may come back.
+void Workbench::keepSource() {
   SettingsSection& source = settings_.section("source");
-  source.erase("recording");
-  source.erase("simulated drive");
-  if (simulator_ != nullptr) source.set("simulated drive", static_cast<std::int32_t>(seed_));
-  if (!openedPath_.empty()) source.set("recording", openedPath_);
   source.set("frames a second", static_cast<std::int32_t>(kSweepsASecond.at(rate_)));
   source.set("loop", player_.loop());
+  if (player_.source() == nullptr) return;
+  source.erase("recording");
+  source.erase("simulated drive");
+  if (simulator_ != nullptr) source.set("simulated drive", std::to_string(seed_));
+  if (!openedPath_.empty()) source.set("recording", openedPath_);
 }
 
 // A place on a screen that is no longer there is brought back by the window system.
@@ -115,9 +133,9 @@ void Workbench::placeWindow() {
       placement.length = sizeof placement;
       placement.rcNormalPosition = *place;
       placement.showCmd = SW_HIDE;
-      if (section->get<bool>("maximised").value_or(false)) placement.flags = WPF_RESTORETOMAXIMIZED;
       SetWindowPlacement(window_.handle(), &placement);
     }
+    showMaximised_ = section->get<bool>("maximised").value_or(false);
     const std::string arrangement = section->get<std::string>("panels").value_or("");
     const auto found = std::find(kArrangements.begin(), kArrangements.end(), arrangement);
     if (found != kArrangements.end())
@@ -129,7 +147,8 @@ void Workbench::placeWindow() {
         std::find(kSweepsASecond.begin(), kSweepsASecond.end(),
                   static_cast<unsigned>(source->get<std::int32_t>("frames a second").value_or(0)));
     if (rate != kSweepsASecond.end()) rate_ = static_cast<std::size_t>(rate - kSweepsASecond.begin());
-    player_.loop(source->get<bool>("loop").value_or(false));
+    // Unattended, a loop would never end.
+    player_.loop(!options_.exit && source->get<bool>("loop").value_or(false));
   }
 }
 
@@ -141,37 +160,56 @@ void Workbench::keepPanel(Panel& panel) {
   keep(section, panel.boundsTwips());
   for (const auto& [name, value] : panel.properties())
     section.set(std::string(kPropertyPrefix) + name, settingValueText(value));
-  std::string displays;
-  for (const std::int32_t resultType : panel.displays())
-    displays += (displays.empty() ? "" : " ") + std::to_string(resultType);
-  section.set("displays", displays);
+  section.set("displays", textOf(panel.displays()));
+  section.set("tuned", panel.tuned());
+  for (const CellName& cell : panel.cells())
+    section.set(std::string(kCellPrefix) + std::to_string(cell.pnOffset), cell.name);
   section.settings(panel.settings());
 }
 
 std::optional<StoredPanel> Workbench::storedPanel(PanelKind kind) const {
-  const SettingsSection* const section = settings_.find(panelWord(kind));
+  return storedPanel(std::string(panelWord(kind)));
+}
+
+std::optional<StoredPanel> Workbench::storedPanel(const std::string& name) const {
+  const SettingsSection* const section = settings_.find(name);
   if (section == nullptr) return std::nullopt;
   StoredPanel stored;
   stored.boundsTwips = keptPlace(*section);
   stored.settings = section->settings();
   if (const auto displays = section->get<std::string>("displays")) stored.displays = numbersOf(*displays);
-  for (const auto& [name, text] : section->values()) {
-    if (!name.starts_with(kPropertyPrefix)) continue;
-    if (const std::optional<Variant> value = parseSettingValue(text))
-      stored.properties.emplace_back(name.substr(kPropertyPrefix.size()), *value);
+  for (const auto& [key, text] : section->values()) {
+    if (key.starts_with(kPropertyPrefix)) {
+      if (const std::optional<Variant> value = parseSettingValue(text))
+        stored.properties.emplace_back(key.substr(kPropertyPrefix.size()), *value);
+    } else if (key.starts_with(kCellPrefix)) {
+      if (const auto pn = exactNumber<std::int32_t>(std::string_view(key).substr(kCellPrefix.size())))
+        stored.cells.push_back({*pn, text});
+    }
   }
   return stored;
 }
 
+// Whether the source is the one that the settings were kept with, and was tuned in.
+bool Workbench::sourceIsKept() const {
+  const SettingsSection* const source = settings_.find("source");
+  const SettingsSection* const spectrum = settings_.find(panelWord(PanelKind::Spectrum));
+  if (source == nullptr || spectrum == nullptr || !spectrum->get<bool>("tuned").value_or(false)) return false;
+  if (simulator_ != nullptr) return source->get<std::string>("simulated drive") == std::to_string(seed_);
+  return !openedPath_.empty() && source->get<std::string>("recording") == openedPath_;
+}
+
 void Workbench::settingsHanded(PanelKind kind, std::optional<std::int32_t> setUp,
                                std::vector<StoredSetting> settings) {
-  const std::string name = setUp ? setUpName(kind, *setUp) : std::string(panelWord(kind));
-  settings_.section(name).settings(std::move(settings));
+  SettingsSection& section =
+      settings_.section(setUp ? setUpName(kind, *setUp) : std::string(panelWord(kind)));
+  section.settings(std::move(settings));
+  if (const Panel* const handing = panel(kind)) section.set("displays", textOf(handing->displays()));
 }
 
 void Workbench::restoreSettings() {
   for (const auto& panel : panels_)
-    if (const auto stored = storedPanel(panel->kind())) panel->restore(stored->settings);
+    if (const auto stored = storedPanel(panel->kind())) panel->restore(*stored);
   receiveAnew();
   window_.status(StatusPart::Message, "Settings restored");
 }
@@ -185,14 +223,14 @@ bool Workbench::hasSetUp(int number) const {
 
 void Workbench::saveSetUp(int number) {
   for (const auto& panel : panels_) panel->saveSetUp(number + 1);
-  saveSettings();
-  window_.status(StatusPart::Message, "Set-up " + std::to_string(number + 1) + " saved");
+  const bool saved = saveSettings();
+  window_.status(StatusPart::Message, "Set-up " + std::to_string(number + 1) +
+                                          (saved ? " saved" : " is kept until the end of this run"));
 }
 
 void Workbench::restoreSetUp(int number) {
   for (const auto& panel : panels_)
-    if (const SettingsSection* const kept = settings_.find(setUpName(panel->kind(), number + 1)))
-      panel->restore(kept->settings());
+    if (const auto kept = storedPanel(setUpName(panel->kind(), number + 1))) panel->restore(*kept);
   receiveAnew();
   takeScreenshots();
   window_.status(StatusPart::Message, "Set-up " + std::to_string(number + 1) + " restored");
@@ -212,14 +250,15 @@ void Workbench::importCells() {
   std::vector<CellName> cells;
   while (parser.ParseEntry()) {
     double pn = 0;
-    if (!textToNumber(parser.GetArg(0), pn) || pn < 0 || pn > kLargestPn)
+    if (!textToNumber(parser.GetArg(0), pn) || pn < 0 || pn > kLargestPn || pn != std::floor(pn))
       throw HostFailure(*path + ": line " + std::to_string(cells.size() + 1) +
                         " has no PN offset from 0 to 511: \"" + parser.GetArg(0) + "\"");
     cells.push_back({static_cast<std::int32_t>(pn), parser.GetArg(1)});
   }
-  pilots->addCells(cells);
+  const std::size_t taken = pilots->addCells(cells);
   receiveAnew();
-  window_.status(StatusPart::Message, std::to_string(cells.size()) + " cells imported");
+  window_.status(StatusPart::Message,
+                 std::to_string(taken) + " of " + std::to_string(cells.size()) + " cells imported");
 }
 
 // --- Exports
@@ -256,12 +295,14 @@ ExportHeader Workbench::exportHeader(Panel& panel) const {
   return header;
 }
 
+// The panel may be closed while the user is asked for a name.
 void Workbench::exportPicture() {
-  Panel* const panel = activePanel();
-  if (panel == nullptr) return;
-  const auto path = exportName(panelWord(panel->kind()), L"png", kPictures);
-  if (!path) return;
-  panel->savePicture(*path);
+  if (activePanel() == nullptr) return;
+  const PanelKind kind = activePanel()->kind();
+  const auto path = exportName(panelWord(kind), L"png", kPictures);
+  Panel* const exporting = panel(kind);
+  if (!path || exporting == nullptr) return;
+  exporting->savePicture(*path);
   exported(*path);
 }
 
@@ -273,14 +314,15 @@ void Workbench::exportWindow() {
 }
 
 void Workbench::exportValues() {
-  Panel* const panel = activePanel();
-  if (panel == nullptr) return;
-  const auto path = exportName(panelWord(panel->kind()), L"csv", kValues);
-  if (!path) return;
-  const ExportHeader header = exportHeader(*panel);
-  saveWhole(*path, panel->kind() == PanelKind::Spectrum
-                       ? sweepCsv(header, static_cast<SpectrumPanel*>(panel)->shown())
-                       : pilotsCsv(header, static_cast<PilotPanel*>(panel)->shown()));
+  if (activePanel() == nullptr) return;
+  const PanelKind kind = activePanel()->kind();
+  const auto path = exportName(panelWord(kind), L"csv", kValues);
+  Panel* const exporting = panel(kind);
+  if (!path || exporting == nullptr) return;
+  const ExportHeader header = exportHeader(*exporting);
+  saveWhole(*path, kind == PanelKind::Spectrum
+                       ? sweepCsv(header, static_cast<SpectrumPanel*>(exporting)->shown())
+                       : pilotsCsv(header, static_cast<PilotPanel*>(exporting)->shown()));
   exported(*path);
 }
 

@@ -43,14 +43,15 @@ const char* stateName(FramePlayer::State state) {
 // --- Sources
 
 void Workbench::askForRecording() {
-  if (const auto path = askForFileToOpen(window_.handle(), L"Open recording", kRecordings)) {
-    openRecording(*path);
-    play();
-  }
+  const auto path = askForFileToOpen(window_.handle(), L"Open recording", kRecordings);
+  if (!path) return;
+  const bool wasPlaying = player_.state() == FramePlayer::State::Playing;
+  if (openRecording(*path) || wasPlaying) play();
+  showStatus();
 }
 
 // The panels live on while a long recording is read, with what was shown last.
-void Workbench::openRecording(const std::string& path) {
+bool Workbench::openRecording(const std::string& path) {
   pause();
   reading_ = true;
   cancelled_ = false;
@@ -73,10 +74,15 @@ void Workbench::openRecording(const std::string& path) {
   }
   reading_ = false;
   window_.endProgress();
-  if (!source) return report(fileName(path) + ": not opened, as reading it was cancelled");
+  if (!source) {
+    report(fileName(path) + ": not opened, as reading it was cancelled");
+    return false;
+  }
   open(std::move(source), nullptr);
-  openedPath_ = path;
+  openedPath_ = wholePath(path);
   showStatus();
+  reportProblems();
+  return true;
 }
 
 void Workbench::simulate(std::uint64_t seed) {
@@ -90,6 +96,7 @@ void Workbench::simulate(std::uint64_t seed) {
 void Workbench::open(std::unique_ptr<FrameSource> source, DriveSimulator* simulator) {
   stopRecording();
   simulator_ = nullptr;
+  problemsTold_.clear();
   player_.open(std::move(source));
   simulator_ = simulator;
   for (const auto& panel : panels_) {
@@ -196,6 +203,12 @@ void Workbench::applyState() {
 }
 
 void Workbench::tick() {
+  ticking_ = true;
+  playOn();
+  ticking_ = false;
+}
+
+void Workbench::playOn() {
   // A tick may still wait in the queue when the play has been stopped.
   if (reading_ || player_.state() != FramePlayer::State::Playing) return;
   const bool more = takeFrame() && framesTaken_ != options_.sweeps;
@@ -208,7 +221,7 @@ void Workbench::tick() {
 bool Workbench::takeFrame() {
   if (!player_.step()) {
     applyState();
-    if (const std::string problems = player_.source()->problemReport(); !problems.empty()) report(problems);
+    reportProblems();
     return false;
   }
   ++framesTaken_;
@@ -218,6 +231,13 @@ bool Workbench::takeFrame() {
   showMessages();
   takeScreenshots();
   return true;
+}
+
+// What is wrong with a recording is known once it was read; more may come when it changes meanwhile.
+void Workbench::reportProblems() {
+  std::string problems = player_.source()->problemReport();
+  if (!problems.empty() && problems != problemsTold_) report(problems);
+  problemsTold_ = std::move(problems);
 }
 
 void Workbench::showFrame() {
@@ -231,15 +251,22 @@ void Workbench::toggleRecording() {
   if (capture_) return stopRecording();
   const std::string proposed = stampForNames() + ".fpcap";
   const auto path = options_.exportFolder.empty()
-                        ? askForFileToSave(window_.handle(), L"Record", kCaptures, L"fpcap", proposed)
+                        ? askForFileToSave(window_.handle(), L"Record to a new capture, or on to an old one",
+                                           kCaptures, L"fpcap", proposed, SavedFile::Continued)
                         : std::optional(fileIn(options_.exportFolder, proposed));
   if (path) record(*path);
 }
 
 void Workbench::record(const std::string& path) {
+  if (wholePath(path) == openedPath_)
+    throw HostFailure(fileName(path) + ": is being played and cannot be recorded to");
   capture_.emplace(path);
-  for (const auto& panel : panels_) panel->logging(true);
+  tellLogging(true);
   showStatus();
+}
+
+void Workbench::tellLogging(bool on) {
+  for (const auto& panel : panels_) attempt([&] { panel->logging(on); });
 }
 
 void Workbench::stopRecording() {
@@ -247,7 +274,7 @@ void Workbench::stopRecording() {
   const std::string told = fileName(capture_->path()) + ": " + std::to_string(capture_->frames()) +
                            (capture_->frames() == 1 ? " frame recorded" : " frames recorded");
   capture_.reset();
-  for (const auto& panel : panels_) panel->logging(false);
+  tellLogging(false);
   showStatus();
   window_.status(StatusPart::Message, told);
   window_.messages().add("Workbench", told);
@@ -271,6 +298,7 @@ void Workbench::appendToCapture() {
 
 void Workbench::takeScreenshots() {
   if (options_.screenshotFolder.empty() || player_.frameNumber() == 0) return;
+  if (IsIconic(window_.handle())) return;  // there is nothing of it to be seen
   char number[32];
   std::snprintf(number, sizeof number, "-%04llu.png", static_cast<unsigned long long>(player_.frameNumber()));
   saveWindowPicture(window_.handle(), fileIn(options_.screenshotFolder, std::string("window") + number));

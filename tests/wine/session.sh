@@ -29,7 +29,7 @@ tell() { wine "$teller" FrontPanelsWorkbench "$@" 2>>"$out/teller.txt" || not_ok
 # Commands of the menu.
 RECORD=1005; PICTURE=1006; VALUES=1007; REPORT=1008; WINDOW=1009
 PILOTS=1102; STACKED=1111; SIDE_BY_SIDE=1110; MESSAGES=1114; CLOSE_PANEL=1113
-SAVE=1601; IMPORT=1603; SAVE_SET_UP_2=1612; RESTORE_SET_UP_2=1622; RIGHT_AREA=2900
+SAVE=1601; IMPORT=1603; SAVE_SET_UP_2=1612; RESTORE_SET_UP_2=1622; SAVE_SET_UP_3=1613; RESTORE_SET_UP_3=1623; RIGHT_AREA=2900
 F5=116; F6=117; F7=118
 
 # until_there COMMAND...: it succeeds within half a minute.
@@ -123,6 +123,11 @@ wine "$teller" '#32770' "file:$(windows_path "$out/cells.txt")" 2>>"$out/teller.
 judge $? "the dialog takes the list"
 tell in:Pilots 'click:&User List' 'click:Cell Names'
 picture imported_cells
+tell "command:$SAVE_SET_UP_3" "command:$RESTORE_SET_UP_3" "command:$RESTORE_SET_UP_3"
+export_to "$VALUES" 'pilots*.csv' "$out/twice.csv"
+listed=$(awk -F, '/^# Set:/ { list = /User list/ } list && NF == 8 && $1 ~ /^[0-9]/' "$out/twice.csv" | wc -l)
+[ "$listed" -eq "$(wc -l <"$out/cells.txt")" ]
+judge $? "a set-up restored twice lists each cell once: $listed"
 for order in X History 'Show Value' None Y; do
   tell in:Pilots "choose:$order"
   picture "sorted_by_${order// /_}"
@@ -164,6 +169,15 @@ head -c -5 "$out/three.fpcap" >"$out/cut.fpcap"
 timeout 120 wine "$program" "$(windows_path "$out/cut.fpcap")" --exit --screenshots "$(windows_path "$out/cut")" 2>"$out/cut.txt"
 grep -q 'cut.fpcap: cut short after frame 2' "$out/cut.txt"
 judge $? "a cut capture says so: $(cat "$out/cut.txt")"
+
+# --- Settings of another source
+cp "$settings" "$out/other.settings"
+timeout 120 wine "$program" "$(windows_path "$root/recordings/fm_band.csv")" --sweeps 1 --exit --settings "$(windows_path "$out/other.settings")" 2>"$out/other.txt"
+grep -q '^tuned = false' "$out/other.settings" && ! grep -A 40 '^\[spectrum\]' "$out/other.settings" | grep -q '^13 = 881520000'
+judge $? "another recording is not cut to the range of the drive: $(grep -A 40 '^\[spectrum\]' "$out/other.settings" | grep -m 1 '^13 = ')"
+timeout 120 wine "$program" --simulate 5000000000 --sweeps 1 --exit --settings "$(windows_path "$out/seed.settings")" 2>"$out/seed.txt"
+grep -q '^simulated drive = 5000000000' "$out/seed.settings"
+judge $? "a seed is kept whole"
 
 # --- Settings that cannot be used
 head -c 200 "$settings" >"$out/damaged.settings"
