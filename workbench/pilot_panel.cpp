@@ -2,9 +2,11 @@
 
 #include <algorithm>
 #include <array>
+#include <cmath>
 #include <string_view>
 
 #include "framework/support/host_codes.h"
+#include "pilot/code_units.h"
 
 namespace frontpanels::workbench {
 namespace {
@@ -35,6 +37,21 @@ constexpr SetRow kSets[] = {
     {PilotSet::TopN, &PilotTuning::topN},
     {PilotSet::UserList, &PilotTuning::userList},
 };
+
+// The panel counts one PN offset a point: of a window that is received finer the largest level of each stands
+// for it.
+PilotLevels onePointAPn(const PilotLevels& levels, const PilotTuning& tuning) {
+  const double windowPn = tuning.codeSpan / chipsPerPn(static_cast<std::int16_t>(tuning.codeFormat));
+  const std::size_t received = levels.ecIoDb.size();
+  const auto points = static_cast<std::size_t>(std::max(1.0, std::ceil(windowPn)));
+  if (points >= received) return levels;
+  PilotLevels shown{levels.ioDbm, std::vector<float>(points, kGap)};
+  for (std::size_t i = 0; i < received; ++i) {
+    float& level = shown.ecIoDb[i * points / received];
+    level = largerLevel(level, levels.ecIoDb[i]);
+  }
+  return shown;
+}
 
 // Result types of what a new panel shows: all pilots, and the strongest of them.
 const std::vector<std::int32_t> kFirstDisplays = {14, 201};
@@ -135,7 +152,10 @@ bool PilotPanel::show(const Frame& frame) {
   if (!tuning.topN) shown_.topN.reset();
   if (!tuning.userList) shown_.userList.reset();
   if (shown_.allPilots) publishLevels(PilotServer::AllPilots, *shown_.allPilots);
-  if (shown_.zoomedPilots) publishLevels(PilotServer::ZoomedPilots, *shown_.zoomedPilots);
+  if (shown_.zoomedPilots) {
+    shown_.zoomedPilots = onePointAPn(*shown_.zoomedPilots, tuning);
+    publishLevels(PilotServer::ZoomedPilots, *shown_.zoomedPilots);
+  }
   if (shown_.topN) publishBars(PilotServer::TopN, *shown_.topN);
   if (shown_.userList) publishBars(PilotServer::UserList, *shown_.userList);
   if (shown_.carrier) publishCarrier(*shown_.carrier);

@@ -3,9 +3,12 @@
 #include <wincodec.h>
 
 #include <algorithm>
+#include <cstdint>
 #include <memory>
 #include <type_traits>
+#include <vector>
 
+#include "hosting/whole_file.h"
 #include "platform/win32/com_pointer.h"
 #include "platform/win32/utf16.h"
 #include "workbench/failure.h"
@@ -94,18 +97,29 @@ Picture captureWindow(HWND window) {
   return copyOf(WindowDc(window).get(), area);
 }
 
+std::vector<std::uint8_t> contentOf(IStream& stream, const std::string& attempt) {
+  STATSTG state{};
+  check(stream.Stat(&state, STATFLAG_NONAME), attempt);
+  std::vector<std::uint8_t> content(static_cast<std::size_t>(state.cbSize.QuadPart));
+  check(stream.Seek({}, STREAM_SEEK_SET, nullptr), attempt);
+  ULONG read = 0;
+  check(stream.Read(content.data(), static_cast<ULONG>(content.size()), &read), attempt);
+  content.resize(read);
+  return content;
+}
+
+// Through memory: a picture that cannot be written whole leaves the one that was there.
 void writePng(const Picture& picture, const std::string& path) {
   const std::string attempt = "Writing " + path;
   ComPointer<IWICImagingFactory> factory;
   check(CoCreateInstance(CLSID_WICImagingFactory, nullptr, CLSCTX_INPROC_SERVER, __uuidof(IWICImagingFactory),
                          reinterpret_cast<void**>(factory.receive())),
         attempt);
-  ComPointer<IWICStream> file;
-  check(factory->CreateStream(file.receive()), attempt);
-  check(file->InitializeFromFilename(toUtf16(path).c_str(), GENERIC_WRITE), attempt);
+  ComPointer<IStream> bytes;
+  check(CreateStreamOnHGlobal(nullptr, TRUE, bytes.receive()), attempt);
   ComPointer<IWICBitmapEncoder> encoder;
   check(factory->CreateEncoder(GUID_ContainerFormatPng, nullptr, encoder.receive()), attempt);
-  check(encoder->Initialize(file.get(), WICBitmapEncoderNoCache), attempt);
+  check(encoder->Initialize(bytes.get(), WICBitmapEncoderNoCache), attempt);
   ComPointer<IWICBitmapFrameEncode> frame;
   check(encoder->CreateNewFrame(frame.receive(), nullptr), attempt);
   check(frame->Initialize(nullptr), attempt);
@@ -118,6 +132,7 @@ void writePng(const Picture& picture, const std::string& path) {
       attempt);
   check(frame->Commit(), attempt);
   check(encoder->Commit(), attempt);
+  saveWhole(path, contentOf(*bytes.get(), attempt));
 }
 
 }  // namespace
