@@ -157,7 +157,7 @@ constexpr const char* kUsageTail =
     "\n"
     "examples:\n"
     "  fp-render fm.csv -o pictures --center 98M --span 4M --peak\n"
-    "  fp-render drive.fpc -o pictures --panel pilots --sets all,top --sweeps 100-200 --every 10\n"
+    "  fp-render drive.fpcap -o pictures --panel pilots --sets all,top --sweeps 100-200 --every 10\n"
     "\n"
     "exit codes:\n"
     "  0  all pictures were drawn\n"
