@@ -84,6 +84,11 @@ std::vector<ReceiverSetting> Receiver::settings() const {
   return all;
 }
 
+std::int16_t Receiver::channelization() const {
+  const auto found = values_.find(kChannelizationParameter);
+  return found == values_.end() ? std::int16_t{0} : static_cast<std::int16_t>(found->second);
+}
+
 SpectrumTuning Receiver::tuning(const SpectrumTuning& defaults) const {
   const auto value = [this](std::int16_t code, double otherwise) {
     const auto found = values_.find(code);

@@ -39,6 +39,8 @@ class Receiver {
   // range stays, whatever is swept, and what was not requested stays as it was shown last. A range that
   // passes a limit is moved back inside. Valid until the next call.
   [[nodiscard]] const DisplaySweep& receive(const Sweep& sweep);
+  // The channelization requested last, at first 0.
+  [[nodiscard]] std::int16_t channelization() const;
   // Whether centre or span was requested: the range then stays.
   [[nodiscard]] bool tuned() const noexcept { return tuned_; }
   // Forgets the tuning, from the next sweep on; the other settings stay.

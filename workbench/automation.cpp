@@ -44,6 +44,18 @@ BSTR makeBstr(std::wstring_view text) {
   return copy;
 }
 
+template <class T>
+void fillArray(VARIANT& target, VARTYPE type, std::span<const T> values) {
+  SAFEARRAY* const array = SafeArrayCreateVector(type, 0, static_cast<ULONG>(values.size()));
+  if (array == nullptr) throw std::bad_alloc();
+  target.vt = static_cast<VARTYPE>(VT_ARRAY | type);
+  target.parray = array;
+  void* data = nullptr;
+  check(SafeArrayAccessData(array, &data), "Filling an array");
+  if (!values.empty()) std::memcpy(data, values.data(), values.size_bytes());
+  SafeArrayUnaccessData(array);
+}
+
 struct Filling {
   VARIANT& target;
 
@@ -93,16 +105,9 @@ Value::Value(std::string_view utf8) : Value() {
   variant_.vt = VT_BSTR;
 }
 
-Value::Value(std::span<const float> singles) : Value() {
-  SAFEARRAY* const array = SafeArrayCreateVector(VT_R4, 0, static_cast<ULONG>(singles.size()));
-  if (array == nullptr) throw std::bad_alloc();
-  variant_.vt = VT_ARRAY | VT_R4;
-  variant_.parray = array;
-  void* data = nullptr;
-  check(SafeArrayAccessData(array, &data), "Filling an array");
-  if (!singles.empty()) std::memcpy(data, singles.data(), singles.size_bytes());
-  SafeArrayUnaccessData(array);
-}
+Value::Value(std::span<const float> singles) : Value() { fillArray(variant_, VT_R4, singles); }
+
+Value::Value(std::span<const double> doubles) : Value() { fillArray(variant_, VT_R8, doubles); }
 
 Value Value::of(const Variant& plain) {
   Value value;

@@ -28,8 +28,9 @@ class Value {
   Value(std::string_view utf8);
   Value(const std::string& utf8) : Value(std::string_view(utf8)) {}
   Value(const char* utf8) : Value(std::string_view(utf8)) {}
-  // An array of singles, counted from 0.
+  // Arrays counted from 0.
   Value(std::span<const float> singles);
+  Value(std::span<const double> doubles);
   Value(ComPointer<IDispatch> object) noexcept;
   Value(const Value& other);
   Value& operator=(const Value&) = delete;

@@ -26,9 +26,12 @@ class SpectrumPanel final : public Panel {
   void told(const ReceiverSetting& setting) override;
   void appendOwn(std::vector<StoredSetting>&) const override {}
   void tell(const ReceiverSetting& setting);
+  void nameChannels();
+  void giveBands();
 
   Receiver receiver_;
   FrequencyRange told_;
+  bool inNetwork_ = false;  // the source is one that has bands
   DisplaySweep shown_;
 };
 

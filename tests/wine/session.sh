@@ -81,7 +81,7 @@ played() {
 start --simulate 3 --panels spectrum
 played "a simulated drive"
 picture playing
-tell 'type:<Center>=881.52M' 'type:<Span>=3M'
+tell 'type:<Span>=3M' 'type:<Center>=881.52M'
 picture typed_frequency
 tell 'click:Add' 'click:To Max'
 picture marker_on_the_peak
@@ -93,6 +93,13 @@ until_there grep -q '^\[spectrum set-up 2\]' "$settings"
 judge $? "the set-up is in the settings file"
 grep -qE '^13 = 881520000' "$settings" && grep -qE '^14 = 3000000' "$settings"
 judge $? "with the frequency that was typed in"
+tell 'click:<Uplink>'
+export_to "$VALUES" 'spectrum*.csv' "$out/uplink.csv"
+grep -q '^# Center frequency (Hz): 836520000' "$out/uplink.csv"
+judge $? "the uplink of the channel is 45 MHz below: $(grep '^# Center' "$out/uplink.csv")"
+tell 'click:<Channel>'
+picture uplink_channel
+tell "command:$RESTORE_SET_UP_2"
 finish "the first run"
 
 start
