@@ -30,7 +30,8 @@ tell() { wine "$teller" FrontPanelsWorkbench "$@" 2>>"$out/teller.txt" || not_ok
 RECORD=1005; PICTURE=1006; VALUES=1007; REPORT=1008; WINDOW=1009
 PILOTS=1102; STACKED=1111; SIDE_BY_SIDE=1110; MESSAGES=1114; CLOSE_PANEL=1113
 SAVE=1601; IMPORT=1603; SAVE_SET_UP_2=1612; RESTORE_SET_UP_2=1622; SAVE_SET_UP_3=1613; RESTORE_SET_UP_3=1623; RIGHT_AREA=2900
-F5=116; F6=117; F7=118
+STEP_BACK=1205
+F7=118
 
 # until_there COMMAND...: it succeeds within half a minute.
 until_there() {
@@ -57,10 +58,15 @@ picture() {
   step=$((step + 1))
   export_to "$WINDOW" 'window*.png' "$pictures/$(printf '%02d' "$step")-$1.png"
 }
+frame_now() {
+  export_to "$VALUES" 'spectrum*.csv' "$out/now.csv" >/dev/null
+  sed -n 's/^# frame: //p' "$out/now.csv" | tr -d '\r'
+}
+is_past() { [ "$(frame_now)" -gt "$1" ]; }
 differ() { ! cmp -s "$1" "$2"; }
 start() { # the workbench, played until frame 40 and paused there
   timeout 300 wine "$program" --settings "$(windows_path "$settings")" --exports "$(windows_path "$exports")" \
-    --sweeps 40 "$@" 2>>"$out/said.txt" &
+    --sweeps "${frames:-40}" "$@" 2>>"$out/said.txt" &
   workbench=$!
 }
 finish() {
@@ -76,6 +82,25 @@ played() {
   until_there at_frame_40
   judge $? "$1: plays to frame 40"
 }
+
+# --- Sweeps as the panel asks for them
+frames=4 start --simulate 3 --panels spectrum
+until_there is_past 3
+tell 'click:<Single>'
+until_there is_past 4
+judge $? "a single sweep is one: frame $(frame_now)"
+tell 'click:<Cont.>'
+until_there is_past 6
+judge $? "continuous sweeps go on"
+tell 'click:<Stop>'
+stopped=$(frame_now)
+[ "$(frame_now)" -eq "$stopped" ] && [ "$(grep -cE '^[0-9]' "$out/now.csv")" -eq 512 ]
+judge $? "stopped at once, with a whole sweep: frame $stopped"
+tell "command:$STEP_BACK"
+until_there [ "$(frame_now)" -eq $((stopped - 1)) ]
+judge $? "a step back is the frame before"
+finish "the sweeps"
+rm -f "$settings"
 
 # --- A spectrum, its markers, and the next run
 start --simulate 3 --panels spectrum
