@@ -1,6 +1,8 @@
 #include "workbench/spectrum_panel.h"
 
+#include <algorithm>
 #include <span>
+#include <utility>
 #include <vector>
 
 #include "framework/support/host_codes.h"
@@ -31,17 +33,25 @@ void SpectrumPanel::nameChannels() {
   }
 }
 
-// The bands of the network, then all that can be tuned to: nobody is kept from looking beside them. A
-// recording has no bands.
+// The bands of the network, then what lies beside them: nobody is kept from looking there. A recording has no
+// bands.
 void SpectrumPanel::giveBands() {
-  std::vector<double> limits;
-  double order = 0;
-  if (inNetwork_) {
-    if (const Channelization* const plan = channelization(receiver_.channelization()))
-      for (const ChannelBand& band : plan->bands)
-        limits.insert(limits.end(), {order++, band.lowestHz, band.highestHz});
+  std::vector<std::pair<double, double>> ranges;
+  const Channelization* const plan = inNetwork_ ? channelization(receiver_.channelization()) : nullptr;
+  if (plan != nullptr)
+    for (const ChannelBand& band : plan->bands) ranges.emplace_back(band.lowestHz, band.highestHz);
+  std::vector<std::pair<double, double>> rising = ranges;
+  std::sort(rising.begin(), rising.end());
+  double fromHz = kLowestTunedHz;
+  for (const auto& [lowestHz, highestHz] : rising) {
+    ranges.emplace_back(fromHz, lowestHz);
+    fromHz = highestHz;
   }
-  limits.insert(limits.end(), {order, kLowestTunedHz, kHighestTunedHz});
+  ranges.emplace_back(fromHz, kHighestTunedHz);
+
+  std::vector<double> limits;
+  for (const auto& [lowestHz, highestHz] : ranges)
+    limits.insert(limits.end(), {static_cast<double>(limits.size() / 3), lowestHz, highestHz});
   static_cast<void>(
       automation().number("Limits", {kCenterFrequencyParameter, std::span<const double>(limits)}));
 }
