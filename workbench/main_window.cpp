@@ -176,7 +176,9 @@ bool MainWindow::deliver(MSG& message) {
 
 int MainWindow::runMessageLoop() {
   MSG message{};
-  while (GetMessageW(&message, nullptr, 0, 0) > 0) {
+  while (const BOOL more = GetMessageW(&message, nullptr, 0, 0)) {
+    constexpr BOOL kFailed = -1;
+    if (more == kFailed) raiseLastError("Waiting for messages");
     if (deliver(message)) continue;
     TranslateMessage(&message);
     DispatchMessageW(&message);
