@@ -62,8 +62,7 @@ void Panel::introduce() {
   panel_->put("virtualFrontPanelId", static_cast<std::int32_t>(row_.kind) + 1);
   for (const std::int16_t period : {TIME_MEASUREMENT_PERIOD, TIME_DATABASE_PERIOD, TIME_DISPLAY_PERIOD})
     set(period, kPeriodSeconds);
-  // Status words follow the caption directly.
-  set(kCaptionParameter, std::string(row_.caption) + " ");
+  giveCaption();
 }
 
 // A panel that owns its window is placed by the host's word; hidden meanwhile, it is shown by the last one.
@@ -186,6 +185,9 @@ void Panel::restoreMarkers() {
   for (const StoredSetting& setting : markers) restoreOne(setting);
 }
 
+// Status words follow the caption directly.
+void Panel::giveCaption() { set(kCaptionParameter, std::string(row_.caption) + " "); }
+
 // A panel that logs puts its measurement controls away; they come back to where they were.
 void Panel::logging(bool on) {
   if (on == logging_) return;
@@ -193,7 +195,9 @@ void Panel::logging(bool on) {
   if (on) measurementShown_ = panel_->flag("MeasurementPanelVisible");
   set(PARM_LOGGING_FLAG, on);
   if (on) operate(kLoggingOnOperation, std::int32_t{0});
-  if (!on) panel_->put("MeasurementPanelVisible", measurementShown_);
+  if (on) return;
+  panel_->put("MeasurementPanelVisible", measurementShown_);
+  giveCaption();  // without a word on logging
 }
 
 void Panel::playback() {

@@ -143,6 +143,7 @@ class Panel : private PanelWindowEvents, private PanelRequests {
   std::int32_t saveSetup(std::int32_t setUpId, PanelIds ids) override;
 
   void introduce();
+  void giveCaption();
   void restoreOne(const StoredSetting& setting);
   void restoreMarkers();
   [[nodiscard]] std::vector<StoredSetting> storedSettings(const VARIANT& list) const;
