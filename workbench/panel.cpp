@@ -158,11 +158,11 @@ void Panel::receive(const Frame& frame) {
 // receiver learns what holds now, and tells the panel where that is something else. Markers stand on values
 // and wait for the first ones.
 void Panel::restore(const StoredPanel& stored) {
-  markers_.clear();
+  markers_.emplace();
   forgetOwn();
   for (const StoredSetting& setting : stored.settings) {
     const bool ofMarker = setting.code >= kNewMarkerParameter && setting.code <= kMarkerValueParameter;
-    ofMarker ? markers_.push_back(setting) : restoreOne(setting);
+    ofMarker ? markers_->push_back(setting) : restoreOne(setting);
   }
   restoreOwn(stored);
   answer();
@@ -178,11 +178,11 @@ void Panel::restoreOne(const StoredSetting& setting) {
 
 // Those that are there make room: the numbers of markers are theirs alone.
 void Panel::restoreMarkers() {
-  const std::vector<StoredSetting> markers = std::exchange(markers_, {});
-  if (markers.empty()) return;
+  const auto markers = std::exchange(markers_, std::nullopt);
+  if (!markers) return;
   for (const StoredSetting& present : settings())
     if (present.code == kNewMarkerParameter) panel_->call("deleteMarker", {});
-  for (const StoredSetting& setting : markers) restoreOne(setting);
+  for (const StoredSetting& setting : *markers) restoreOne(setting);
 }
 
 // Status words follow the caption directly.

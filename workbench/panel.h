@@ -156,7 +156,8 @@ class Panel : private PanelWindowEvents, private PanelRequests {
   std::optional<HostedControl> control_;
   std::optional<Automation> panel_;
   std::optional<Automation> hub_;
-  std::vector<StoredSetting> markers_;  // to be restored once there is a trace to stand on
+  // To be restored once there is a trace to stand on; none at all is a restored state, too.
+  std::optional<std::vector<StoredSetting>> markers_;
   bool received_ = false;
   bool measurementShown_ = true;  // before it logged
   bool playback_ = false;

@@ -108,8 +108,15 @@ played "a simulated drive"
 picture playing
 tell 'type:<Span>=3M' 'type:<Center>=881.52M'
 picture typed_frequency
+tell "command:$SAVE_SET_UP_3"
+export_to "$PICTURE" 'spectrum*.png' "$out/without.png"
 tell 'click:Add' 'click:To Max'
 picture marker_on_the_peak
+tell "command:$RESTORE_SET_UP_3"
+export_to "$PICTURE" 'spectrum*.png' "$out/without_again.png"
+cmp -s "$out/without.png" "$out/without_again.png"
+judge $? "a set-up without markers takes the markers away"
+tell 'click:Add' 'click:To Max'
 tell 'click:Delta'
 picture delta_marker
 export_to "$PICTURE" 'spectrum*.png' "$out/before.png"
